@@ -1,0 +1,25 @@
+/// \file
+/// Linkage of the platform layer's functions. C-clean. A module defines `XOS_BUILDING` while it is built itself.
+
+#ifndef BASIS_PLATFORM_PLATFORM_API_H
+#define BASIS_PLATFORM_PLATFORM_API_H
+
+#if defined(_MSC_VER) && defined(XOS_BUILDING)
+#define XOS_API __declspec(dllexport)
+#elif defined(_MSC_VER)
+#define XOS_API __declspec(dllimport)
+#elif defined(_WIN32)
+#define XOS_API
+#else
+#define XOS_API __attribute__((visibility("default")))
+#endif
+
+#ifdef __cplusplus
+#define ZB_PLATFORM_C_BEGIN extern "C" {
+#define ZB_PLATFORM_C_END }
+#else
+#define ZB_PLATFORM_C_BEGIN
+#define ZB_PLATFORM_C_END
+#endif
+
+#endif

@@ -1,0 +1,32 @@
+# How a shared library of this project is made: version, export list, and on Windows the version resource and the pin.
+
+if(WIN32)
+  enable_language(RC)
+endif()
+
+# zb_shared_library(<target> IMAGE_BASE <address> DESCRIPTION <text>): settings common to all our shared libraries.
+# The exported names are those that carry an export macro in their headers; on Windows additionally only those of
+# cmake/exports/<target>.def, on ELF only those that the version script cmake/exports/<target>.map lets through.
+function(zb_shared_library target)
+  cmake_parse_arguments(ARG "" "IMAGE_BASE;DESCRIPTION" "" ${ARGN})
+  set(exports ${PROJECT_SOURCE_DIR}/cmake/exports/${target})
+  if(WIN32)
+    set(ZB_RC_NAME ${target})
+    set(ZB_RC_DESCRIPTION "${ARG_DESCRIPTION}")
+    configure_file(${PROJECT_SOURCE_DIR}/cmake/windows/version.rc.in ${CMAKE_CURRENT_BINARY_DIR}/${target}.rc @ONLY)
+    target_sources(${target} PRIVATE ${CMAKE_CURRENT_BINARY_DIR}/${target}.rc ${exports}.def
+      ${PROJECT_SOURCE_DIR}/cmake/windows/pin_module.cpp)
+    set_target_properties(${target} PROPERTIES PREFIX "" LINK_DEPENDS ${exports}.def)
+    if(MINGW)
+      target_link_options(${target} PRIVATE -Wl,--image-base=${ARG_IMAGE_BASE})
+    endif()
+  else()
+    target_link_options(${target} PRIVATE -Wl,--version-script=${exports}.map -Wl,--no-undefined)
+    if(ZB_SANITIZE)
+      get_target_property(options ${target} LINK_OPTIONS)
+      list(REMOVE_ITEM options -Wl,--no-undefined)
+      set_target_properties(${target} PROPERTIES LINK_OPTIONS "${options}")
+    endif()
+    set_target_properties(${target} PROPERTIES LINK_DEPENDS ${exports}.map)
+  endif()
+endfunction()

@@ -1,0 +1,44 @@
+# What holds for every target of the project: language, warnings, sanitizers, reproducible output.
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_C_STANDARD 11)
+set(CMAKE_C_EXTENSIONS OFF)
+set(CMAKE_CXX_VISIBILITY_PRESET hidden)
+set(CMAKE_C_VISIBILITY_PRESET hidden)
+set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+set(CMAKE_INSTALL_RPATH "$ORIGIN")
+
+# Every program and library lands in one folder, so that Windows finds the DLLs beside the programs.
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+
+find_package(Threads REQUIRED)
+
+# Language and code settings of the whole build, the test framework included.
+add_compile_options(
+  "$<$<NOT:$<CXX_COMPILER_ID:MSVC>>:-ffile-prefix-map=${PROJECT_SOURCE_DIR}=.;-ffile-prefix-map=${PROJECT_BINARY_DIR}=build>")
+if(ZB_SANITIZE)
+  add_compile_options(-fsanitize=${ZB_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
+  add_link_options(-fsanitize=${ZB_SANITIZE})
+endif()
+if(MINGW)
+  add_compile_definitions(_WIN32_WINNT=0x0A00)
+  add_link_options(-static -Wl,--no-insert-timestamp)
+endif()
+
+# zb_warnings(<target>): the warnings that our own code is held to.
+function(zb_warnings target)
+  if(MSVC)
+    target_compile_options(${target} PRIVATE /W4 $<$<BOOL:${ZB_WARNINGS_AS_ERRORS}>:/WX>)
+  else()
+    target_compile_options(${target} PRIVATE
+      -Wall -Wextra -Wpedantic -Wshadow -Wcast-align
+      $<$<COMPILE_LANGUAGE:CXX>:-Wnon-virtual-dtor -Woverloaded-virtual>
+      $<$<BOOL:${ZB_WARNINGS_AS_ERRORS}>:-Werror>)
+  endif()
+endfunction()

@@ -1,0 +1,42 @@
+/// \file
+/// What the library exports. C-clean.
+///
+/// `ZB_API` stands before every exported class and function. On ELF it gives default visibility. With mingw-w64 it is
+/// empty, as the names exported there are those of the library's committed export list. With MSVC it imports, unless
+/// `ZB_BUILDING` (the library itself) or `ZB_STATIC` (its objects linked into a program) is defined.
+
+#ifndef ZOR_BASIS_EXPORT_H
+#define ZOR_BASIS_EXPORT_H
+
+#if defined(_MSC_VER)
+#if defined(ZB_BUILDING)
+#define ZB_API __declspec(dllexport)
+#define ZB_EXTERN_TEMPLATE extern template class
+#define ZB_INSTANTIATE_TEMPLATE template class __declspec(dllexport)
+#elif defined(ZB_STATIC)
+#define ZB_API
+#define ZB_EXTERN_TEMPLATE extern template class
+#define ZB_INSTANTIATE_TEMPLATE template class
+#else
+#define ZB_API __declspec(dllimport)
+#define ZB_EXTERN_TEMPLATE extern template class __declspec(dllimport)
+#define ZB_INSTANTIATE_TEMPLATE template class
+#endif
+#elif defined(_WIN32)
+#define ZB_API
+#define ZB_EXTERN_TEMPLATE extern template class
+#define ZB_INSTANTIATE_TEMPLATE template class
+#else
+#define ZB_API __attribute__((visibility("default")))
+#define ZB_EXTERN_TEMPLATE extern template class __attribute__((visibility("default")))
+#define ZB_INSTANTIATE_TEMPLATE template class
+#endif
+
+/// C linkage for what C can call.
+#ifdef __cplusplus
+#define ZB_EXTERN_C extern "C"
+#else
+#define ZB_EXTERN_C
+#endif
+
+#endif

@@ -1,0 +1,22 @@
+/// \file
+/// Length and seed of random tests. `ZB_TEST_STEPS_FACTOR` multiplies every length, `ZB_TEST_SEED` replaces the seed.
+
+#ifndef TESTS_SUPPORT_RANDOM_STEPS_H
+#define TESTS_SUPPORT_RANDOM_STEPS_H
+
+#include <cstdint>
+#include <cstdlib>
+#include <random>
+
+inline std::uint64_t numberFromEnvironment(char const* name, std::uint64_t fallback) {
+    char const* text = std::getenv(name);
+    return text != nullptr && *text != '\0' ? std::strtoull(text, nullptr, 10) : fallback;
+}
+
+inline std::uint64_t randomSteps(std::uint64_t ordinary) {
+    return ordinary * numberFromEnvironment("ZB_TEST_STEPS_FACTOR", 1);
+}
+
+inline std::mt19937_64 randomSource() { return std::mt19937_64{numberFromEnvironment("ZB_TEST_SEED", 20'211)}; }
+
+#endif
