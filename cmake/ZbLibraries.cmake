@@ -4,6 +4,8 @@ if(WIN32)
   enable_language(RC)
 endif()
 
+option(ZB_SPLIT_DEBUG_SYMBOLS "Keep debug symbols in a file beside each library" OFF)
+
 # zb_shared_library(<target> IMAGE_BASE <address> DESCRIPTION <text>): settings common to all our shared libraries.
 # The exported names are those that carry an export macro in their headers; on Windows additionally only those of
 # cmake/exports/<target>.def, on ELF only those that the version script cmake/exports/<target>.map lets through.
@@ -21,12 +23,18 @@ function(zb_shared_library target)
       target_link_options(${target} PRIVATE -Wl,--image-base=${ARG_IMAGE_BASE})
     endif()
   else()
-    target_link_options(${target} PRIVATE -Wl,--version-script=${exports}.map -Wl,--no-undefined)
-    if(ZB_SANITIZE)
-      get_target_property(options ${target} LINK_OPTIONS)
-      list(REMOVE_ITEM options -Wl,--no-undefined)
-      set_target_properties(${target} PROPERTIES LINK_OPTIONS "${options}")
+    target_link_options(${target} PRIVATE -Wl,--version-script=${exports}.map)
+    if(NOT ZB_SANITIZE) # a sanitizer's functions are in the program
+      target_link_options(${target} PRIVATE -Wl,--no-undefined)
     endif()
     set_target_properties(${target} PROPERTIES LINK_DEPENDS ${exports}.map)
+  endif()
+  if(ZB_SPLIT_DEBUG_SYMBOLS)
+    # -p: objcopy otherwise puts the present time into a PE file.
+    add_custom_command(TARGET ${target} POST_BUILD
+      COMMAND ${CMAKE_OBJCOPY} -p --only-keep-debug $<TARGET_FILE:${target}> $<TARGET_FILE:${target}>.debug
+      COMMAND ${CMAKE_OBJCOPY} -p --strip-debug --add-gnu-debuglink=$<TARGET_FILE_NAME:${target}>.debug
+              $<TARGET_FILE:${target}>
+      WORKING_DIRECTORY $<TARGET_FILE_DIR:${target}> VERBATIM)
   endif()
 endfunction()

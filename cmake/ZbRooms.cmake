@@ -16,27 +16,35 @@ function(zb_room target)
   target_sources(${target} PRIVATE ${files})
 endfunction()
 
-# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LIBRARIES <targets>] [TIMEOUT <s>]): the tests of one room.
+# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LIBRARIES <targets>] [TIMEOUT <s>] [THREADED]): a room's tests.
 # All files make the program <room>_tests, which holds the library's objects and may see internal headers. The EXPORTED
-# ones also go into exported_tests, which uses nothing but the public headers and the shared library.
+# ones also go into exported_tests, which uses nothing but the public headers and the shared library. THREADED marks a
+# program that the thread sanitizer shall watch.
 function(zb_tests room)
-  cmake_parse_arguments(ARG "" "TIMEOUT" "EXPORTED;INTERNAL;LIBRARIES" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LIBRARIES" ${ARGN})
   add_executable(${room}_tests ${ARG_EXPORTED} ${ARG_INTERNAL})
   target_link_libraries(${room}_tests PRIVATE zb_test_support zor_basis_internal ${ARG_LIBRARIES})
   zb_warnings(${room}_tests)
-  zb_test_program(${room}_tests TIMEOUT ${ARG_TIMEOUT})
+  if(ARG_THREADED)
+    set(threaded THREADED)
+  endif()
+  zb_test_program(${room}_tests TIMEOUT ${ARG_TIMEOUT} ${threaded})
   list(TRANSFORM ARG_EXPORTED PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
   set_property(GLOBAL APPEND PROPERTY ZB_EXPORTED_TESTS ${ARG_EXPORTED})
 endfunction()
 
-# zb_test_program(<target> [TIMEOUT <s>]): registers one test program, run once as a whole.
+# zb_test_program(<target> [TIMEOUT <s>] [THREADED]): registers one test program, run once as a whole.
 function(zb_test_program target)
-  cmake_parse_arguments(ARG "" "TIMEOUT" "" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "" ${ARGN})
   if(NOT ARG_TIMEOUT)
-    set(ARG_TIMEOUT 300)
+    set(ARG_TIMEOUT 600)
   endif()
   add_test(NAME ${target} COMMAND ${target})
   set_tests_properties(${target} PROPERTIES TIMEOUT ${ARG_TIMEOUT})
+  if(ARG_THREADED)
+    set_tests_properties(${target} PROPERTIES LABELS threads)
+    add_dependencies(threaded_tests ${target})
+  endif()
   if(WIN32)
     set_tests_properties(${target} PROPERTIES FIXTURES_REQUIRED wine)
   endif()

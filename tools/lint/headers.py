@@ -1,0 +1,45 @@
+#!/usr/bin/env python3
+"""Every public header compiles alone and twice, with each compiler; C-clean headers compile as C too."""
+
+import common
+
+CXX = [
+    ["g++", "-std=c++20"],
+    ["clang++", "-std=c++20"],
+    ["x86_64-w64-mingw32-g++-posix", "-std=c++20"],
+]
+C = [
+    ["gcc", "-std=c11"],
+    ["clang", "-std=c11"],
+    ["x86_64-w64-mingw32-gcc-posix", "-std=c11"],
+]
+WARNINGS = ["-Wall", "-Wextra", "-Wpedantic", "-Wshadow", "-Werror"]
+INCLUDES = ["-Iinclude", "-Ihost/include", "-I."]
+
+headers = common.files("include/**.h", "host/include/*.h", "basis/platform/*.h")
+
+
+def is_c_clean(path):
+    return "C-clean" in common.text(path)[:1500]
+
+
+def name(path):
+    return str(path).removeprefix("host/include/").removeprefix("include/")
+
+
+def check(job):
+    path, compiler, language = job
+    source = f'#include "{name(path)}"\n#include "{name(path)}"\n'
+    if language == "c":
+        source += "typedef int zb_not_an_empty_file;\n"
+    command = [*compiler, *WARNINGS, *INCLUDES, "-fsyntax-only", "-x", language, "-"]
+    result = common.run(*command, input=source)
+    return [] if result.returncode == 0 else [f"{path} with {compiler[0]}:\n{result.stderr}"]
+
+
+public = [h for h in headers if "windows_api" not in str(h)]
+jobs = [(h, c, "c++") for h in public for c in CXX] + [(h, c, "c") for h in public if is_c_clean(h) for c in C]
+problems = [line for found in common.in_parallel(check, jobs) for line in found]
+if not any(is_c_clean(h) and h.name == "flat.h" for h in public):
+    problems.append("include/zor_basis/flat.h does not say that it is C-clean")
+common.finish("headers", problems, len(jobs))

@@ -1,0 +1,54 @@
+#!/usr/bin/env python3
+"""Behaviour that looks odd and is relied upon has an id. Each id is told in a public header (`\\kept id: text`), marked
+at its spot (`// kept id: text`) and pinned by a test whose name holds it (`Kept_room_01_…`). Writes docs/kept.md."""
+
+import re
+
+import common
+
+TOLD = re.compile(r"\\kept ([a-z]+(?:-[a-z]+)*-\d+):\s*(.*(?:\n\s*///\s{2,}.*)*)")
+SPOT = re.compile(r"(?://|/\*) kept ([a-z]+(?:-[a-z]+)*-\d+)\b")
+TEST = re.compile(r"\bKept_([a-z]+(?:_[a-z]+)*_\d+)_")
+HEAD = """# Kept behaviour
+
+What looks odd in this library and is relied upon, gathered from the public headers by `./dev lint kept`.
+Each line has a mark at its spot in the code and a test that fails as soon as the behaviour changes.
+
+"""
+
+
+def gather(pattern, paths, key=lambda match: match[1]):
+    found = {}
+    for path in paths:
+        for match in pattern.finditer(common.text(path)):
+            found.setdefault(key(match), []).append((path, match))
+    return found
+
+
+def main():
+    public = common.files("include/**.h", "host/include/*.h", "basis/platform/*.h")
+    sources = common.files("include/**.h", "basis/**", "host/**")
+    told = gather(TOLD, public)
+    spots = gather(SPOT, sources)
+    tests = gather(TEST, common.files("tests/**.cpp", "tests/**.h"), lambda match: match[1].replace("_", "-"))
+    problems = []
+    for identity in sorted(told.keys() | spots.keys() | tests.keys()):
+        for name, where in (("a \\kept line in a public header", told), ("a mark at its spot", spots), ("a test", tests)):
+            if identity not in where:
+                problems.append(f"{identity} lacks {name}")
+    lines, room = [], None
+    for identity in sorted(told):
+        path, match = told[identity][0]
+        if room != (room := identity.rsplit("-", 1)[0]):
+            lines.append(f"\n## {room}\n" if lines else f"## {room}\n")
+        words = " ".join(re.sub(r"\n\s*///", " ", match[2]).split())
+        lines.append(f"- **{identity}** {words} (`{str(path).removeprefix('include/')}`)")
+    page = common.ROOT / "docs/kept.md"
+    content = HEAD + "\n".join(lines) + "\n"
+    if not page.exists() or page.read_text() != content:
+        page.write_text(content)
+        problems.append("docs/kept.md was out of date and has been written anew; commit it")
+    common.finish("kept", problems, len(told))
+
+
+main()
