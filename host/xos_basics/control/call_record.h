@@ -37,11 +37,20 @@ struct CallRecord {
     std::atomic<TextBuffer*> texts;
 };
 
-/// The records of one thread.
+struct Semaphore;
+
+/// The records of one thread, and what else it keeps for itself.
 struct ThreadCalls {
+    /// Of the thread that uses the records now; never given twice. 0: shared by threads without memory for their own.
+    std::uint64_t threadSerial;
+    /// The thread's time as call_order.h counts it.
+    std::atomic<std::uint64_t> time;
     std::array<CallRecord, FUNCTION_COUNT> records;
-    /// Sequences at the last reset. Under the registry's mutex, as are the next two.
+    /// Sequences at the last reset. Under the registry's mutex, as are `next` and `inUse`.
     std::array<std::uint64_t, FUNCTION_COUNT> sequenceAtReset;
+    /// The thread's store of semaphore blocks.
+    Semaphore* freeSemaphores;
+    std::uint32_t freeSemaphoreCount;
     ThreadCalls* next;
     bool inUse;
     /// The text that `xos_HostLastCall` handed to this thread.
@@ -56,9 +65,6 @@ ThreadCalls* adoptThreadCalls();
 
 /// The only thread that has called a function so far; a value that is no thread's once there are several.
 extern constinit std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> soleCaller;
-
-/// The stamp of a call by a thread that is not known as its function's only caller.
-std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller);
 
 inline ThreadCalls& threadCalls() {
     ThreadCalls* const mine = currentThreadCalls;

@@ -11,6 +11,7 @@
 #ifndef HOST_XOS_BASICS_CONTROL_CONTROL_H
 #define HOST_XOS_BASICS_CONTROL_CONTROL_H
 
+#include "host/xos_basics/control/call_order.h"
 #include "host/xos_basics/control/call_record.h"
 #include "host/xos_basics/control/functions.h"
 
@@ -30,33 +31,58 @@ extern constinit std::atomic<std::uint32_t> armedFaults;
 /// Whether this call of the function is to fail; the last error is then set.
 bool takesInjectedFailure(Function function);
 
-template <class Argument>
-std::uint64_t argumentWord(CallRecord& record, Argument const& argument, std::size_t& textWords) {
-    if constexpr (std::is_same_v<Argument, char const*>) {
-        return keepText(record, argument, textWords);
-    } else if constexpr (std::is_pointer_v<Argument>) {
-        return reinterpret_cast<std::uintptr_t>(argument);
-    } else {
-        static_assert(std::is_integral_v<Argument>);
-        // Signed numbers keep their sign in 64 bits.
-        return static_cast<std::uint64_t>(static_cast<std::int64_t>(argument));
+/// Notes one call in the calling thread's record, from construction to destruction.
+class CallNote {
+public:
+    [[gnu::always_inline]] explicit CallNote(Function function) : CallNote(function, threadCalls()) {}
+    CallNote(CallNote const&) = delete;
+    CallNote& operator=(CallNote const&) = delete;
+    ~CallNote() { _record.sequence.store(_sequence + 2, std::memory_order_release); }
+
+    void addWord(std::uint64_t word) { _record.words[_arguments++].store(word, std::memory_order_release); }
+
+    void addText(char const* text) { addWord(keepText(_record, text, _textWords)); }
+
+    template <class Argument>
+    void add(Argument const& argument) {
+        if constexpr (std::is_same_v<Argument, char const*>) {
+            addText(argument);
+        } else if constexpr (std::is_pointer_v<Argument>) {
+            addWord(reinterpret_cast<std::uintptr_t>(argument));
+        } else {
+            static_assert(std::is_integral_v<Argument>);
+            // Signed numbers keep their sign in 64 bits.
+            addWord(static_cast<std::uint64_t>(static_cast<std::int64_t>(argument)));
+        }
     }
+
+private:
+    [[gnu::always_inline]] CallNote(Function function, ThreadCalls& mine)
+        : _record(mine.records[indexOf(function)]), _sequence(_record.sequence.load(std::memory_order_relaxed)) {
+        _record.sequence.store(_sequence + 1, std::memory_order_relaxed);
+        bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &mine;
+        _record.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
+    }
+
+    CallRecord& _record;
+    std::uint64_t const _sequence;
+    std::size_t _arguments{0};
+    std::size_t _textWords{0};
+};
+
+inline bool failsAfterNote(Function function) {
+    return armedFaults.load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
 }
 
+/// Inlined everywhere: with the function known, half of it folds away.
 template <class... Arguments>
-bool failsNow(Function function, Arguments const&... arguments) {
+[[gnu::always_inline]] inline bool failsNow(Function function, Arguments const&... arguments) {
     static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
-    ThreadCalls& mine = threadCalls();
-    CallRecord& record = mine.records[indexOf(function)];
-    std::uint64_t const sequence = record.sequence.load(std::memory_order_relaxed);
-    record.sequence.store(sequence + 1, std::memory_order_relaxed);
-    bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &mine;
-    record.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
-    [[maybe_unused]] std::size_t textWords = 0;
-    [[maybe_unused]] std::size_t index = 0;
-    (record.words[index++].store(argumentWord(record, arguments, textWords), std::memory_order_release), ...);
-    record.sequence.store(sequence + 2, std::memory_order_release);
-    return armedFaults.load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
+    {
+        CallNote note{function};
+        (note.add(arguments), ...);
+    }
+    return failsAfterNote(function);
 }
 
 } // namespace host

@@ -1,6 +1,6 @@
 #include "host/xos_basics/control/registry.h"
 
-#include "host/xos_basics/control/order_stamp.h"
+#include "host/xos_basics/control/call_order.h"
 #include "host/xos_basics/control/thread_end.h"
 
 #include <mutex>
@@ -12,7 +12,6 @@ constinit QuickMutex registryMutex;
 constinit ThreadCalls spareThreadCalls{};
 constinit ThreadCalls* registryHead = &spareThreadCalls;
 constinit thread_local ThreadCalls* currentThreadCalls = nullptr;
-constinit std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> soleCaller{};
 
 namespace {
 
@@ -35,9 +34,18 @@ ThreadCalls* freeOrNewCalls() {
 
 } // namespace
 
+void gatherTime() {
+    std::lock_guard const lock{registryMutex};
+    for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) { publishTime(*calls); }
+}
+
 ThreadCalls* adoptThreadCalls() {
     ThreadCalls* const calls = freeOrNewCalls();
     if (calls == nullptr) { return &spareThreadCalls; }
+    gatherTime();
+    calls->time.store(commonTime.load(std::memory_order_relaxed), std::memory_order_relaxed);
+    static constinit std::atomic<std::uint64_t> lastSerial{0};
+    calls->threadSerial = lastSerial.fetch_add(1, std::memory_order_relaxed) + 1;
     currentThreadCalls = calls;
     releaseAtThreadEnd(calls);
     return calls;
@@ -46,20 +54,9 @@ ThreadCalls* adoptThreadCalls() {
 void releaseThreadCalls(ThreadCalls* calls) {
     // Whatever still ends in this thread and calls us gets records anew, and gives them back in the next round.
     currentThreadCalls = nullptr;
+    publishTime(*calls);
     std::lock_guard const lock{registryMutex};
     calls->inUse = false;
-}
-
-std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller) {
-    std::atomic<ThreadCalls*>& sole = soleCaller[indexOf(function)];
-    ThreadCalls* seen = sole.load(std::memory_order_relaxed);
-    if (seen == nullptr && sole.compare_exchange_strong(seen, &caller, std::memory_order_relaxed)) { return 0; }
-    if (seen != &spareThreadCalls) {
-        // From here on every call is stamped, the former sole caller's too: a call of its that comes after this one
-        // sees the mark.
-        sole.store(&spareThreadCalls, std::memory_order_relaxed);
-    }
-    return orderStamp();
 }
 
 } // namespace host

@@ -18,6 +18,9 @@ extern constinit ThreadCalls* registryHead;
 /// Shared by the threads for which no memory was left, and the mark of a function that several threads have called.
 extern constinit ThreadCalls spareThreadCalls;
 
+/// Makes the calls that follow, in whatever thread, later than all that were made.
+void gatherTime();
+
 } // namespace host
 
 #endif
