@@ -33,13 +33,13 @@ function(zb_tests room)
   set_property(GLOBAL APPEND PROPERTY ZB_EXPORTED_TESTS ${ARG_EXPORTED})
 endfunction()
 
-# zb_test_program(<target> [TIMEOUT <s>] [THREADED]): registers one test program, run once as a whole.
+# zb_test_program(<target> [ARGUMENTS <words>] [TIMEOUT <s>] [THREADED]): registers one test program, run as a whole.
 function(zb_test_program target)
-  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "ARGUMENTS" ${ARGN})
   if(NOT ARG_TIMEOUT)
     set(ARG_TIMEOUT 600)
   endif()
-  add_test(NAME ${target} COMMAND ${target})
+  add_test(NAME ${target} COMMAND ${target} ${ARG_ARGUMENTS})
   set_tests_properties(${target} PROPERTIES TIMEOUT ${ARG_TIMEOUT})
   if(ARG_THREADED)
     set_tests_properties(${target} PROPERTIES LABELS threads)

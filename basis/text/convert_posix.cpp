@@ -1,0 +1,42 @@
+// Conversions by our own UTF-8 and by the locale's character set. The sibling is convert_win.cpp.
+
+#include "basis/text/convert_impl.h"
+
+#include "basis/text/charset_posix.h"
+#include "basis/text/utf.h"
+
+namespace ZOR_Basis::ConvertImpl {
+namespace {
+
+constexpr std::uint64_t MOST_BYTES_A_UNIT = 3;
+
+bool isUtf8(Convert::Encoding encoding) { return encoding == Convert::ENC_UTF8 || Charset::isUtf8(Charset::local()); }
+
+bool utf8ToWide(char const* text, std::uint64_t size, WBStr& out) {
+    // UTF-16 never has more units than UTF-8 has bytes: where that many fit, nothing needs counting.
+    if (size >= out.sizeBuf()) out.extendBuf(Utf::utf16Length(text, size) + 1);
+    std::uint64_t const written = Utf::toUtf16(text, size, out.getBuf());
+    out.setSize(written != Utf::INVALID ? written : 0);
+    return written != Utf::INVALID;
+}
+
+bool wideToUtf8(WChar const* text, std::uint64_t size, BufStr<255>& out) {
+    if (size * MOST_BYTES_A_UNIT >= out.sizeBuf()) out.extendBuf(Utf::utf8Length(text, size) + 1);
+    // kept convert-01: `resize` measures up to the first zero, so that the size is that of the text as C sees it.
+    out.resize(Utf::toUtf8(text, size, out.getBuf()));
+    return true;
+}
+
+} // namespace
+
+bool samePage(Convert::Encoding a, Convert::Encoding b) { return isUtf8(a) == isUtf8(b); }
+
+bool narrowToWide(Convert::Encoding from, char const* text, std::uint64_t size, WBStr& out) {
+    return isUtf8(from) ? utf8ToWide(text, size, out) : Charset::toWide(Charset::local(), text, size, out);
+}
+
+bool wideToNarrow(WChar const* text, std::uint64_t size, Convert::Encoding to, BufStr<255>& out) {
+    return isUtf8(to) ? wideToUtf8(text, size, out) : Charset::fromWide(Charset::local(), text, size, out);
+}
+
+} // namespace ZOR_Basis::ConvertImpl

@@ -1,0 +1,39 @@
+/// \file
+/// UTF-8 and UTF-16 (RFC 3629, RFC 2781), each checked and converted as it is read.
+
+#ifndef BASIS_TEXT_UTF_H
+#define BASIS_TEXT_UTF_H
+
+#include "zor_basis/wide_char.h"
+
+#include <cstdint>
+
+namespace ZOR_Basis::Utf {
+
+inline constexpr std::uint64_t INVALID = ~std::uint64_t{0};
+
+/// The code units of the UTF-16 form of `size` bytes of valid UTF-8. Of other text: a number that `toUtf16` does not
+/// exceed before it finds the fault.
+std::uint64_t utf16Length(char const* text, std::uint64_t size);
+
+/// Writes the UTF-16 form of `size` bytes of UTF-8. Overlong forms, surrogates, values above U+10FFFF, stray and missing
+/// continuation bytes are invalid.
+/// \param out  room for `utf16Length` units; no terminator is written
+/// \return the units written; INVALID if the text is, with some units written
+std::uint64_t toUtf16(char const* text, std::uint64_t size, WChar* out);
+
+/// The bytes of the UTF-8 form of `size` units of UTF-16, an unpaired surrogate counting as U+FFFD.
+std::uint64_t utf8Length(WChar const* text, std::uint64_t size);
+
+/// Writes the UTF-8 form of `size` units of UTF-16, U+FFFD for each unpaired surrogate.
+/// \param out  room for `utf8Length` bytes; no terminator is written
+/// \return the bytes written
+std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out);
+
+inline constexpr bool isSurrogate(std::uint32_t unit) { return (unit & 0xF800) == 0xD800; }
+inline constexpr bool isHighSurrogate(std::uint32_t unit) { return (unit & 0xFC00) == 0xD800; }
+inline constexpr bool isLowSurrogate(std::uint32_t unit) { return (unit & 0xFC00) == 0xDC00; }
+
+} // namespace ZOR_Basis::Utf
+
+#endif

@@ -1,0 +1,43 @@
+/// \file
+/// `Auto_ptr_CStr`: owns one character array, for calls that fill a zero-terminated buffer.
+
+#ifndef ZOR_BASIS_TEXT_AUTO_PTR_CSTR_H
+#define ZOR_BASIS_TEXT_AUTO_PTR_CSTR_H
+
+#include "zor_basis/export.h"
+
+#include <cstdint>
+#include <string>
+
+/// Not copyable. The buffer comes from the runtime's `malloc`, tried again through the new-handler of the library's own
+/// runtime, and goes back through `free`.
+class ZB_API Auto_ptr_CStr {
+public:
+    /// A buffer of n + 2 bytes that begins with a terminator; its length is n.
+    /// \error throws `std::bad_alloc` where memory is short and no new-handler helps
+    Auto_ptr_CStr(std::uint64_t n);
+    /// A buffer that holds the text and a terminator; its length is the text's size.
+    /// \error throws `std::bad_alloc` where memory is short and no new-handler helps
+    Auto_ptr_CStr(std::string text);
+    ~Auto_ptr_CStr();
+
+    char* c_str() noexcept { return buffer_; }
+    char const* c_str() const noexcept { return buffer_; }
+    operator char*() noexcept { return buffer_; }
+    std::uint64_t length() const noexcept { return length_; }
+
+    /// Makes sure that what a callee has filled to the brim is terminated.
+    /// \kept text-14: the last counted byte gives way, so "abc" becomes "ab"; with a length of 0 nothing happens
+    void assureTerm0() noexcept;
+
+private:
+    Auto_ptr_CStr(Auto_ptr_CStr const&) = delete;
+    Auto_ptr_CStr& operator=(Auto_ptr_CStr const&) = delete;
+
+    char* buffer_;
+    std::uint64_t length_;
+};
+
+static_assert(sizeof(Auto_ptr_CStr) == 16);
+
+#endif

@@ -1,0 +1,217 @@
+/// \file
+/// `BufStr<15>` and `BufStr<255>`: narrow strings that keep short text inside the object.
+///
+/// Up to N bytes lie in the object itself, mostly on the stack; longer text goes to a heap block of exactly the size
+/// that the moment asks for. A string never moves back: `clear`, `cut` and shorter texts keep the block and its capacity
+/// for the next long text. No text is ever truncated.
+///
+/// A source may lie inside the string's own text, in every member: nothing is released or overwritten before it has
+/// been copied. A source with a length is copied up to its terminator, see text-06. Where memory is short the program
+/// is aborted. There are no move operations: a move copies.
+
+#ifndef ZOR_BASIS_TEXT_BUF_STR_H
+#define ZOR_BASIS_TEXT_BUF_STR_H
+
+#include "zor_basis/text/inline_text.h"
+#include "zor_basis/text/str.h"
+
+#include <concepts>
+#include <cstdint>
+#include <cstdlib>
+#include <functional>
+#include <string>
+
+namespace ZOR_Basis {
+
+/// \kept text-04: a text of N bytes or more that is assigned goes to the heap: 15 bytes into a `BufStr<15>` give a
+///       capacity of 16
+/// \kept text-05: a text that is built by appending stays inside up to exactly N bytes
+/// \kept text-06: a source that was given with a length is copied up to its terminator and padded with zeros, while the
+///       size becomes the given length
+/// \kept text-07: once on the heap, always on the heap, with a capacity that never shrinks
+/// \kept text-08: growth is exact, without doubling or rounding: a byte appended to a full block makes a block that is
+///       one byte larger
+template <std::uint64_t N>
+requires(N == 15 || N == 255) class BufStr : public Str {
+    using Text = detail::InlineText<BufStr, char, N>;
+    friend Text;
+
+public:
+    /// Empty, inside the object.
+    BufStr() noexcept { Text::start(*this); }
+    /// Copies of texts, each made as by assigning to an empty string.
+    BufStr(char const* text, std::uint64_t n = 0) : BufStr() { Text::assign(*this, text, n); }
+    BufStr(Str const& text) : BufStr() { Text::assign(*this, text.c_str(), text.size()); }
+    BufStr(std::string const& text) : BufStr() { Text::assign(*this, text.c_str(), text.size()); }
+    BufStr(BufStr const& other) : BufStr() { Text::assign(*this, other.text_, other.size_); }
+    ~BufStr() { Text::end(*this); }
+
+    /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
+    BufStr& operator=(BufStr const& other) {
+        if (this != &other) Text::assign(*this, other.text_, other.size_);
+        return *this;
+    }
+    BufStr& operator=(Str const& text) {
+        if (this != &text) Text::assign(*this, text.c_str(), text.size());
+        return *this;
+    }
+    BufStr& operator=(std::string const& text) {
+        Text::assign(*this, text.c_str(), text.size());
+        return *this;
+    }
+    BufStr& operator=(char const* text) {
+        if (text != text_) Text::assign(*this, text, 0);
+        return *this;
+    }
+    BufStr& copy(char const* text, std::uint64_t n = 0) {
+        Text::assign(*this, text, n);
+        return *this;
+    }
+
+    /// Appends a text; an empty source changes nothing.
+    BufStr& add(char const* text, std::uint64_t n = 0) {
+        Text::append(*this, text, n);
+        return *this;
+    }
+    BufStr& add(Str const& text) { return add(text.c_str(), text.size()); }
+    /// Appends the first n bytes; all of them for n = 0 and for n beyond the size.
+    BufStr& add(std::string const& text, std::uint64_t n = 0) {
+        return add(text.c_str(), n != 0 && n < text.size() ? n : text.size());
+    }
+    /// Appends one byte.
+    /// \kept text-09: the byte 0 appends nothing
+    template <std::integral C>
+    BufStr& add(C c) {
+        Text::append(*this, static_cast<char>(c));
+        return *this;
+    }
+    BufStr& operator+=(std::string const& text) { return add(text); }
+    BufStr& operator+=(Str const& text) { return add(text); }
+    BufStr& operator+=(char const* text) { return add(text); }
+    template <std::integral C>
+    BufStr& operator+=(C c) {
+        return add(c);
+    }
+    BufStr& operator<<(Str const& text) { return add(text); }
+    BufStr& operator<<(char const* text) { return add(text); }
+    /// Appends the decimal digits of a number, taken as an `int`, characters included.
+    template <std::integral I>
+    BufStr& operator<<(I number) {
+        return addNumber(static_cast<int>(number));
+    }
+
+    /// The byte at an index, for writing; the index is not checked.
+    template <detail::Index I>
+    char& operator[](I index) noexcept {
+        return getBuf()[static_cast<std::uint64_t>(index)];
+    }
+    /// The byte at an index; 0 at the size and beyond.
+    template <detail::Index I>
+    char operator[](I index) const noexcept {
+        auto const i = static_cast<std::uint64_t>(index);
+        return i < size_ ? text_[i] : '\0';
+    }
+
+    /// The text for writing directly, capacity + 1 bytes; `resize` has to follow.
+    char* getBuf() noexcept { return Text::text(*this); }
+    /// The capacity: N inside the object, else the block's; the terminator is not counted.
+    std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
+    /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
+    void extendBuf(std::uint64_t n) { CopyIfTooLong(text_, n, size_); }
+    /// Measures the text again after direct writes, at most n bytes of it; n = 0 sets no bound.
+    /// \kept text-10: first stores a terminator at the index of the capacity, so that the last byte of a buffer filled to
+    ///       the brim is lost rather than the end of the text
+    void resize(std::uint64_t n = 0) noexcept { Text::resize(*this, n); }
+    /// Empties the text; a block is kept.
+    void clear() noexcept { Text::setSize(*this, 0); }
+    /// Takes away the last byte, if there is one.
+    void cut() noexcept { Text::cutLast(*this); }
+    /// Cuts the text to n bytes; a shorter text is only terminated again at its size.
+    void cut(std::uint64_t n) noexcept { Text::cutTo(*this, n); }
+
+    /// Inserts a text; behind the size nothing happens. What follows moves byte for byte, inner zeros included.
+    BufStr& insert(std::uint64_t pos, char const* text, std::uint64_t n = 0) {
+        Text::insert(*this, pos, text, n);
+        return *this;
+    }
+    BufStr& insert(std::uint64_t pos, Str const& text) { return insert(pos, text.c_str(), text.size()); }
+    /// Puts a text in place of `count` bytes, or of those that there are; a count of 0 inserts, and an empty source only
+    /// removes. At the size it appends, behind it nothing happens.
+    BufStr& replace(std::uint64_t pos, std::uint64_t count, char const* text, std::uint64_t n = 0) {
+        Text::replace(*this, pos, count, text, n);
+        return *this;
+    }
+    BufStr& replace(std::uint64_t pos, std::uint64_t count, Str const& text) {
+        return replace(pos, count, text.c_str(), text.size());
+    }
+    /// Cuts to `pos` bytes where the text is longer, then appends.
+    BufStr& replaceTail(std::uint64_t pos, char const* text, std::uint64_t n = 0) {
+        Text::replaceTail(*this, pos, text, n);
+        return *this;
+    }
+    BufStr& replaceTail(std::uint64_t pos, Str const& text) { return replaceTail(pos, text.c_str(), text.size()); }
+
+    /// Changes all bytes by the runtime's `tolower` and `toupper`.
+    BufStr& toLower() noexcept {
+        ToLower(getBuf(), size_);
+        return *this;
+    }
+    BufStr& toUpper() noexcept {
+        ToUpper(getBuf(), size_);
+        return *this;
+    }
+
+    /// Becomes the bytes of a zero-terminated text as two lower-case hexadecimal digits each: "AZ" gives "415a".
+    BufStr& toHex(char const* text);
+    /// Appends one byte for each pair of hexadecimal digits, by the rule of `decodeHexChar`. An odd last digit is ignored.
+    /// \kept text-11: a pair that gives 0 appends nothing: "41004200" appends "AB"
+    BufStr& fromHex(char const* digits);
+
+    /// Counts on in the letters a to z: "" to "a", "a" to "b", "az" to "ba", "zz" to "aaa".
+    /// \kept text-12: whatever is not "z" is incremented, letter or not: "Z" becomes "["
+    BufStr& NextLatin() {
+        NextLatin(*this, size_ != 0 ? size_ - 1 : 0);
+        return *this;
+    }
+    /// The same step from the byte at `pos` leftwards; an empty string becomes "a", behind the last byte nothing happens.
+    static void NextLatin(BufStr& text, std::uint64_t pos) { Text::nextLatin(text, pos); }
+
+protected:
+    /// The capacity check, through which every block comes: where max(need, keep + 1) is beyond the capacity, moves to a
+    /// new block of exactly that capacity with `keep` bytes of the source, by text-06, and a terminator behind them.
+    /// \return whether it did; the size is the caller's business
+    bool CopyIfTooLong(char const* source, std::uint64_t need, std::uint64_t keep) {
+        return Text::copyIfTooLong(*this, source, need, keep);
+    }
+    /// n bytes from the runtime's heap.
+    char* alloc(std::uint64_t n) noexcept { return static_cast<char*>(std::malloc(n)); }
+    /// Releases the text.
+    void free() noexcept { std::free(getBuf()); }
+
+private:
+    BufStr& addNumber(int number);
+
+    detail::TextArea<char, N> area_;
+};
+
+/// The everyday string: names, extensions, small numbers.
+ZB_EXTERN_TEMPLATE detail::InlineText<BufStr<15>, char, 15>;
+ZB_EXTERN_TEMPLATE BufStr<15>;
+/// The string for paths.
+ZB_EXTERN_TEMPLATE detail::InlineText<BufStr<255>, char, 255>;
+ZB_EXTERN_TEMPLATE BufStr<255>;
+
+static_assert(sizeof(BufStr<15>) == 32 && sizeof(BufStr<255>) == 272);
+
+} // namespace ZOR_Basis
+
+/// Over the bytes before the terminator, at most `size` of them.
+template <std::uint64_t N>
+struct std::hash<ZOR_Basis::BufStr<N>> {
+    std::size_t operator()(ZOR_Basis::BufStr<N> const& text) const noexcept {
+        return std::hash<std::string_view>()(
+            {text.c_str(), ZOR_Basis::detail::textLengthUpTo(text.c_str(), text.size())});
+    }
+};
+
+#endif

@@ -1,0 +1,119 @@
+/// \file
+/// What narrow and wide text have in common, as functions over the character type. The text classes are made of these;
+/// users have no need of them.
+///
+/// Copies come in two kinds. A text that has just been measured has no terminator inside and is moved whole
+/// (`moveText`). A text whose length somebody gave is copied up to its terminator and padded with zeros (`copyText`);
+/// nothing behind its terminator is read, as there may be nothing.
+
+#ifndef ZOR_BASIS_TEXT_CHAR_OPS_H
+#define ZOR_BASIS_TEXT_CHAR_OPS_H
+
+#include "zor_basis/export.h"
+#include "zor_basis/wide_char.h"
+
+#include <concepts>
+#include <cstdint>
+#include <cstring>
+#include <string>
+#include <type_traits>
+
+namespace ZOR_Basis::detail {
+
+/// Everything that may stand as an index: all integers, and enumerations that turn into integers by themselves.
+template <class T>
+concept Index = std::integral<T> ||(std::is_enum_v<T>&& std::is_convertible_v<T, std::int64_t>);
+
+/// Units before the terminator.
+template <class Char>
+inline std::uint64_t textLength(Char const* text) noexcept {
+    return std::char_traits<Char>::length(text);
+}
+
+/// Null or empty.
+template <class Char>
+inline bool isNothing(Char const* text) noexcept {
+    return text == nullptr || *text == Char();
+}
+
+/// The length that a (text, length) source stands for: 0 for a null or empty text, and a length of 0 means measured.
+template <class Char>
+inline std::uint64_t sourceLength(Char const* text, std::uint64_t length) noexcept {
+    if (isNothing(text)) return 0;
+    return length != 0 ? length : textLength(text);
+}
+
+/// Units before the terminator, at most `limit`. Reads nothing behind the terminator.
+ZB_API std::uint64_t textLengthUpTo(char const* text, std::uint64_t limit) noexcept;
+ZB_API std::uint64_t textLengthUpTo(WChar const* text, std::uint64_t limit) noexcept;
+
+/// Less than 0, 0 or greater than 0, by unsigned units, up to the terminators. Null counts as the empty text.
+ZB_API int compareTexts(char const* a, char const* b) noexcept;
+ZB_API int compareTexts(WChar const* a, WChar const* b) noexcept;
+
+/// The same over at most `limit` units.
+ZB_API int compareTextsUpTo(char const* a, char const* b, std::uint64_t limit) noexcept;
+ZB_API int compareTextsUpTo(WChar const* a, WChar const* b, std::uint64_t limit) noexcept;
+
+/// The first occurrence of `wanted` in `text`, or null; a null text or a null `wanted` has none.
+ZB_API char const* findText(char const* text, char const* wanted) noexcept;
+ZB_API WChar const* findText(WChar const* text, WChar const* wanted) noexcept;
+
+/// Copies the text before the terminator, at most `length` units, and pads with zeros to `length` units. Writes no
+/// terminator behind them. The source may overlap the target.
+ZB_API void copyText(char* target, char const* source, std::uint64_t length) noexcept;
+ZB_API void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept;
+
+// The compiler cannot see that the wide moves are not reached for short texts.
+#if defined(__GNUC__) && !defined(__clang__)
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Warray-bounds"
+#pragma GCC diagnostic ignored "-Wstringop-overflow"
+#pragma GCC diagnostic ignored "-Wstringop-overread"
+#endif
+
+/// Moves `Block`-sized ends, which together cover `bytes` bytes. Both ends are read before anything is written.
+template <class Block>
+inline void moveEnds(void* target, void const* source, std::uint64_t bytes) noexcept {
+    std::uint64_t const last = bytes - sizeof(Block);
+    Block head;
+    Block tail;
+    std::memcpy(&head, source, sizeof(Block));
+    std::memcpy(&tail, static_cast<char const*>(source) + last, sizeof(Block));
+    std::memcpy(target, &head, sizeof(Block));
+    std::memcpy(static_cast<char*>(target) + last, &tail, sizeof(Block));
+}
+
+/// Moves bytes between places that may overlap; short texts without a call.
+inline void moveBytes(void* target, void const* source, std::uint64_t bytes) noexcept {
+    struct Sixteen {
+        std::uint64_t half[2];
+    };
+    if (bytes > 2 * sizeof(Sixteen)) {
+        std::memmove(target, source, bytes);
+    } else if (bytes >= sizeof(Sixteen)) {
+        moveEnds<Sixteen>(target, source, bytes);
+    } else if (bytes >= sizeof(std::uint64_t)) {
+        moveEnds<std::uint64_t>(target, source, bytes);
+    } else if (bytes >= sizeof(std::uint32_t)) {
+        moveEnds<std::uint32_t>(target, source, bytes);
+    } else if (bytes >= sizeof(std::uint16_t)) {
+        moveEnds<std::uint16_t>(target, source, bytes);
+    } else if (bytes == 1) {
+        std::memcpy(target, source, 1);
+    }
+}
+
+#if defined(__GNUC__) && !defined(__clang__)
+#pragma GCC diagnostic pop
+#endif
+
+/// Moves `length` units, all of which may be read. The source may overlap the target.
+template <class Char>
+inline void moveText(Char* target, Char const* source, std::uint64_t length) noexcept {
+    moveBytes(target, source, length * sizeof(Char));
+}
+
+} // namespace ZOR_Basis::detail
+
+#endif

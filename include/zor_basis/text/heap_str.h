@@ -1,0 +1,88 @@
+/// \file
+/// `HeapStr`: a narrow string whose text always lies in a heap block of exactly its length, or is the shared empty text.
+///
+/// For texts that are stored for long: two words and a capacity, nothing inside the object. There is no appending; text is
+/// built in a `BufStr` and then stored here. A source may lie inside the own text. A source is copied up to its
+/// terminator and padded with zeros (text-06). Where memory is short the program is aborted. There are no move
+/// operations: a move copies.
+
+#ifndef ZOR_BASIS_TEXT_HEAP_STR_H
+#define ZOR_BASIS_TEXT_HEAP_STR_H
+
+#include "zor_basis/text/str.h"
+
+#include <cstdint>
+#include <functional>
+#include <string>
+
+namespace ZOR_Basis {
+
+/// \kept text-13: a length of 0 means empty here, it is never measured: a view of size 0 on "x" gives the empty string,
+///       and a source that begins with the terminator keeps its length
+class ZB_API HeapStr : public Str {
+public:
+    HeapStr() noexcept : capacity_(0) {}
+    /// Measures the text; null gives the empty string.
+    HeapStr(char const* text);
+    /// Exactly n bytes; empty for n = 0 and for null.
+    HeapStr(char const* text, std::uint64_t n);
+    HeapStr(Str const& text);
+    HeapStr(std::string const& text);
+    HeapStr(HeapStr const& other);
+    ~HeapStr();
+
+    /// As `set` with the size of the source.
+    HeapStr& operator=(HeapStr const& other);
+    HeapStr& operator=(Str const& text);
+    HeapStr& operator=(std::string const& text);
+    /// As `set(text)`.
+    HeapStr& operator=(char const* text);
+
+    /// Stores a measured text; null gives the empty string.
+    HeapStr& set(char const* text);
+    /// Stores exactly n bytes, in a block of exactly n + 1: the present one where its capacity is n, else a new one.
+    /// For n = 0 and for null the block is released.
+    HeapStr& set(char const* text, std::uint64_t n);
+    /// Releases the block and views the shared empty text.
+    void clear() noexcept;
+    /// Takes away the last byte, if there is one; the block stays as it is.
+    void cut() noexcept;
+    /// Cuts the text to n bytes; a shorter text is only terminated again at its size. The block stays as it is.
+    void cut(std::uint64_t n) noexcept;
+    /// Changes all bytes by the runtime's `tolower` and `toupper`.
+    HeapStr& toLower() noexcept;
+    HeapStr& toUpper() noexcept;
+
+protected:
+    /// A block of n + 1 bytes; size and capacity become n. Releases nothing and terminates nothing.
+    void alloc(std::uint64_t n);
+    /// What a constructor does: `set` without looking at an old block.
+    void copy(char const* text, std::uint64_t n);
+    void reassign(char const* text, std::uint64_t n);
+    /// Views the shared empty text with size 0; the capacity stays as it is.
+    void setEmpty() noexcept;
+    /// Releases the text.
+    void free() noexcept;
+
+    /// Bytes of text that the block holds; 0 if and only if the text is the shared empty one.
+    std::uint64_t capacity_;
+
+private:
+    char* buffer() noexcept { return const_cast<char*>(text_); }
+    bool hasBlock() const noexcept { return capacity_ > 0 && text_ != StrEmpty; }
+};
+
+static_assert(sizeof(HeapStr) == 24);
+
+} // namespace ZOR_Basis
+
+/// Over the bytes before the terminator, at most `size` of them.
+template <>
+struct std::hash<ZOR_Basis::HeapStr> {
+    std::size_t operator()(ZOR_Basis::HeapStr const& text) const noexcept {
+        return std::hash<std::string_view>()(
+            {text.c_str(), ZOR_Basis::detail::textLengthUpTo(text.c_str(), text.size())});
+    }
+};
+
+#endif

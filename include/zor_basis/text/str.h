@@ -1,0 +1,154 @@
+/// \file
+/// `Str`: a read-only view of narrow text.
+///
+/// Every parameter of text in the library is a `Str const&`. A view is two words and owns nothing: the text must
+/// outlive it. It is also the base of the owning strings, which keep their text zero-terminated.
+///
+/// **Lengths.** Where a text is a source, as (text, length), as a `Str` or as a `std::string`, a length of 0 means
+/// "measure it": up to the terminator. A null text, or one whose first byte is the terminator, is an empty source
+/// whatever its length. `HeapStr` is the exception and takes every length as it stands.
+///
+/// **Comparing.** `==` looks at sizes, ordering does not; the two need not agree about texts with inner zeros or about
+/// views of parts of a text. A null text compares as the empty one.
+
+#ifndef ZOR_BASIS_TEXT_STR_H
+#define ZOR_BASIS_TEXT_STR_H
+
+#include "zor_basis/containers/hashing.h"
+#include "zor_basis/export.h"
+#include "zor_basis/text/char_ops.h"
+
+#include <compare>
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace ZOR_Basis {
+
+class ZB_API Str {
+public:
+    /// The one empty text that all views and strings share. Never written, never released; set before any code runs.
+    static char const* const StrEmpty;
+
+    /// Views the empty text.
+    Str() noexcept : size_(0), text_(StrEmpty) {}
+
+    /// Views a zero-terminated text and measures it.
+    /// \param text  null gives the empty text
+    Str(char const* text) noexcept
+        : size_(text != nullptr ? detail::textLength(text) : 0), text_(text != nullptr ? text : StrEmpty) {}
+
+    /// Stores both words as given; nothing is measured.
+    Str(char const* text, std::uint64_t size) noexcept : size_(size), text_(text) {}
+
+    /// Views the text of a standard string with its size.
+    Str(std::string const& text) noexcept : size_(text.size()), text_(text.c_str()) {}
+
+    /// Bytes of text, without the terminator.
+    std::uint64_t size() const noexcept { return size_; }
+    char const* c_str() const noexcept { return text_; }
+    operator char const*() const noexcept { return text_; }
+    /// The text with the size as it is, inner zeros included.
+    explicit operator std::string_view() const noexcept { return {text_, size_}; }
+    bool empty() const noexcept { return size_ == 0; }
+    bool some() const noexcept { return size_ > 0; }
+
+    /// The first byte; the terminator where the text is empty.
+    char first() const noexcept { return *text_; }
+    /// The last byte.
+    /// \pre not empty
+    char last() const noexcept { return text_[size_ - 1]; }
+    /// The byte at an index, which is not checked.
+    template <detail::Index I>
+    char operator[](I index) const noexcept {
+        return text_[static_cast<std::uint64_t>(index)];
+    }
+
+    /// The first occurrence in this text, both up to their terminators.
+    /// \return a pointer into this text, or null; null for null
+    char const* find(char const* text) const noexcept { return detail::findText(text_, text); }
+
+    /// Whether this text begins with the prefix, which counts with its size as it is: a prefix of size 0 always matches.
+    bool beginWith(Str const& prefix) const noexcept {
+        return prefix.text_ == text_ || prefix.size_ == 0 ||
+               detail::compareTextsUpTo(prefix.text_, text_, prefix.size_) == 0;
+    }
+
+    /// Whether the texts are equal.
+    /// \kept text-01: the right-hand size alone chooses the comparison. Not 0: both sizes must be the same, and so must
+    ///       be that many bytes, compared up to a common terminator. 0: the two texts up to their terminators. So a
+    ///       view of 3 bytes of "abcdef" equals "abc", while with a right-hand view of size 0 they differ
+    /// \cost none where both point at the same text, which is always equal
+    bool operator==(Str const& other) const noexcept { return eq(other.text_, other.size_); }
+    bool operator==(std::string const& other) const noexcept { return eq(other.c_str(), other.size()); }
+    /// Whether the texts are equal up to their terminators; this size is not looked at.
+    bool operator==(char const* other) const noexcept { return eq(other, 0); }
+    bool operator!=(Str const& other) const noexcept { return !(*this == other); }
+    bool operator!=(std::string const& other) const noexcept { return !(*this == other); }
+    bool operator!=(char const* other) const noexcept { return !(*this == other); }
+
+    // The same from the other side; here the `Str` is the right-hand operand, whose size decides.
+    friend bool operator==(char const* a, Str const& b) noexcept { return Str(a) == b; }
+    friend bool operator==(std::string const& a, Str const& b) noexcept { return Str(a) == b; }
+    friend bool operator!=(char const* a, Str const& b) noexcept { return !(a == b); }
+    friend bool operator!=(std::string const& a, Str const& b) noexcept { return !(a == b); }
+
+    /// `==` with the source (text, n), n being the right-hand size.
+    bool eq(char const* text, std::uint64_t n = 0) const noexcept {
+        if (text_ == text) return true;
+        // kept text-01: callers compare parts of texts by giving the right-hand side a size
+        if (n != 0) return size_ == n && detail::compareTextsUpTo(text_, text, n) == 0;
+        return detail::compareTexts(text_, text) == 0;
+    }
+
+    /// -1, 0 or 1: the order of the unsigned bytes up to the terminators. The same text gives 0.
+    /// \kept text-02: sizes do not take part, so a view of a part of a text is ordered as the whole rest of it
+    int compare(Str const& other) const noexcept { return compare(other.text_); }
+    int compare(char const* other) const noexcept {
+        if (text_ == other) return 0;
+        // kept text-02: ordering is by terminated texts, as sorted lists of views rely on it
+        int const order = detail::compareTexts(text_, other);
+        return (order > 0) - (order < 0);
+    }
+    /// The order of the first n unsigned bytes, as `strncmp` gives it; 0 for n = 0 and for the same text.
+    int compare(char const* other, std::uint64_t n) const noexcept {
+        return text_ == other ? 0 : detail::compareTextsUpTo(text_, other, n);
+    }
+
+    /// The order of `compare`, which also gives `>`, `<=`, `>=` and all of them from the other side.
+    bool operator<(Str const& other) const noexcept { return compare(other) < 0; }
+    std::weak_ordering operator<=>(Str const& other) const noexcept { return compare(other) <=> 0; }
+    std::weak_ordering operator<=>(std::string const& other) const noexcept { return compare(other.c_str()) <=> 0; }
+    std::weak_ordering operator<=>(char const* other) const noexcept { return compare(other) <=> 0; }
+
+    /// `hashDjb2` of the text: over the bytes before the terminator, whatever the size.
+    std::uint64_t hash() const noexcept { return hashDjb2(text_, size_); }
+
+    /// Changes n bytes in place by the runtime's `tolower` and `toupper`.
+    static void ToLower(char* text, std::uint64_t n) noexcept;
+    static void ToUpper(char* text, std::uint64_t n) noexcept;
+
+    static bool isHexDigit(char c) noexcept { return hexToDigit(c) >= 0; }
+    /// 0 to 15 for a hexadecimal digit of either case, else -1.
+    static int hexToDigit(char c) noexcept {
+        if (c >= '0' && c <= '9') return c - '0';
+        if (c >= 'a' && c <= 'f') return c - 'a' + 10;
+        if (c >= 'A' && c <= 'F') return c - 'A' + 10;
+        return -1;
+    }
+    /// Writes the two lower-case hexadecimal digits of a byte, the high one first, and no terminator.
+    static void ch2hex(char c, char* digits) noexcept;
+    /// The byte that two hexadecimal digits stand for.
+    /// \kept text-03: what is no digit counts as 255 and the result is taken modulo 256: "ZZ" is 0xEF, "1Z" is 0x0F
+    static char decodeHexChar(char const* digits) noexcept;
+
+protected:
+    std::uint64_t size_;
+    char const* text_;
+};
+
+static_assert(sizeof(Str) == 16);
+
+} // namespace ZOR_Basis
+
+#endif

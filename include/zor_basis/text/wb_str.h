@@ -1,0 +1,180 @@
+/// \file
+/// `WBStr`: a wide string that keeps up to 255 code units inside the object; the wide twin of `BufStr<255>`.
+///
+/// Assigning, appending, growing, inserting and replacing follow the rules of `BufStr` with code units in place of bytes:
+/// text-04 to text-09 and text-12 hold here too. What differs: blocks come from a virtual operation and are zeroed, and
+/// text whose case is changed while it is stored follows wide-03. A source may lie inside the string's own text.
+
+#ifndef ZOR_BASIS_TEXT_WB_STR_H
+#define ZOR_BASIS_TEXT_WB_STR_H
+
+#include "zor_basis/text/inline_text.h"
+#include "zor_basis/text/wstr.h"
+
+#include <concepts>
+#include <cstdint>
+#include <functional>
+
+namespace ZOR_Basis {
+
+#if defined(__GNUC__)
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor" // a WBStr is never deleted through a pointer to another class
+#endif
+
+class WBStr;
+ZB_EXTERN_TEMPLATE detail::InlineText<WBStr, WChar, 255>;
+
+class ZB_API WBStr : public WStr {
+    using Text = detail::InlineText<WBStr, WChar, 255>;
+    friend Text;
+
+public:
+    /// Empty, inside the object.
+    WBStr() noexcept { Text::start(*this); }
+    /// Copies of texts, each made as by assigning to an empty string.
+    WBStr(WChar const* text, std::uint64_t n = 0) : WBStr() { Text::assign(*this, text, n); }
+    WBStr(WStr const& text) : WBStr() { Text::assign(*this, text.wstr(), text.size()); }
+    WBStr(WBStr const& other) : WBStr() { Text::assign(*this, other.text_, other.size_); }
+    ~WBStr() { Text::end(*this); }
+
+    /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
+    WBStr& operator=(WBStr const& other) {
+        if (this != &other) Text::assign(*this, other.text_, other.size_);
+        return *this;
+    }
+    WBStr& operator=(WStr const& text) {
+        if (this != &text) Text::assign(*this, text.wstr(), text.size());
+        return *this;
+    }
+    WBStr& operator=(WChar const* text) {
+        if (text != text_) Text::assign(*this, text, 0);
+        return *this;
+    }
+    WBStr& copy(WChar const* text, std::uint64_t n = 0) {
+        Text::assign(*this, text, n);
+        return *this;
+    }
+
+    /// Appends a text; an empty source changes nothing.
+    WBStr& add(WChar const* text, std::uint64_t n = 0) {
+        Text::append(*this, text, n);
+        return *this;
+    }
+    WBStr& add(WStr const& text) { return add(text.wstr(), text.size()); }
+    WBStr& operator+=(WStr const& text) { return add(text); }
+    WBStr& operator+=(WChar const* text) { return add(text); }
+    /// Appends one code unit; 0 appends nothing.
+    template <std::integral C>
+    WBStr& operator+=(C c) {
+        Text::append(*this, static_cast<WChar>(c));
+        return *this;
+    }
+
+    /// Inserts a text; behind the size nothing happens. What follows moves unit for unit, inner zeros included.
+    WBStr& insert(std::uint64_t pos, WChar const* text, std::uint64_t n = 0) {
+        Text::insert(*this, pos, text, n);
+        return *this;
+    }
+    WBStr& insert(std::uint64_t pos, WStr const& text) { return insert(pos, text.wstr(), text.size()); }
+    /// Puts a text in place of `count` units, or of those that there are; a count of 0 inserts, and an empty source only
+    /// removes. At the size it appends, behind it nothing happens.
+    WBStr& replace(std::uint64_t pos, std::uint64_t count, WChar const* text, std::uint64_t n = 0) {
+        Text::replace(*this, pos, count, text, n);
+        return *this;
+    }
+    WBStr& replace(std::uint64_t pos, std::uint64_t count, WStr const& text) {
+        return replace(pos, count, text.wstr(), text.size());
+    }
+
+    /// The unit at an index, for writing; the index is not checked.
+    template <detail::Index I>
+    WChar& operator[](I index) noexcept {
+        return getBuf()[static_cast<std::uint64_t>(index)];
+    }
+    /// The unit at an index; 0 at the size and beyond.
+    template <detail::Index I>
+    WChar operator[](I index) const noexcept {
+        auto const i = static_cast<std::uint64_t>(index);
+        return i < size_ ? text_[i] : WChar();
+    }
+
+    /// The text for writing directly, capacity + 1 units; `resize` or `setSize` has to follow.
+    WChar* getBuf() noexcept { return Text::text(*this); }
+    /// The capacity in code units: 255 inside the object, else the block's; the terminator is not counted.
+    std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
+    /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
+    void extendBuf(std::uint64_t n) { CopyIfTooLong(text_, n, size_); }
+    /// Measures the text again after direct writes, then cuts it to n units; n = 0 sets no bound. A terminator is first
+    /// stored at the index of the capacity, as text-10 has it.
+    void resize(std::uint64_t n = 0) noexcept { Text::resize(*this, n); }
+    /// The size becomes n, and a terminator is stored there.
+    /// \pre n is at most the capacity; nothing is checked
+    void setSize(std::uint64_t n) noexcept { Text::setSize(*this, n); }
+    /// Empties the text; a block is kept.
+    void clear() noexcept { Text::setSize(*this, 0); }
+    /// Takes away the last unit, if there is one.
+    void cut() noexcept { Text::cutLast(*this); }
+    /// Cuts the text to n units; a shorter text is only terminated again at its size.
+    void cut(std::uint64_t n) noexcept { Text::cutTo(*this, n); }
+
+    /// Changes all units up to the terminator by the runtime's `towlower` and `towupper`.
+    WBStr& toLower() noexcept {
+        WStr::toLower(getBuf());
+        return *this;
+    }
+    WBStr& toUpper() noexcept {
+        WStr::toUpper(getBuf());
+        return *this;
+    }
+    /// Becomes the text in the other case: n units of it, or all of it where n is 0. The units from a terminator on are
+    /// zeros. Null gives the empty string.
+    /// \kept wide-03: a capacity below n + 1 is replaced by a block of n + 1 units, that is by a capacity of n, which is
+    ///       replaced again by the next text of n units
+    WBStr& toLower(WChar const* text, std::uint64_t n = 0);
+    WBStr& toUpper(WChar const* text, std::uint64_t n = 0);
+
+    /// Counts on in the letters a to z: "" to "a", "az" to "ba", "zz" to "aaa".
+    WBStr& NextLatin() {
+        NextLatin(*this, size_ != 0 ? size_ - 1 : 0);
+        return *this;
+    }
+    /// The same step from the unit at `pos` leftwards; an empty string becomes "a", behind the last unit nothing happens.
+    static void NextLatin(WBStr& text, std::uint64_t pos) { Text::nextLatin(text, pos); }
+
+protected:
+    /// A zeroed block of `count` units.
+    virtual WChar* alloc(std::uint64_t count);
+    /// Releases the block that holds the text.
+    virtual void free();
+
+    /// The capacity check, through which every growing goes; see `BufStr`.
+    bool CopyIfTooLong(WChar const* source, std::uint64_t need, std::uint64_t keep) {
+        return Text::copyIfTooLong(*this, source, need, keep);
+    }
+
+private:
+    using Change = void (*)(WChar*);
+    WBStr& assignChanged(WChar const* text, std::uint64_t n, Change change);
+
+    detail::TextArea<WChar, 255> area_;
+};
+
+#if defined(__GNUC__)
+#pragma GCC diagnostic pop
+#endif
+
+static_assert(sizeof(WBStr) == 8 + 16 + 512);
+
+} // namespace ZOR_Basis
+
+/// Over the units before the terminator, at most `size` of them.
+template <>
+struct std::hash<ZOR_Basis::WBStr> {
+    std::size_t operator()(ZOR_Basis::WBStr const& text) const noexcept {
+        using View = std::basic_string_view<ZOR_Basis::WChar>;
+        return std::hash<View>()(View(text.wstr(), ZOR_Basis::detail::textLengthUpTo(text.wstr(), text.size())));
+    }
+};
+
+#endif
