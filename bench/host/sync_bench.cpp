@@ -71,11 +71,78 @@ void makeAndDestroy(benchmark::State& state) {
     }
 }
 
+constexpr int JOBS = 10'000;
+constexpr int MOST_UNFINISHED = 64;
+
+/// Lets so many jobs be unfinished at a time, and waits for the last of them.
+class Unfinished {
+public:
+    void begin() { _free.acquire(); }
+    void end() {
+        _done.fetch_add(1, std::memory_order_relaxed);
+        _free.release();
+    }
+    void waitForAll() {
+        for (int i = 0; i < MOST_UNFINISHED; ++i) { _free.acquire(); }
+        _free.release(MOST_UNFINISHED);
+    }
+    int done() const { return _done.load(); }
+
+private:
+    std::counting_semaphore<MOST_UNFINISHED> _free{MOST_UNFINISHED};
+    std::atomic<int> _done{0};
+};
+
+void endJob(void* unfinished) { static_cast<Unfinished*>(unfinished)->end(); }
+
+struct HostTask {
+    static void start(Unfinished& unfinished) {
+        xos_TaskParams const params{endJob, &unfinished, 0, -9, 0, "bench", 0};
+        xos_TaskCreate(&params);
+    }
+};
+
+struct ThreadTask {
+    static void start(Unfinished& unfinished) { std::thread(endJob, &unfinished).detach(); }
+};
+
+struct AsyncTask {
+    static void start(Unfinished& unfinished) {
+        // A future waits for its job when it is dropped, so as many are kept as may be unfinished.
+        static std::vector<std::future<void>> futures(MOST_UNFINISHED);
+        static std::size_t next = 0;
+        futures[next++ % MOST_UNFINISHED] = std::async(std::launch::async, endJob, &unfinished);
+    }
+};
+
+template <class Task>
+void runJobs(benchmark::State& state) {
+    for (auto _ : state) {
+        Unfinished unfinished;
+        for (int i = 0; i < JOBS; ++i) {
+            unfinished.begin();
+            Task::start(unfinished);
+        }
+        unfinished.waitForAll();
+        if (unfinished.done() != JOBS) { state.SkipWithError("jobs were lost"); }
+    }
+    state.SetItemsProcessed(state.iterations() * JOBS);
+}
+
+/// As in every program that needs a mutex: once a second thread has existed, the C library no longer takes short cuts.
+bool const hasHadThreads = [] {
+    std::thread([] {}).join();
+    return true;
+}();
+
 BENCHMARK(takeAndGive<HostMutex>)->Name("mutex_uncontended/ours");
 BENCHMARK(takeAndGive<PthreadMutex>)->Name("mutex_uncontended/pthread");
 BENCHMARK(takeAndGiveShared<HostMutex>)->Name("mutex_contended/ours")->Threads(2)->UseRealTime();
 BENCHMARK(takeAndGiveShared<PthreadMutex>)->Name("mutex_contended/pthread")->Threads(2)->UseRealTime();
 BENCHMARK(makeAndDestroy<HostMutex>)->Name("mutex_make_destroy/ours");
 BENCHMARK(makeAndDestroy<PthreadMutex>)->Name("mutex_make_destroy/pthread");
+BENCHMARK(runJobs<HostTask>)->Name("tasks_10000/ours")->UseRealTime()->Unit(benchmark::kMillisecond);
+BENCHMARK(runJobs<ThreadTask>)->Name("tasks_10000/thread")->UseRealTime()->Unit(benchmark::kMillisecond);
+BENCHMARK(runJobs<AsyncTask>)->Name("tasks_10000/async")->UseRealTime()->Unit(benchmark::kMillisecond);
 
 } // namespace
