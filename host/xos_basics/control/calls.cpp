@@ -56,6 +56,9 @@ bool tryRead(CallRecord const& record, char const* kinds, Reading& reading) {
 
 Reading readRecord(CallRecord const& record, char const* kinds) {
     Reading reading{};
+    if (record.sequence.load(std::memory_order_acquire) == 0) {
+        return reading; // never written, so that its words mean nothing
+    }
     while (!tryRead(record, kinds, reading)) { pauseBriefly(); }
     return reading;
 }
