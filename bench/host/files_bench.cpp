@@ -12,6 +12,7 @@
 #include <filesystem>
 #include <fstream>
 #include <initializer_list>
+#include <memory>
 #include <random>
 #include <spawn.h>
 #include <string>
@@ -156,11 +157,11 @@ int directoriesByHost(std::string const& path) {
 int directoriesBySystemCalls(int at, char const* name) {
     constexpr std::size_t SIZE = 32 * 1024;
     int const directory = ::openat(at, name, O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    std::vector<char> buffer(SIZE);
+    auto const buffer = std::make_unique_for_overwrite<char[]>(SIZE);
     int count = 1;
-    for (ssize_t got = 0; (got = ::getdents64(directory, buffer.data(), SIZE)) > 0;) {
+    for (ssize_t got = 0; (got = ::getdents64(directory, buffer.get(), SIZE)) > 0;) {
         for (ssize_t offset = 0; offset < got;) {
-            auto const* const entry = reinterpret_cast<dirent64 const*>(buffer.data() + offset);
+            auto const* const entry = reinterpret_cast<dirent64 const*>(buffer.get() + offset);
             offset += entry->d_reclen;
             std::string_view const entryName{entry->d_name};
             if (entry->d_type == DT_DIR && entryName != "." && entryName != "..") {
