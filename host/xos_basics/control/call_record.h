@@ -53,8 +53,8 @@ struct ThreadCalls {
     std::uint32_t freeSemaphoreCount;
     ThreadCalls* next;
     bool inUse;
-    /// The text that `xos_HostLastCall` handed to this thread.
-    std::string lastCallText;
+    /// The text that `xos_HostLastCall` handed to this thread; null before.
+    std::string* lastCallText;
 };
 
 /// The calling thread's records; null before its first call and while it ends.

@@ -20,7 +20,7 @@ TextBuffer* largerBuffer(TextBuffer* older, std::size_t used, std::size_t needed
         delete buffer;
         return nullptr;
     }
-    for (std::size_t i = 0; i < used; ++i) {
+    for (std::size_t i = 0; older != nullptr && i < used; ++i) {
         buffer->data[i].store(older->data[i].load(std::memory_order_relaxed), std::memory_order_relaxed);
     }
     return buffer;
