@@ -15,8 +15,7 @@ using Path = PathText<NarrowPathKind>;
 /// The length of the fake root at the front, the slash before it not counted; 0 without one.
 std::uint64_t fakeRoot(char const* text, std::uint64_t length, BufStr<255> const& root) {
     if (length == 0 || !PathRules::isSlash(*text)) return 0;
-    bool const underRoot =
-        !root.empty() && length >= root.size() && std::memcmp(text, root.c_str(), root.size()) == 0;
+    bool const underRoot = !root.empty() && length >= root.size() && std::memcmp(text, root.c_str(), root.size()) == 0;
     if (underRoot) return 0;
     for (std::uint64_t i = 0; i < PathRules::FAKE_ROOTS; ++i) {
         std::uint64_t const end = 1 + PathRules::FAKE_ROOT_LENGTH[i];
@@ -96,9 +95,7 @@ bool FPath::isAbsolute(char const* text) { return PathRules::isAbsolute(Path::or
 bool FPath::isDos(char const* text) { return PathRules::isDos(Path::orEmpty(text)); }
 bool FPath::isURL(char const* text) { return PathRules::isURL(Path::orEmpty(text)); }
 bool FPath::isWildCard(char const* text) { return PathRules::isWildCard(Path::orEmpty(text)); }
-bool FPath::isFake(char const* text) {
-    return fakeRoot(text, Path::lengthOf(text, 0), RootFolder::get().text) != 0;
-}
+bool FPath::isFake(char const* text) { return fakeRoot(text, Path::lengthOf(text, 0), RootFolder::get().text) != 0; }
 bool FPath::matchWildCard(char const* pattern, char const* name) { return Path::matchWildCard(pattern, name); }
 bool FPath::isSub(char const* path, char const* dir) { return PathRules::isSub(path, dir); }
 std::uint64_t FPath::offsetName(char const* text, std::uint64_t len) { return Path::offsetName(text, len); }

@@ -12,7 +12,6 @@
 
 #include <string_view>
 
-
 namespace ZOR_Basis {
 
 struct NarrowPathKind {

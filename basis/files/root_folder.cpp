@@ -28,8 +28,7 @@ Root fromCurrentFolder() {
     folder.extendBuf(size);
     if (currentFolder(folder.getBuf(), size)) return fromFolder(folder.c_str());
     // kept root-01: a folder that needs more room is found by the next call, not by this one.
-    folder.extendBuf(2 * size);
-    if (!currentFolder(folder.getBuf(), 2 * size)) room.store(2 * size, std::memory_order_relaxed);
+    room.store(2 * size, std::memory_order_relaxed);
     return {};
 }
 

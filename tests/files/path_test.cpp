@@ -35,17 +35,13 @@ struct Wide {
 template <class Kind>
 class PathTest : public testing::Test {
 public:
-    using Path = typename Kind::Path;
-    using View = typename Kind::View;
-    using Text = typename Kind::Text;
-
     /// The tables are ASCII.
-    static Text t(std::string const& text) { return Text(text.begin(), text.end()); }
-    static Path p(std::string const& text) {
-        Text const own = t(text);
-        return Path(View(own));
+    static typename Kind::Text t(std::string const& text) { return {text.begin(), text.end()}; }
+    static typename Kind::Path p(std::string const& text) {
+        auto const own = t(text);
+        return typename Kind::View(own);
     }
-    static std::string plain(Path const& path) {
+    static std::string plain(typename Kind::Path const& path) {
         std::string text;
         for (std::uint64_t i = 0; i < path.size(); ++i) text.push_back(static_cast<char>(Kind::text(path)[i]));
         EXPECT_EQ(Kind::text(path)[path.size()], 0) << "terminated";
@@ -299,29 +295,18 @@ TYPED_TEST(PathTest, knows_what_kind_it_is) {
         bool absolute, dos, url, wildcard;
     };
     for (Case const& c : {
-             Case{{}, "", false, false, false, false},
-             Case{{}, "a", false, false, false, false},
-             Case{{}, "/", true, false, false, false},
-             Case{{}, "\\a", true, false, false, false},
-             Case{{}, "C:\\", true, true, false, false},
-             Case{{}, "C:/x", true, true, false, false},
-             Case{{}, "C:", false, false, false, false},
-             Case{{}, "C:x", false, false, false, false},
-             Case{{}, "1:/", true, true, false, false},
-             Case{{}, "/:/", true, true, false, false},
-             Case{{}, ":/", false, false, false, false},
-             Case{{}, "C://dir", true, true, true, false},
-             Case{{}, "a://", true, true, false, false},
-             Case{{}, "file://y", false, false, true, false},
-             Case{{}, "file:\\\\y", false, false, true, false},
-             Case{{}, "file:/\\y", false, false, true, false},
-             Case{{}, "file://", false, false, false, false},
-             Case{{}, "file:/", false, false, false, false},
+             Case{{}, "", false, false, false, false},          Case{{}, "a", false, false, false, false},
+             Case{{}, "/", true, false, false, false},          Case{{}, "\\a", true, false, false, false},
+             Case{{}, "C:\\", true, true, false, false},        Case{{}, "C:/x", true, true, false, false},
+             Case{{}, "C:", false, false, false, false},        Case{{}, "C:x", false, false, false, false},
+             Case{{}, "1:/", true, true, false, false},         Case{{}, "/:/", true, true, false, false},
+             Case{{}, ":/", false, false, false, false},        Case{{}, "C://dir", true, true, true, false},
+             Case{{}, "a://", true, true, false, false},        Case{{}, "file://y", false, false, true, false},
+             Case{{}, "file:\\\\y", false, false, true, false}, Case{{}, "file:/\\y", false, false, true, false},
+             Case{{}, "file://", false, false, false, false},   Case{{}, "file:/", false, false, false, false},
              Case{{}, "a:b://c", false, false, false, false}, // only the first ":" counts
-             Case{{}, "://x", false, false, true, false},
-             Case{{}, "a*", false, false, false, true},
-             Case{{}, "a?b", false, false, false, true},
-             Case{{}, "/*", true, false, false, true},
+             Case{{}, "://x", false, false, true, false},       Case{{}, "a*", false, false, false, true},
+             Case{{}, "a?b", false, false, false, true},        Case{{}, "/*", true, false, false, true},
          }) {
         SCOPED_TRACE(c.row);
         auto const path = this->p(c.path);
@@ -360,27 +345,13 @@ TYPED_TEST(PathTest, lies_in_a_folder_or_not) {
         bool expected;
     };
     for (Case const& c : {
-             Case{{}, "/a/b", "/a/b", true},
-             Case{{}, "/a/b/c", "/a/b", true},
-             Case{{}, "/a/bc", "/a/b", false},
-             Case{{}, "/a", "/a/b", false},
-             Case{{}, "/A/b/c", "/a/B", true},
-             Case{{}, "\\a\\b", "/a", true},
-             Case{{}, "/a//b", "/a/b", true},
-             Case{{}, "/a/b", "//a/\\b", true},
-             Case{{}, "/a", "/a/", true},
-             Case{{}, "/a", "/a//", true},
-             Case{{}, "/a/", "/a", true},
-             Case{{}, "/a/x", "/a/", true},
-             Case{{}, "/a", "/a/x", false},
-             Case{{}, "a", "/a", false},
-             Case{{}, "/a", "a", false},
-             Case{{}, "/a/", "/a/b", false},
-             Case{{}, "a", "", true},
-             Case{{}, "", "", true},
-             Case{{}, "", "a", false},
-             Case{{}, "", "/", false},
-             Case{{}, "/x", "/", true},
+             Case{{}, "/a/b", "/a/b", true},  Case{{}, "/a/b/c", "/a/b", true},  Case{{}, "/a/bc", "/a/b", false},
+             Case{{}, "/a", "/a/b", false},   Case{{}, "/A/b/c", "/a/B", true},  Case{{}, "\\a\\b", "/a", true},
+             Case{{}, "/a//b", "/a/b", true}, Case{{}, "/a/b", "//a/\\b", true}, Case{{}, "/a", "/a/", true},
+             Case{{}, "/a", "/a//", true},    Case{{}, "/a/", "/a", true},       Case{{}, "/a/x", "/a/", true},
+             Case{{}, "/a", "/a/x", false},   Case{{}, "a", "/a", false},        Case{{}, "/a", "a", false},
+             Case{{}, "/a/", "/a/b", false},  Case{{}, "a", "", true},           Case{{}, "", "", true},
+             Case{{}, "", "a", false},        Case{{}, "", "/", false},          Case{{}, "/x", "/", true},
              Case{{}, "ab", "a", false},
          }) {
         SCOPED_TRACE(c.row);
@@ -404,19 +375,11 @@ TYPED_TEST(PathTest, is_split_at_its_last_slash) {
         std::uint64_t offset;
     };
     for (Case const& c : {
-             Case{{}, "a/b/c", 0, "a/b", "c", 4},
-             Case{{}, "a\\b", 0, "a", "b", 2},
-             Case{{}, "a/b\\c", 0, "a/b", "c", 4},
-             Case{{}, "abc", 0, "", "abc", 0},
-             Case{{}, "", 0, "", "", 0},
-             Case{{}, "a/b/", 0, "a/b", "", 4},
-             Case{{}, "a//b", 0, "a/", "b", 3},
-             Case{{}, "/abc", 0, "/abc", "abc", 1},
-             Case{{}, "/", 0, "/", "", 1},
-             Case{{}, "//x", 0, "/", "x", 2},
-             Case{{}, "a/b/c", 3, "a", "b", 2},
-             Case{{}, "a/b/c", 2, "a", "", 2},
-             Case{{}, "a/b/c", 1, "", "a", 0},
+             Case{{}, "a/b/c", 0, "a/b", "c", 4}, Case{{}, "a\\b", 0, "a", "b", 2},
+             Case{{}, "a/b\\c", 0, "a/b", "c", 4}, Case{{}, "abc", 0, "", "abc", 0}, Case{{}, "", 0, "", "", 0},
+             Case{{}, "a/b/", 0, "a/b", "", 4}, Case{{}, "a//b", 0, "a/", "b", 3},
+             Case{{}, "/abc", 0, "/abc", "abc", 1}, Case{{}, "/", 0, "/", "", 1}, Case{{}, "//x", 0, "/", "x", 2},
+             Case{{}, "a/b/c", 3, "a", "b", 2}, Case{{}, "a/b/c", 2, "a", "", 2}, Case{{}, "a/b/c", 1, "", "a", 0},
              Case{{}, "/abc/d", 4, "/abc/d", "abc", 1}, // the whole text up to its end
          }) {
         SCOPED_TRACE(c.row);
@@ -620,7 +583,8 @@ TYPED_TEST(PathTest, survives_random_changes_beside_a_plain_text) {
         case 0:
             path.add(this->t(piece).c_str());
             if (!piece.empty()) {
-                bool const ended = !model.empty() && (model.back() == '/' || (TypeParam::isWide && model.back() == '\\'));
+                bool const ended =
+                    !model.empty() && (model.back() == '/' || (TypeParam::isWide && model.back() == '\\'));
                 model += (model.empty() || ended ? "" : "/") + piece;
             }
             break;

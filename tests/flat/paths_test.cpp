@@ -65,7 +65,10 @@ TEST(FlatUri, resolves_escapes) {
              Case{{}, "%ff", "\xFF\0"s},
              Case{{}, "a+b", "a+b\0"s},
              Case{{}, "%25%32", "%2\0"s}, // what comes out is not decoded again
-             Case{{}, "%%412", "\x04" "12\0"s}, // "%" is no digit, and both characters behind a "%" are taken
+             Case{{},
+                  "%%412",
+                  "\x04"
+                  "12\0"s}, // "%" is no digit, and both characters behind a "%" are taken
              Case{{}, "", "\0"s},
          }) {
         SCOPED_TRACE(c.row);

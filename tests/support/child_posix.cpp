@@ -45,6 +45,7 @@ ChildResult run(Child const& child) {
     }
     ::close(ends[0]);
     int status = 0;
-    if (process > 0 && ::waitpid(process, &status, 0) == process && WIFEXITED(status)) result.exitCode = WEXITSTATUS(status);
+    if (process > 0 && ::waitpid(process, &status, 0) == process && WIFEXITED(status))
+        result.exitCode = WEXITSTATUS(status);
     return result;
 }

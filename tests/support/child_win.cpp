@@ -79,9 +79,9 @@ ChildResult run(Child const& child) {
     startup.hStdOutput = writeEnd;
     startup.hStdError = GetStdHandle(STD_ERROR_HANDLE);
     PROCESS_INFORMATION process{};
-    bool const started = CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0,
-                                        environment.data(), child.folder.empty() ? nullptr : child.folder.c_str(),
-                                        &startup, &process) != 0;
+    bool const started =
+        CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
+                       child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
     CloseHandle(writeEnd);
     ChildResult result;
     if (started) {

@@ -136,8 +136,7 @@ public:
     static bool isSlash(char c) { return c == BACK_SLASH || c == FORW_SLASH; }
     /// Whether the character at an index is; false at the size and beyond.
     template <detail::Index I>
-        requires(!std::same_as<I, char>)
-    bool isSlash(I index) const {
+    requires(!std::same_as<I, char>) bool isSlash(I index) const {
         auto const i = static_cast<std::uint64_t>(index);
         return i < size_ && isSlash(text_[i]);
     }

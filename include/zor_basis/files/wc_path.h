@@ -84,8 +84,7 @@ public:
 
     static bool isSlash(WChar c) { return c == BACK_SLASH || c == FORW_SLASH; }
     template <detail::Index I>
-        requires(!std::same_as<I, WChar>)
-    bool isSlash(I index) const {
+    requires(!std::same_as<I, WChar>) bool isSlash(I index) const {
         auto const i = static_cast<std::uint64_t>(index);
         return i < size_ && isSlash(text_[i]);
     }
