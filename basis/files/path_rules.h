@@ -93,6 +93,7 @@ bool isSub(Char const* path, Char const* directory) {
 template <class Char>
 std::uint64_t normalize(Char const* source, bool url, Char* out) {
     Char* const begin = out;
+    // kept path-03: for a URL the first run is taken for that behind the scheme, without a look at what is before it.
     bool firstRunPending = url || isSlash(*source);
     while (*source != Char()) {
         if (!isSlash(*source)) {

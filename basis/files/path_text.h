@@ -58,6 +58,7 @@ struct PathText {
     }
 
     static void assureTermSlash(String& path) {
+        // kept path-02: the result ends in a slash, whatever there was before.
         if (path.empty() || !PathRules::isSlash(path.last())) path.add(BACK_SLASH, 1);
     }
 
