@@ -21,7 +21,7 @@ bool failsNow(char const* function, std::initializer_list<std::uint64_t> argumen
 /// Says how `xos_HostAlertFire` runs an alert.
 void offerAlertFire(int (*fire)(std::uint32_t id));
 
-inline std::uint64_t textArgument(char const* text) { return reinterpret_cast<std::uintptr_t>(text); }
+inline std::uint64_t addressArgument(void const* address) { return reinterpret_cast<std::uintptr_t>(address); }
 
 } // namespace host
 

@@ -2,6 +2,7 @@
 
 #include "host/xos_basics/control/call_order.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/tasks/job_queue.h"
 #include "host/xos_basics/tasks/task_thread.h"
 #include "host/xos_basics/wait/pause.h"
 #include "host/xos_basics/wait/quick_mutex.h"
@@ -19,178 +20,240 @@ namespace host {
 
 namespace {
 
-/// A thread without a job stays awake for a moment, since waking costs more than most tasks; then it sleeps.
+// A thread is busy with a job, ready (it has none and is about to look for one) or asleep. There are always at least as
+// many ready threads as waiting jobs, so no job waits for another's end. A busy thread that ends its job takes the next
+// one itself where it can, as waking a thread costs more than most jobs; the thread that was made ready for that job is
+// there for the one after.
+
 struct Worker {
-    TaskJob job;
-    /// 1 once a new job has been put in.
-    std::atomic<std::uint32_t> hasJob;
-    std::uint64_t stackSize;
-    Worker* next;
+    /// 1 once it has been woken.
+    std::atomic<std::uint32_t> isWoken;
+    Worker* nextAsleep;
     TaskName lastName;
 };
 
-constexpr std::uint32_t NO_JOB = 0;
-constexpr std::uint32_t JOB = 1;
-
-/// More idle threads than these end.
-constexpr unsigned MOST_IDLE = 64;
-/// How long an idle thread stays awake, in looks at its word: some tens of microseconds.
-constexpr int AWAKE_LOOKS = 1000;
-/// How long a creator waits for a busy thread to come back before it wakes another: less than half a microsecond.
+/// More sleeping threads than these end.
+constexpr unsigned MOST_ASLEEP = 64;
+/// How long a ready thread stays awake, in looks at the queue: some tens of microseconds.
+constexpr int READY_LOOKS = 1000;
+/// How long a creator gives the busy threads before it wakes another: less than half a microsecond.
 constexpr int CREATOR_LOOKS = 8;
 
 constinit QuickMutex mutex;
-constinit Worker* awake = nullptr;
+constinit JobQueue queue;
 constinit Worker* asleep = nullptr;
-constinit unsigned idleCount = 0;
-constinit std::atomic<unsigned> awakeCount{0};
-constinit std::atomic<unsigned> busyCount{0};
+constinit unsigned asleepCount = 0;
+/// Ready threads that wait for a job awake.
+constinit unsigned awakeCount = 0;
+/// These three change under the mutex only.
+constinit std::atomic<unsigned> waitingJobs{0};
+constinit std::atomic<unsigned> readyWorkers{0};
+constinit std::atomic<unsigned> busyWorkers{0};
 
-/// A processor is left to the others.
+void change(std::atomic<unsigned>& count, int by) {
+    count.store(count.load(std::memory_order_relaxed) + static_cast<unsigned>(by), std::memory_order_relaxed);
+}
+
+bool areEnoughReady() {
+    return waitingJobs.load(std::memory_order_relaxed) <= readyWorkers.load(std::memory_order_relaxed);
+}
+
+/// One processor is left to the others.
 unsigned mostAwake() {
     static unsigned const most = std::max(std::thread::hardware_concurrency(), 1U) - 1;
     return most;
 }
 
-/// \pre the mutex is held
-void addIdle(Worker*& list, Worker& worker) {
-    worker.next = list;
-    list = &worker;
-    ++idleCount;
+void enqueue(QueuedJob* job) {
+    std::lock_guard const lock{mutex};
+    queue.push(job);
+    change(waitingJobs, 1);
 }
 
 /// \pre the mutex is held
-void removeIdle(Worker** place) {
-    *place = (*place)->next;
-    --idleCount;
+std::unique_ptr<QueuedJob> dequeue() {
+    std::unique_ptr<QueuedJob> job{queue.pop()};
+    if (job != nullptr) { change(waitingJobs, -1); }
+    return job;
 }
 
-/// \pre the mutex is held
-Worker* takeFitting(Worker*& list, std::uint64_t stackSize) {
-    for (Worker** place = &list; *place != nullptr; place = &(*place)->next) {
-        Worker* const worker = *place;
-        if (worker->stackSize >= stackSize) {
-            removeIdle(place);
-            return worker;
-        }
-    }
-    return nullptr;
-}
-
-void countAwake(int change) { awakeCount.store(awakeCount.load(std::memory_order_relaxed) + change); }
-
-void waitForQuickWorker() {
-    for (int i = 0; i < CREATOR_LOOKS && awakeCount.load(std::memory_order_relaxed) == 0; ++i) {
-        if (busyCount.load(std::memory_order_relaxed) == 0 || mostAwake() == 0) { return; }
+void giveBusyWorkersAMoment() {
+    for (int i = 0; i < CREATOR_LOOKS && !areEnoughReady(); ++i) {
+        if (busyWorkers.load(std::memory_order_relaxed) == 0 || mostAwake() == 0) { return; }
         pauseBriefly();
     }
 }
 
-void handOver(Worker& worker, TaskJob const& job, bool sleeps) {
-    busyCount.fetch_add(1, std::memory_order_relaxed);
-    worker.job = job;
-    worker.hasJob.store(JOB, std::memory_order_release);
-    if (sleeps) { wakeOne(worker.hasJob); }
+enum class Need { nothing, wakeUp, newThread };
+
+/// Makes one more thread ready, on paper, if there are not enough. \param sleeper  the one to be woken, if any
+Need countOnOneMore(Worker*& sleeper) {
+    std::lock_guard const lock{mutex};
+    if (areEnoughReady()) { return Need::nothing; }
+    change(readyWorkers, 1);
+    sleeper = asleep;
+    if (sleeper == nullptr) { return Need::newThread; }
+    asleep = sleeper->nextAsleep;
+    --asleepCount;
+    return Need::wakeUp;
 }
 
-bool runOnIdleWorker(TaskJob const& job) {
-    waitForQuickWorker();
-    Worker* worker = nullptr;
-    bool sleeps = false;
-    {
-        std::lock_guard const lock{mutex};
-        worker = takeFitting(awake, job.stackSize);
-        if (worker != nullptr) {
-            countAwake(-1);
-        } else {
-            worker = takeFitting(asleep, job.stackSize);
-            sleeps = true;
+/// \return whether it was still waiting
+bool takeBack(QueuedJob const* job) {
+    std::lock_guard const lock{mutex};
+    change(readyWorkers, -1);
+    bool const isWaiting = queue.remove(job);
+    change(waitingJobs, isWaiting ? -1 : 0);
+    return isWaiting;
+}
+
+/// \return the next job for a thread that ends one; none: the thread is ready from now on
+std::unique_ptr<QueuedJob> nextOrReady() {
+    std::lock_guard const lock{mutex};
+    std::unique_ptr<QueuedJob> job = dequeue();
+    if (job == nullptr) {
+        change(busyWorkers, -1);
+        change(readyWorkers, 1);
+    }
+    return job;
+}
+
+/// \pre the calling thread is ready
+std::unique_ptr<QueuedJob> tryTake() {
+    if (waitingJobs.load(std::memory_order_relaxed) == 0) { return nullptr; }
+    std::lock_guard const lock{mutex};
+    std::unique_ptr<QueuedJob> job = dequeue();
+    if (job != nullptr) {
+        change(readyWorkers, -1);
+        change(busyWorkers, 1);
+    }
+    return job;
+}
+
+bool mayStayAwake() {
+    std::lock_guard const lock{mutex};
+    bool const may = awakeCount < mostAwake();
+    awakeCount += may ? 1 : 0;
+    return may;
+}
+
+void stayedAwake() {
+    std::lock_guard const lock{mutex};
+    --awakeCount;
+}
+
+std::unique_ptr<QueuedJob> takeWhileAwake() {
+    std::unique_ptr<QueuedJob> job = tryTake();
+    if (job != nullptr || !mayStayAwake()) { return job; }
+    for (int i = 0; i < READY_LOOKS && job == nullptr; ++i) {
+        pauseBriefly();
+        job = tryTake();
+    }
+    stayedAwake();
+    return job;
+}
+
+enum class Rest { thereIsWork, sleep, end };
+
+/// A ready thread may only rest while no job waits.
+Rest fallAsleep(Worker& worker) {
+    std::lock_guard const lock{mutex};
+    if (waitingJobs.load(std::memory_order_relaxed) != 0) { return Rest::thereIsWork; }
+    change(readyWorkers, -1);
+    if (asleepCount >= MOST_ASLEEP) { return Rest::end; }
+    worker.isWoken.store(0, std::memory_order_relaxed);
+    worker.nextAsleep = asleep;
+    asleep = &worker;
+    ++asleepCount;
+    return Rest::sleep;
+}
+
+/// \return null: the thread is to end
+std::unique_ptr<QueuedJob> awaitJob(Worker& worker) {
+    for (;;) {
+        std::unique_ptr<QueuedJob> job = takeWhileAwake();
+        if (job != nullptr) { return job; }
+        Rest const rest = fallAsleep(worker);
+        if (rest == Rest::end) { return nullptr; }
+        while (rest == Rest::sleep && worker.isWoken.load(std::memory_order_acquire) == 0) {
+            waitWhile(worker.isWoken, 0);
         }
     }
-    if (worker == nullptr) { return false; }
-    handOver(*worker, job, sleeps);
-    return true;
 }
 
-/// \return false: there are enough idle threads without this one
-bool becomeIdle(Worker& worker, bool& isAwake) {
-    worker.hasJob.store(NO_JOB, std::memory_order_relaxed);
-    std::lock_guard const lock{mutex};
-    if (idleCount >= MOST_IDLE) { return false; }
-    isAwake = awakeCount.load(std::memory_order_relaxed) < mostAwake();
-    addIdle(isAwake ? awake : asleep, worker);
-    if (isAwake) { countAwake(1); }
-    return true;
+void takeName(Worker& worker, TaskName const& name) {
+    if (std::strcmp(worker.lastName.data(), name.data()) != 0) {
+        nameThisThread(name);
+        worker.lastName = name;
+    }
 }
 
-/// Moves a thread that has been awake long enough to those that sleep; one that was taken meanwhile gets its job soon.
-void fallAsleep(Worker& worker) {
-    std::lock_guard const lock{mutex};
-    for (Worker** place = &awake; *place != nullptr; place = &(*place)->next) {
-        if (*place == &worker) {
-            removeIdle(place);
-            countAwake(-1);
-            addIdle(asleep, worker);
+void runJob(Worker& worker, std::unique_ptr<QueuedJob> owned) {
+    TaskJob const job = owned->job;
+    owned.reset(); // a job that never returns keeps nothing
+    takeName(worker, job.name);
+    job.entry(job.argument);
+    // What the task called comes before whatever is called after its end.
+    publishTime(threadCalls());
+}
+
+/// Runs a first job, if there is one, and then whatever comes, until there is nothing to do for long and for many.
+void runJobs(std::unique_ptr<QueuedJob> job) {
+    Worker worker{};
+    for (;;) {
+        if (job == nullptr) {
+            job = awaitJob(worker);
+        }
+        if (job == nullptr) {
             return;
         }
+        runJob(worker, std::move(job));
+        job = nextOrReady();
     }
 }
 
-bool seesJob(Worker const& worker) { return worker.hasJob.load(std::memory_order_acquire) == JOB; }
+void runReadyWorker(void*) { runJobs(nullptr); }
 
-/// \return false: the thread is to end
-bool awaitJob(Worker& worker) {
-    bool isAwake = false;
-    if (!becomeIdle(worker, isAwake)) { return false; }
-    for (int i = 0; isAwake && i < AWAKE_LOOKS; ++i) {
-        if (seesJob(worker)) { return true; }
-        pauseBriefly();
+void runOwnWorker(void* firstJob) {
+    {
+        std::lock_guard const lock{mutex};
+        change(busyWorkers, 1);
     }
-    if (isAwake) { fallAsleep(worker); }
-    while (!seesJob(worker)) { waitWhile(worker.hasJob, NO_JOB); }
+    runJobs(std::unique_ptr<QueuedJob>{static_cast<QueuedJob*>(firstJob)});
+}
+
+/// A stack of a certain size is no other thread's.
+bool runOnOwnThread(std::unique_ptr<QueuedJob> job) {
+    if (!startThread(runOwnWorker, job.get(), job->job.stackSize)) { return false; }
+    static_cast<void>(job.release()); // the thread's now
     return true;
 }
 
-void takeName(Worker& worker) {
-    if (std::strcmp(worker.lastName.data(), worker.job.name.data()) != 0) {
-        nameThisThread(worker.job.name);
-        worker.lastName = worker.job.name;
-    }
-}
-
-void runWorker(void* firstJob) {
-    Worker worker{};
-    {
-        std::unique_ptr<TaskJob> const own{static_cast<TaskJob*>(firstJob)};
-        worker.job = *own;
-        worker.stackSize = own->stackSize;
-    }
-    do {
-        takeName(worker);
-        worker.job.entry(worker.job.argument);
-        // What the task called comes before whatever is called after its end.
-        publishTime(threadCalls());
-        busyCount.fetch_sub(1, std::memory_order_relaxed);
-    } while (awaitJob(worker));
-}
-
-bool runOnNewWorker(TaskJob const& job) {
-    std::unique_ptr<TaskJob> own{new (std::nothrow) TaskJob{job}};
-    if (own == nullptr) {
-        setLastError(Error::noMemory);
+bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
+    QueuedJob* const job = owned.release(); // the queue's, and then its thread's
+    enqueue(job);
+    giveBusyWorkersAMoment();
+    Worker* sleeper = nullptr;
+    Need const need = countOnOneMore(sleeper);
+    if (need == Need::wakeUp) {
+        sleeper->isWoken.store(1, std::memory_order_release);
+        wakeOne(sleeper->isWoken);
+    } else if (need == Need::newThread && !startThread(runReadyWorker, nullptr, 0) && takeBack(job)) {
+        owned.reset(job);
         return false;
     }
-    busyCount.fetch_add(1, std::memory_order_relaxed);
-    if (!startThread(runWorker, own.get(), job.stackSize)) {
-        busyCount.fetch_sub(1, std::memory_order_relaxed);
-        return false;
-    }
-    static_cast<void>(own.release()); // the thread's now
     return true;
 }
 
 } // namespace
 
-bool runTask(TaskJob const& job) { return runOnIdleWorker(job) || runOnNewWorker(job); }
+bool runTask(TaskJob const& job) {
+    std::unique_ptr<QueuedJob> queued{new (std::nothrow) QueuedJob{job, nullptr}};
+    if (queued == nullptr) {
+        setLastError(Error::noMemory);
+        return false;
+    }
+    return job.stackSize == 0 ? runOnAnyThread(std::move(queued)) : runOnOwnThread(std::move(queued));
+}
 
 } // namespace host
