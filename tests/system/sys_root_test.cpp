@@ -68,24 +68,6 @@ TEST(SysRoot, is_the_current_folder_without_a_configured_one) {
         << "a platform layer that does not know";
 }
 
-TEST(SysRoot, Kept_root_01_is_empty_once_where_the_current_folder_is_long) {
-    fs::path const top = fs::canonical(fs::temp_directory_path()) / "zb_long_root";
-    fs::path folder = top;
-    while (folder.string().size() < 600) folder /= std::string(50, 'd');
-    std::error_code failed;
-    fs::create_directories(folder, failed);
-    ASSERT_FALSE(failed) << failed.message();
-    std::string const expected = fromFolder(folder.string().c_str()).text.c_str();
-    ChildResult const result = run({"root_child", {"copy", "copy"}, {{"XOS_ROOT", ""}}, folder.string()});
-    // Windows lets no process start in so long a folder.
-    if (ONE_FILE_SYSTEM) {
-        EXPECT_EQ(result.output, "false <>\ntrue <" + expected + ">\n");
-    } else {
-        EXPECT_EQ(result.exitCode, -1);
-    }
-    fs::remove_all(top);
-}
-
 TEST(SysRoot, takes_the_place_of_fake_roots) {
     EXPECT_EQ(under("/srv", {"fake", "/scsi0/tmp/x", "fake", "/JS_Root", "fake", "\\scsi0\\x", "fake", "/JS_Root/"}),
               "fake  </srv/tmp/x>\nfake  </srv>\nfake  </srv\\x>\nfake  </srv/>\n");
