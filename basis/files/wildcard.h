@@ -56,6 +56,7 @@ public:
                 ++pattern_;
                 ++name_;
             } else if (pattern_ != patternEnd_ && *pattern_ == Char('*')) {
+                // kept path-06: only here is a "*" a wildcard, so never where the name has ended or has one too.
                 ++pattern_;
                 if (pattern_ == patternEnd_) return true;
                 if (pattern_ == tail_) return nameEnd_ - name_ >= patternEnd_ - tail_;

@@ -90,7 +90,7 @@ void InlineText<Owner, Char, N>::resize(Owner& o, std::uint64_t n) noexcept {
 
 template <class Owner, class Char, std::uint64_t N>
 void InlineText<Owner, Char, N>::insert(Owner& o, std::uint64_t position, Char const* source, std::uint64_t length) {
-    if (position == o.size_) append(o, source, length);
+    if (position == o.size_) return append(o, source, length);
     if (position < o.size_) exchange(o, position, 0, source, sourceLength(source, length));
 }
 

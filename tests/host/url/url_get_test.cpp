@@ -194,6 +194,12 @@ TEST_F(HostUrl, gives_name_and_password_where_they_are_asked_for) {
     EXPECT_EQ(textOf(scratch / "open"), "come in");
 }
 
+TEST_F(HostUrl, gives_the_password_to_no_server_but_the_one_that_is_named) {
+    HttpServer const other{{{"/guarded", guarded("dXNlcjpzZWNyZXQ=")}}};
+    HttpServer const server{{{"/away", always(redirect(other.url("/guarded")))}}};
+    expectFailure(server.url("/away"), "user", "secret");
+}
+
 TEST_F(HostUrl, fails_with_a_wrong_password_or_none) {
     HttpServer const server{{{"/guarded", guarded("dXNlcjpzZWNyZXQ=")}}};
     expectFailure(server.url("/guarded"));
