@@ -94,18 +94,20 @@ XOS_API uint32_t xos_MsCount(void);
 /* Files */
 
 /// Opens a file.
-/// \param flags  0x02 read; 0x14 write, and create what is not there; 0x01 truncate; 0x08 write at the end whatever the
-///               position; 0x20 text: on Windows line ends are translated
-/// \return 0 on failure, also for a directory
+/// \param flags  0x02 read; 0x14 write, and create what is not there (0x04 without creating); 0x01 truncate; 0x08 write
+///               at the end whatever the position; 0x20 text: on Windows line ends are translated
+/// \return 0 on failure, also for a directory, for flags without any access, and where a handle that cannot write would
+///         truncate or create
 XOS_API xos_File xos_FileOpen(char const* path, uint32_t flags);
 
-/// Writes out what is buffered and closes the file; it is closed whatever the result.
-/// \error not everything could be written; no file
+/// Closes the file; it is closed whatever the result.
+/// \error the system reports only now that something could not be written; no file
 XOS_API int xos_FileCloseEx(xos_File file, int reserved);
 
 /// \return the bytes read, fewer than `size` at the end of the file or on an error only; 0 for no file
 XOS_API uint64_t xos_FileReadEx(xos_File file, void* buffer, uint64_t size, int reserved1, int reserved2);
 
+/// Others see what was written at once. What was read ahead is forgotten: the bytes go where `xos_FileTellEx` says.
 /// \return the bytes written, fewer than `size` on an error only; 0 for no file
 XOS_API uint64_t xos_FileWriteEx(xos_File file, void const* buffer, uint64_t size, int reserved1, int reserved2);
 
@@ -113,7 +115,8 @@ XOS_API uint64_t xos_FileWriteEx(xos_File file, void const* buffer, uint64_t siz
 /// \return `buffer`; null at the end of the file, on an error, for no file
 XOS_API char* xos_FileGetsEx(xos_File file, char* buffer, uint64_t size, int reserved);
 
-/// Hands everything written so far to the system.
+/// Waits until everything written so far has reached the device. Nothing to do for a handle that cannot write.
+/// \cost a device's time: milliseconds on a disk
 XOS_API int xos_FileFlush(xos_File file);
 
 /// \param origin  0 the start, 1 the current position, 2 the end
@@ -125,11 +128,14 @@ XOS_API int64_t xos_FileTellEx(xos_File file, int reserved);
 /// Removes a file, or a link itself; never a directory.
 XOS_API int xos_FileRemove(char const* path, uint32_t flags);
 
-/// Copies a file with its permissions and modification time. The destination appears whole or not at all.
-/// \param overwrite  0: fails when anything exists there, and changes nothing; else a file there is replaced, a directory not
+/// Copies a file, or the file that a link leads to, with its permissions and modification time. The destination appears
+/// whole or not at all.
+/// \param overwrite  0: fails when anything exists there, and changes nothing; else a file or link
+///                   there is replaced, a directory not
+/// \error also when `src` and `dst` are one file
 XOS_API int xos_FileCopy(char const* dst, char const* src, int overwrite);
 
-/// Renames a file.
+/// Renames a file, or a link itself; no directory. Onto itself: nothing to do, where it may overwrite.
 /// \param overwrite  as for `xos_FileCopy`
 /// \error also when `dst` is on another file system: the caller copies then
 XOS_API int xos_FileMove(char const* dst, char const* src, int overwrite);
@@ -162,18 +168,21 @@ XOS_API int xos_FileStatByNameEx(char const* path, struct xos_Stat* record, uint
 /// \error anything exists there already, a directory too; the parent does not exist
 XOS_API int xos_DirCreateEx(char const* path, int reserved);
 
-/// Removes a directory.
-/// \param flags  0x200 with everything in it, links themselves and never what they lead to
-/// \error without 0x200: it is not empty; nothing is removed then
+/// Removes a directory; in place of one also a link itself.
+/// \param flags  0x200 with everything in it, links themselves and never what they lead to, to any depth
+/// \error without 0x200: it is not empty; nothing is removed then. With it: something cannot be removed; the rest is
+///        gone. A path that ends in "." or ".." or is a root
 XOS_API int xos_DirRemove(char const* path, uint32_t flags);
 
-/// Copies a directory and its files into `dst`, which is made or, where it exists, added to.
+/// Copies a directory and its files into `dst`, which is made or, where it exists, added to. A new `dst` appears when it
+/// is complete; in one that exists, each file does. Links and special entries are copied as what they are, also in place
+/// of `src`. New directories keep permissions and modification times, too.
 /// \param flags  0x200 its sub-directories too; 0x001 replaces files that exist, which else fail the call
-/// \error also when `dst` lies in `src`
+/// \error also when `dst` is `src` or lies in it; a file and a directory of one name
 XOS_API int xos_DirCopy(char const* dst, char const* src, uint32_t flags);
 
-/// Renames a directory.
-/// \param flags  0x001 removes an existing `dst` first, but only when the move can follow
+/// Renames a directory; in place of one also a link itself. Onto itself: nothing to do, with 0x001.
+/// \param flags  0x001 removes an existing directory `dst` first, but only when the move can follow
 /// \error anything exists at `dst`, without 0x001; `dst` is on another file system: the caller copies then
 XOS_API int xos_DirMove(char const* dst, char const* src, uint32_t flags);
 
