@@ -38,7 +38,7 @@ function(zb_warnings target)
   else()
     target_compile_options(${target} PRIVATE
       -Wall -Wextra -Wpedantic -Wshadow -Wcast-align
-      $<$<COMPILE_LANGUAGE:CXX>:-Wnon-virtual-dtor -Woverloaded-virtual>
+      $<$<COMPILE_LANGUAGE:CXX>:-Woverloaded-virtual>
       $<$<BOOL:${ZB_WARNINGS_AS_ERRORS}>:-Werror>)
   endif()
 endfunction()

@@ -55,7 +55,7 @@ def meaning(mangled):
 
 
 def qualified(text):
-    text = re.sub(r"(\d+)(?:u|ul|ull|l|ll)\b", r"\1", text)
+    text = re.sub(r"(\d+)(?:u|ul|ull|l|ll)\b", r"\1", text).replace("char16_t", "wchar_t")
     depth = 0
     start = text.find("operator()") + len("operator()") if "operator()" in text else 0
     for position in range(start, len(text)):

@@ -1,0 +1,64 @@
+#include "basis/files/root_folder.h"
+
+#include "basis/files/path_rules.h"
+#include "basis/files/root_folder_impl.h"
+#include "basis/platform/xos_basics.h"
+
+#include <atomic>
+#include <cstring>
+
+namespace ZOR_Basis::RootFolder {
+namespace {
+
+constexpr std::uint64_t FIRST_ROOM = 512;
+constexpr char SYSTEM[] = "system";
+
+std::atomic<Root const*> kept{nullptr};
+std::atomic<std::uint64_t> room{FIRST_ROOM};
+
+/// The root while it is not known. Not a static object: it must outlive everything that asks.
+Root const& unknown(bool isFileSystem) {
+    static Root const* const roots = new Root[2]{{{}, false}, {{}, true}};
+    return roots[isFileSystem ? 1 : 0];
+}
+
+Root fromCurrentFolder() {
+    BufStr<255> folder;
+    std::uint64_t const size = room.load(std::memory_order_relaxed);
+    folder.extendBuf(size);
+    if (currentFolder(folder.getBuf(), size)) return fromFolder(folder.c_str());
+    // kept root-01: a folder that needs more room is found by the next call, not by this one.
+    room.store(2 * size, std::memory_order_relaxed);
+    return {};
+}
+
+Root find() {
+    char const* const configured = xos_FileSystemRoot();
+    return !detail::isNothing(configured) ? fromFolder(configured) : fromCurrentFolder();
+}
+
+} // namespace
+
+Root fromFolder(char const* folder) {
+    Root root{folder, false};
+    BufStr<255>& text = root.text;
+    if (!text.empty() && PathRules::isSlash(text.last())) text.cut();
+    std::uint64_t const name = PathRules::offsetName(text.c_str(), text.size());
+    if (std::strcmp(text.c_str() + name, SYSTEM) == 0) text.cut(name != 0 ? name - 1 : 0);
+    PathRules::replaceAll(text.getBuf(), '\\', '/');
+    root.isFileSystem = HAS_ONE_FILE_SYSTEM && text.empty() && PathRules::isSlash(*folder);
+    return root;
+}
+
+Root const& get() {
+    if (Root const* const known = kept.load(std::memory_order_acquire)) return *known;
+    Root const found = find();
+    if (found.text.empty()) return unknown(found.isFileSystem);
+    Root const* const mine = new Root(found);
+    Root const* first = nullptr;
+    if (kept.compare_exchange_strong(first, mine, std::memory_order_acq_rel)) return *mine;
+    delete mine;
+    return *first;
+}
+
+} // namespace ZOR_Basis::RootFolder

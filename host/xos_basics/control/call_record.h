@@ -1,0 +1,82 @@
+/// \file
+/// What one thread remembers of its last call of each function, readable by others while it is written.
+///
+/// Each thread writes its own records with plain stores: no two threads write one cache line and no instruction locks
+/// the bus. A reader retries while the sequence is odd or has changed. Every store of a payload releases and every load
+/// of it acquires, so a reader that sees a new payload also sees the odd sequence before it.
+///
+/// Records outlive their thread: the next new thread takes them over and counts on. Nothing a reader looks at is ever
+/// freed.
+
+#ifndef HOST_XOS_BASICS_CONTROL_CALL_RECORD_H
+#define HOST_XOS_BASICS_CONTROL_CALL_RECORD_H
+
+#include "host/xos_basics/control/functions.h"
+
+#include <array>
+#include <atomic>
+#include <cstddef>
+#include <cstdint>
+#include <string>
+
+namespace host {
+
+/// Bytes of the text arguments, eight to a word. A full buffer is replaced by a larger one and kept for late readers.
+struct TextBuffer {
+    TextBuffer* older;
+    std::size_t words;
+    std::atomic<std::uint64_t>* data;
+};
+
+struct CallRecord {
+    /// Twice the calls so far; odd while a call is noted.
+    std::atomic<std::uint64_t> sequence;
+    std::array<std::atomic<std::uint64_t>, MAX_ARGUMENTS> words;
+    /// When the call was made, where several threads call the function; 0 where one does.
+    std::atomic<std::uint64_t> stamp;
+    std::atomic<TextBuffer*> texts;
+};
+
+struct Semaphore;
+
+/// The records of one thread, and what else it keeps for itself.
+struct ThreadCalls {
+    /// Of the thread that uses the records now; never given twice. 0: shared by threads without memory for their own.
+    std::uint64_t threadSerial;
+    /// The thread's time as call_order.h counts it.
+    std::atomic<std::uint64_t> time;
+    std::array<CallRecord, FUNCTION_COUNT> records;
+    /// Sequences at the last reset. Under the registry's mutex, as are `next` and `inUse`.
+    std::array<std::uint64_t, FUNCTION_COUNT> sequenceAtReset;
+    /// The thread's store of semaphore blocks.
+    Semaphore* freeSemaphores;
+    std::uint32_t freeSemaphoreCount;
+    ThreadCalls* next;
+    bool inUse;
+    /// The text that `xos_HostLastCall` handed to this thread.
+    std::string lastCallText;
+};
+
+/// The calling thread's records; null before its first call and while it ends.
+extern constinit thread_local ThreadCalls* currentThreadCalls;
+
+/// Gives the calling thread its records.
+ThreadCalls* adoptThreadCalls();
+
+/// The only thread that has called a function so far; a value that is no thread's once there are several.
+extern constinit std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> soleCaller;
+
+inline ThreadCalls& threadCalls() {
+    ThreadCalls* const mine = currentThreadCalls;
+    return mine != nullptr ? *mine : *adoptThreadCalls();
+}
+
+/// Copies a text argument behind the `used` words of texts already in the record. \return the argument's word
+std::uint64_t keepText(CallRecord& record, char const* text, std::size_t& used);
+
+/// The word of a null text.
+constexpr std::uint64_t NULL_TEXT = ~std::uint64_t{0};
+
+} // namespace host
+
+#endif

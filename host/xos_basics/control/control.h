@@ -1,0 +1,90 @@
+/// \file
+/// What every platform function does first: count the call, remember its arguments, and ask whether it is to fail.
+///
+///     if (failsNow(Function::xos_FileMove, dst, src, overwrite)) {
+///         return FAILED;
+///     }
+///
+/// Always on, correct from any thread, about a nanosecond. The arguments are given in the order and number of the
+/// function's kinds in functions.h. A `char const*` is a text, which is copied; any other pointer is an address.
+
+#ifndef HOST_XOS_BASICS_CONTROL_CONTROL_H
+#define HOST_XOS_BASICS_CONTROL_CONTROL_H
+
+#include "host/xos_basics/control/call_order.h"
+#include "host/xos_basics/control/call_record.h"
+#include "host/xos_basics/control/functions.h"
+
+#include <atomic>
+#include <cstddef>
+#include <cstdint>
+#include <type_traits>
+
+namespace host {
+
+/// The result of an `int` function that fails without a more telling value.
+constexpr int FAILED = -1;
+
+/// How many functions are to fail now or later.
+extern constinit std::atomic<std::uint32_t> armedFaults;
+
+/// Whether this call of the function is to fail; the last error is then set.
+bool takesInjectedFailure(Function function);
+
+/// Notes one call in the calling thread's record, from construction to destruction.
+class CallNote {
+public:
+    [[gnu::always_inline]] explicit CallNote(Function function) : CallNote(function, threadCalls()) {}
+    CallNote(CallNote const&) = delete;
+    CallNote& operator=(CallNote const&) = delete;
+    ~CallNote() { _record.sequence.store(_sequence + 2, std::memory_order_release); }
+
+    void addWord(std::uint64_t word) { _record.words[_arguments++].store(word, std::memory_order_release); }
+
+    void addText(char const* text) { addWord(keepText(_record, text, _textWords)); }
+
+    template <class Argument>
+    void add(Argument const& argument) {
+        if constexpr (std::is_same_v<Argument, char const*>) {
+            addText(argument);
+        } else if constexpr (std::is_pointer_v<Argument>) {
+            addWord(reinterpret_cast<std::uintptr_t>(argument));
+        } else {
+            static_assert(std::is_integral_v<Argument>);
+            // Signed numbers keep their sign in 64 bits.
+            addWord(static_cast<std::uint64_t>(static_cast<std::int64_t>(argument)));
+        }
+    }
+
+private:
+    [[gnu::always_inline]] CallNote(Function function, ThreadCalls& mine)
+        : _record(mine.records[indexOf(function)]), _sequence(_record.sequence.load(std::memory_order_relaxed)) {
+        _record.sequence.store(_sequence + 1, std::memory_order_relaxed);
+        bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &mine;
+        _record.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
+    }
+
+    CallRecord& _record;
+    std::uint64_t const _sequence;
+    std::size_t _arguments{0};
+    std::size_t _textWords{0};
+};
+
+inline bool failsAfterNote(Function function) {
+    return armedFaults.load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
+}
+
+/// Inlined everywhere: with the function known, half of it folds away.
+template <class... Arguments>
+[[gnu::always_inline]] inline bool failsNow(Function function, Arguments const&... arguments) {
+    static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
+    {
+        CallNote note{function};
+        (note.add(arguments), ...);
+    }
+    return failsAfterNote(function);
+}
+
+} // namespace host
+
+#endif

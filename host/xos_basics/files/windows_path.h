@@ -1,0 +1,115 @@
+/// \file
+/// Paths as Windows takes them, owners of its handles, and the last error across a clean-up. For `_win` sources only.
+///
+/// Narrow text is the process's ANSI code page. Text that it cannot express is refused, never replaced.
+
+#ifndef HOST_XOS_BASICS_FILES_WINDOWS_PATH_H
+#define HOST_XOS_BASICS_FILES_WINDOWS_PATH_H
+
+#include "host/windows_api.h"
+#include "host/xos_basics/files/slashes.h"
+
+#include <string>
+#include <utility>
+
+namespace host {
+
+inline bool failWith(DWORD error) {
+    SetLastError(error);
+    return false;
+}
+
+/// Keeps the last error of a failure while what it left is cleared away.
+class KeepLastError {
+public:
+    KeepLastError() : kept_(GetLastError()) {}
+    ~KeepLastError() { SetLastError(kept_); }
+    KeepLastError(KeepLastError const&) = delete;
+    KeepLastError& operator=(KeepLastError const&) = delete;
+
+private:
+    DWORD kept_;
+};
+
+/// Owner of a handle that is closed by `CloseHandle`.
+class Handle {
+public:
+    Handle() = default;
+    explicit Handle(HANDLE handle) : handle_(handle) {}
+    Handle(Handle&& other) noexcept : handle_(std::exchange(other.handle_, INVALID_HANDLE_VALUE)) {}
+    Handle& operator=(Handle&& other) noexcept {
+        std::swap(handle_, other.handle_);
+        return *this;
+    }
+    ~Handle() {
+        if (*this) {
+            KeepLastError const keep;
+            CloseHandle(handle_);
+        }
+    }
+
+    HANDLE get() const { return handle_; }
+    HANDLE release() { return std::exchange(handle_, INVALID_HANDLE_VALUE); }
+    explicit operator bool() const { return handle_ != INVALID_HANDLE_VALUE; }
+
+private:
+    HANDLE handle_ = INVALID_HANDLE_VALUE;
+};
+
+/// The path in the form that calls take. What is long gets the form that has no limit.
+bool systemPath(char const* path, std::wstring& wide);
+
+/// The absolute path in the form that has no limit, without a backslash at its end unless it is a root.
+bool fullPath(char const* path, std::wstring& wide);
+
+/// Whether an absolute path is a drive or a share itself.
+bool isRoot(std::wstring const& full);
+
+/// The place of the last component in a path; its whole length behind a root.
+std::size_t nameOffset(std::wstring const& path);
+
+/// Joins a directory's path and a name.
+inline std::wstring joined(std::wstring const& directory, wchar_t const* name) {
+    std::wstring path = directory;
+    if (!path.empty() && path.back() != L'\\') { path += L'\\'; }
+    return path += name;
+}
+
+/// Whether an entry only stands for another one.
+inline bool isLink(DWORD attributes, DWORD tag) {
+    return (attributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 && IsReparseTagNameSurrogate(tag);
+}
+
+/// A running search for the entries of a directory but "." and "..".
+class Search {
+public:
+    Search() = default;
+    Search(Search const&) = delete;
+    Search& operator=(Search const&) = delete;
+    ~Search() {
+        if (search_ != INVALID_HANDLE_VALUE) {
+            KeepLastError const keep;
+            FindClose(search_);
+        }
+    }
+
+    /// \return false when there is no such directory
+    bool open(std::wstring const& directory);
+    /// \return false at the end, with last error 18, and when reading failed
+    bool next();
+
+    WIN32_FIND_DATAW const& entry() const { return data_; }
+    wchar_t const* name() const { return data_.cFileName; }
+    bool isLinkEntry() const { return isLink(data_.dwFileAttributes, data_.dwReserved0); }
+    /// A link is none, wherever it leads.
+    bool isDirectory() const { return (data_.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0 && !isLinkEntry(); }
+
+private:
+    HANDLE search_ = INVALID_HANDLE_VALUE;
+    bool unread_ = false;
+    WIN32_FIND_DATAW data_{};
+};
+
+} // namespace host
+
+#endif

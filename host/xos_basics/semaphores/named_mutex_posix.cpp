@@ -1,0 +1,135 @@
+// Sibling: named_mutex_win.cpp.
+
+#include "host/xos_basics/last_error.h"
+#include "host/xos_basics/semaphores/named_mutex.h"
+
+#include <cerrno>
+#include <fcntl.h>
+#include <memory>
+#include <new>
+#include <pthread.h>
+#include <string>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace host {
+
+/// Threads of this process queue at a robust mutex; the one that has it locks the file against other processes. The
+/// system gives a file lock back when its process ends, however it ends, and says so of a thread through the mutex.
+class NamedMutex {
+public:
+    explicit NamedMutex(int file) : _file(file) {
+        pthread_mutexattr_t attributes;
+        pthread_mutexattr_init(&attributes);
+        pthread_mutexattr_settype(&attributes, PTHREAD_MUTEX_RECURSIVE);
+        pthread_mutexattr_setrobust(&attributes, PTHREAD_MUTEX_ROBUST);
+        pthread_mutex_init(&_threads, &attributes);
+        pthread_mutexattr_destroy(&attributes);
+    }
+    NamedMutex(NamedMutex const&) = delete;
+    NamedMutex& operator=(NamedMutex const&) = delete;
+
+    int take() {
+        int error = pthread_mutex_lock(&_threads);
+        if (error == EOWNERDEAD) {
+            pthread_mutex_consistent(&_threads);
+            _depth = 0;
+        } else if (error != 0) {
+            return error;
+        }
+        error = _depth == 0 ? lockFile() : 0;
+        if (error != 0) {
+            pthread_mutex_unlock(&_threads);
+            return error;
+        }
+        ++_depth;
+        return 0;
+    }
+
+    int give() {
+        if (!isMine()) { return EPERM; }
+        if (--_depth == 0) { flock(_file, LOCK_UN); }
+        return pthread_mutex_unlock(&_threads);
+    }
+
+private:
+    int lockFile() const {
+        while (flock(_file, LOCK_EX) != 0) {
+            if (errno != EINTR) { return errno; }
+        }
+        return 0;
+    }
+
+    /// Tries the mutex once more: only its owner gets a second turn while `_depth` is above 0.
+    bool isMine() {
+        int const error = pthread_mutex_trylock(&_threads);
+        if (error == EOWNERDEAD) {
+            pthread_mutex_consistent(&_threads);
+            _depth = 0;
+            flock(_file, LOCK_UN);
+        } else if (error != 0) {
+            return false;
+        }
+        bool const held = _depth != 0;
+        pthread_mutex_unlock(&_threads);
+        return held;
+    }
+
+    pthread_mutex_t _threads{};
+    int _file;
+    /// How often the owner has taken it; the owner's alone.
+    int _depth{0};
+};
+
+namespace {
+
+/// The parents of the users' run directories. All processes of a user must come to the same one, with or without a login
+/// session, so these are fixed places, and the first that serves is taken.
+constexpr char const* const PARENTS[] = {"/run/lock", "/dev/shm", "/tmp"};
+
+/// A folder that others could write, or a link that others made, is not trusted.
+bool isPrivateFolder(char const* path) {
+    struct stat status {};
+    return lstat(path, &status) == 0 && S_ISDIR(status.st_mode) && status.st_uid == geteuid() &&
+           (status.st_mode & 077) == 0;
+}
+
+std::string runDirectory() {
+    std::string const name = "/xos-" + std::to_string(geteuid());
+    for (char const* parent : PARENTS) {
+        std::string path = parent + name;
+        if ((mkdir(path.c_str(), 0700) == 0 || errno == EEXIST) && isPrivateFolder(path.c_str())) { return path; }
+    }
+    return {};
+}
+
+} // namespace
+
+NamedMutex* openNamed(int id) {
+    std::string const folder = runDirectory();
+    if (folder.empty()) { return nullptr; }
+    std::string const path = folder + "/mutex-" + std::to_string(id);
+    int const file = open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
+    if (file < 0) { return nullptr; }
+    auto* const mutex = new (std::nothrow) NamedMutex(file);
+    if (mutex == nullptr) {
+        close(file);
+        setLastError(Error::noMemory);
+    }
+    return mutex;
+}
+
+int takeNamed(NamedMutex& mutex) {
+    int const error = mutex.take();
+    if (error != 0) { errno = error; }
+    return error;
+}
+
+int giveNamed(NamedMutex& mutex) {
+    int const error = mutex.give();
+    if (error != 0) { errno = error; }
+    return error;
+}
+
+} // namespace host

@@ -1,0 +1,118 @@
+#include "host/xos_basics/control/control.h"
+#include "host/xos_basics/last_error.h"
+#include "host/xos_basics/semaphores/named_mutex.h"
+#include "host/xos_basics/semaphores/semaphore.h"
+#include "host/xos_basics/wait/lock_word.h"
+
+using host::failsNow;
+using host::Function;
+
+namespace {
+
+int failWith(host::Error error) {
+    host::setLastError(error);
+    return host::FAILED;
+}
+
+inline void takeState(host::Semaphore& semaphore, host::ThreadCalls& mine) {
+    host::takeWord(semaphore.state);
+    host::learnTime(mine, semaphore.time);
+}
+
+inline void giveState(host::Semaphore& semaphore, host::ThreadCalls const& mine) {
+    host::leaveTime(mine, semaphore.time);
+    host::giveWord(semaphore.state);
+}
+
+int takeMutex(host::Semaphore& mutex) {
+    host::ThreadCalls& mine = host::threadCalls();
+    std::uint64_t const self = mine.threadSerial;
+    if (mutex.owner.load(std::memory_order_relaxed) == self) {
+        if (self == 0) {
+            return failWith(host::Error::noMemory); // a thread that could get no identity
+        }
+        ++mutex.depth;
+        return 0;
+    }
+    takeState(mutex, mine);
+    mutex.owner.store(self, std::memory_order_relaxed);
+    mutex.depth = 1;
+    return 0;
+}
+
+int giveMutex(host::Semaphore& mutex) {
+    host::ThreadCalls const& mine = host::threadCalls();
+    std::uint64_t const self = mine.threadSerial;
+    if (self == 0 || mutex.owner.load(std::memory_order_relaxed) != self) { return failWith(host::Error::notOwner); }
+    if (--mutex.depth == 0) {
+        mutex.owner.store(0, std::memory_order_relaxed);
+        giveState(mutex, mine);
+    }
+    return 0;
+}
+
+int takeBinary(host::Semaphore& semaphore) {
+    takeState(semaphore, host::threadCalls());
+    return 0;
+}
+
+int giveBinary(host::Semaphore& semaphore) {
+    giveState(semaphore, host::threadCalls());
+    return 0;
+}
+
+xos_Sem handleOf(host::Semaphore const* semaphore) { return semaphore == nullptr ? 0 : semaphore->handle.load(); }
+
+} // namespace
+
+extern "C" {
+
+xos_Sem xos_SemMCreate(void) {
+    if (failsNow(Function::xos_SemMCreate)) { return 0; }
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::mutex, host::WORD_FREE));
+}
+
+xos_Sem xos_SemBCreate(int available) {
+    if (failsNow(Function::xos_SemBCreate, available)) { return 0; }
+    std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::binary, state));
+}
+
+int xos_SemTake(xos_Sem sem) {
+    if (failsNow(Function::xos_SemTake, sem)) { return host::FAILED; }
+    host::Semaphore* const semaphore = host::semaphoreOf(sem);
+    if (semaphore == nullptr) { return host::FAILED; }
+    switch (semaphore->kind) {
+    case host::SemaphoreKind::mutex:
+        return takeMutex(*semaphore);
+    case host::SemaphoreKind::binary:
+        return takeBinary(*semaphore);
+    default:
+        return host::takeNamed(*semaphore->named);
+    }
+}
+
+int xos_SemGive(xos_Sem sem) {
+    if (failsNow(Function::xos_SemGive, sem)) { return host::FAILED; }
+    host::Semaphore* const semaphore = host::semaphoreOf(sem);
+    if (semaphore == nullptr) { return host::FAILED; }
+    switch (semaphore->kind) {
+    case host::SemaphoreKind::mutex:
+        return giveMutex(*semaphore);
+    case host::SemaphoreKind::binary:
+        return giveBinary(*semaphore);
+    default:
+        return host::giveNamed(*semaphore->named);
+    }
+}
+
+int xos_SemDestroy(xos_Sem sem) {
+    if (failsNow(Function::xos_SemDestroy, sem)) { return host::FAILED; }
+    host::Semaphore* const semaphore = host::semaphoreOf(sem);
+    if (semaphore == nullptr) { return host::FAILED; }
+    // A named mutex is the process's, not the caller's: others hold the same handle.
+    if (semaphore->kind != host::SemaphoreKind::named) { host::freeSemaphore(semaphore); }
+    return 0;
+}
+
+} // extern "C"

@@ -1,0 +1,14 @@
+/// \file
+/// Texts whose address is handed out and may be used for ever.
+
+#ifndef HOST_XOS_BASICS_SYSTEM_KEPT_TEXTS_H
+#define HOST_XOS_BASICS_SYSTEM_KEPT_TEXTS_H
+
+namespace host {
+
+/// \return the one kept copy of the text, never freed; equal texts share it. Null is empty.
+char const* keptText(char const* text);
+
+} // namespace host
+
+#endif

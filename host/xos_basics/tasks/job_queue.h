@@ -1,0 +1,53 @@
+/// \file
+/// Jobs that wait for their thread, first come, first served. Not synchronised.
+
+#ifndef HOST_XOS_BASICS_TASKS_JOB_QUEUE_H
+#define HOST_XOS_BASICS_TASKS_JOB_QUEUE_H
+
+#include "host/xos_basics/tasks/task_job.h"
+
+namespace host {
+
+struct QueuedJob {
+    TaskJob job;
+    QueuedJob* next;
+};
+
+class JobQueue {
+public:
+    void push(QueuedJob* job) {
+        job->next = nullptr;
+        *_end = job;
+        _end = &job->next;
+    }
+
+    /// \return null when there is none
+    QueuedJob* pop() {
+        QueuedJob* const job = _first;
+        if (job != nullptr) { remove(&_first); }
+        return job;
+    }
+
+    /// \return false: it is no longer here
+    bool remove(QueuedJob const* job) {
+        QueuedJob** place = &_first;
+        while (*place != nullptr && *place != job) { place = &(*place)->next; }
+        if (*place == nullptr) { return false; }
+        remove(place);
+        return true;
+    }
+
+private:
+    void remove(QueuedJob** place) {
+        if (_end == &(*place)->next) { _end = place; }
+        *place = (*place)->next;
+    }
+
+    QueuedJob* _first{nullptr};
+    /// Where the next one is hung.
+    QueuedJob** _end{&_first};
+};
+
+} // namespace host
+
+#endif

@@ -1,0 +1,41 @@
+// Sibling: url_files_win.cpp.
+
+#include "host/xos_url/url_files.h"
+
+#include <algorithm>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace host {
+
+std::string systemPath(std::string path) {
+    std::replace(path.begin(), path.end(), '\\', '/');
+    return path;
+}
+
+std::string pathOfFileUrl(FileUrl const& url) { return url.host.empty() ? url.path : std::string{}; }
+
+std::FILE* createNewFile(std::string const& path) {
+    int const file = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+    return file < 0 ? nullptr : fdopen(file, "wb");
+}
+
+std::FILE* openRegularFile(std::string const& path) {
+    // Without waiting for a writer, should the name be a pipe's.
+    int const file = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+    struct stat status {};
+    if (file < 0 || fstat(file, &status) != 0 || !S_ISREG(status.st_mode)) {
+        if (file >= 0) { close(file); }
+        return nullptr;
+    }
+    return fdopen(file, "rb");
+}
+
+bool replaceFile(std::string const& from, std::string const& to) { return rename(from.c_str(), to.c_str()) == 0; }
+
+void removeFile(std::string const& path) { unlink(path.c_str()); }
+
+unsigned long processNumber() { return static_cast<unsigned long>(getpid()); }
+
+} // namespace host

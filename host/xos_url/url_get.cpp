@@ -1,0 +1,74 @@
+#include "basis/platform/xos_url.h"
+
+#include "host/control_link/control_link.h"
+#include "host/xos_url/fetch.h"
+#include "host/xos_url/target_file.h"
+#include "host/xos_url/url_files.h"
+#include "host/xos_url/url_text.h"
+
+#include <memory>
+
+namespace host {
+
+namespace {
+
+constexpr std::uint32_t CONNECT_SECONDS = 30;
+constexpr std::uint32_t STALL_SECONDS = 60;
+
+class FileSink : public BodySink {
+public:
+    explicit FileSink(TargetFile& file) : _file(file) {}
+    bool take(void const* data, std::size_t size) override { return _file.write(data, size); }
+
+private:
+    TargetFile& _file;
+};
+
+bool copyBytes(std::FILE* from, TargetFile& to) {
+    char piece[65536];
+    std::size_t count = 0;
+    while ((count = std::fread(piece, 1, sizeof piece, from)) != 0) {
+        if (!to.write(piece, count)) { return false; }
+    }
+    return std::ferror(from) == 0;
+}
+
+bool getFile(char const* url, TargetFile& target) {
+    std::optional<FileUrl> const parsed = parseFileUrl(url);
+    if (!parsed.has_value()) { return false; }
+    std::unique_ptr<std::FILE, int (*)(std::FILE*)> const source{openRegularFile(pathOfFileUrl(*parsed)), std::fclose};
+    return source != nullptr && target.open() && copyBytes(source.get(), target) && target.commit();
+}
+
+bool getOverHttp(FetchRequest const& request, TargetFile& target) {
+    FileSink sink{target};
+    return target.open() && fetch(request, sink) && target.commit();
+}
+
+bool get(char const* url, char const* targetPath, char const* user, char const* password) {
+    TargetFile target{systemPath(targetPath)};
+    switch (schemeOf(url)) {
+    case Scheme::file:
+        return getFile(url, target);
+    case Scheme::http:
+    case Scheme::https:
+        return getOverHttp({escapedUrl(url), user, password, CONNECT_SECONDS, STALL_SECONDS}, target);
+    default:
+        return false;
+    }
+}
+
+} // namespace
+
+} // namespace host
+
+extern "C" int xos_URLGet(char const* url, char const* target, char const* first, char const* second) {
+    using host::addressArgument;
+    constexpr int FAILED = -1;
+    if (host::failsNow("xos_URLGet", {addressArgument(url), addressArgument(target), addressArgument(first),
+                                      addressArgument(second)}) ||
+        url == nullptr || target == nullptr || *target == '\0') {
+        return FAILED;
+    }
+    return host::get(url, target, first, second) ? 0 : FAILED;
+}

@@ -1,0 +1,97 @@
+// The sibling is child_posix.cpp.
+
+#include "tests/support/child.h"
+
+#include "basis/platform/windows_api.h"
+
+#include <map>
+
+namespace {
+
+std::string folderOfThisProgram() {
+    char path[MAX_PATH] = {};
+    GetModuleFileNameA(nullptr, path, MAX_PATH);
+    std::string const program = path;
+    return program.substr(0, program.find_last_of("\\/") + 1);
+}
+
+std::string quoted(std::string const& argument) {
+    std::string text = "\"";
+    std::size_t backslashes = 0;
+    for (char c : argument) {
+        if (c == '"') text.append(backslashes + 1, '\\');
+        backslashes = c == '\\' ? backslashes + 1 : 0;
+        text.push_back(c);
+    }
+    return text.append(backslashes, '\\') + "\"";
+}
+
+/// This process's environment with the child's changes, as `CreateProcess` takes it.
+std::string environmentOf(Child const& child) {
+    std::map<std::string, std::string> variables;
+    char* const block = GetEnvironmentStringsA();
+    for (char const* entry = block; *entry != '\0'; entry += std::string(entry).size() + 1) {
+        std::string const text = entry;
+        std::size_t const equals = text.find('=', 1);
+        if (equals != std::string::npos) variables[text.substr(0, equals)] = text.substr(equals + 1);
+    }
+    FreeEnvironmentStringsA(block);
+    for (auto const& [name, value] : child.environment) {
+        if (value.empty()) {
+            variables.erase(name);
+        } else {
+            variables[name] = value;
+        }
+    }
+    std::string text;
+    for (auto const& [name, value] : variables) text += name + "=" + value + '\0';
+    return text + '\0';
+}
+
+std::string readAll(HANDLE pipe) {
+    std::string text;
+    char buffer[4096];
+    for (DWORD n = 0; ReadFile(pipe, buffer, sizeof buffer, &n, nullptr) && n > 0;) text.append(buffer, n);
+    std::string lines;
+    for (char c : text) {
+        if (c != '\r') lines.push_back(c);
+    }
+    return lines;
+}
+
+} // namespace
+
+ChildResult run(Child const& child) {
+    std::string const program = folderOfThisProgram() + child.program + ".exe";
+    std::string commandLine = quoted(program);
+    for (std::string const& argument : child.arguments) commandLine += " " + quoted(argument);
+    std::string environment = environmentOf(child);
+
+    SECURITY_ATTRIBUTES inherited{sizeof(SECURITY_ATTRIBUTES), nullptr, TRUE};
+    HANDLE readEnd = nullptr;
+    HANDLE writeEnd = nullptr;
+    if (!CreatePipe(&readEnd, &writeEnd, &inherited, 0)) return {};
+    SetHandleInformation(readEnd, HANDLE_FLAG_INHERIT, 0);
+    STARTUPINFOA startup{};
+    startup.cb = sizeof startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
+    startup.hStdOutput = writeEnd;
+    startup.hStdError = GetStdHandle(STD_ERROR_HANDLE);
+    PROCESS_INFORMATION process{};
+    bool const started =
+        CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
+                       child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
+    CloseHandle(writeEnd);
+    ChildResult result;
+    if (started) {
+        result.output = readAll(readEnd);
+        WaitForSingleObject(process.hProcess, INFINITE);
+        DWORD code = 0;
+        if (GetExitCodeProcess(process.hProcess, &code)) result.exitCode = static_cast<int>(code);
+        CloseHandle(process.hThread);
+        CloseHandle(process.hProcess);
+    }
+    CloseHandle(readEnd);
+    return result;
+}
