@@ -1,27 +1,9 @@
-#include "zor_basis/text/char_ops.h"
+#include "basis/text/copy_text.h"
 
 #include <cstring>
 #include <limits>
 
 namespace ZOR_Basis::detail {
-
-namespace {
-
-template <class Char>
-Char const* textOrEmpty(Char const* text) noexcept {
-    static constexpr Char Empty[1] = {};
-    return text != nullptr ? text : Empty;
-}
-
-template <class Char>
-void copyUpToTerminator(Char* target, Char const* source, std::uint64_t length) noexcept {
-    if (length == 0) return;
-    std::uint64_t const copied = textLengthUpTo(source, length);
-    std::memmove(target, source, copied * sizeof(Char));
-    std::memset(target + copied, 0, (length - copied) * sizeof(Char));
-}
-
-} // namespace
 
 std::uint64_t textLengthUpTo(char const* text, std::uint64_t limit) noexcept {
     if (limit == 0) return 0;
@@ -33,26 +15,6 @@ std::uint64_t textLengthUpTo(WChar const* text, std::uint64_t limit) noexcept {
     std::uint64_t length = 0;
     while (length < limit && text[length] != WChar()) ++length;
     return length;
-}
-
-int compareTexts(char const* a, char const* b) noexcept { return std::strcmp(textOrEmpty(a), textOrEmpty(b)); }
-
-int compareTexts(WChar const* a, WChar const* b) noexcept {
-    return compareTextsUpTo(a, b, std::numeric_limits<std::uint64_t>::max());
-}
-
-int compareTextsUpTo(char const* a, char const* b, std::uint64_t limit) noexcept {
-    return std::strncmp(textOrEmpty(a), textOrEmpty(b), limit);
-}
-
-int compareTextsUpTo(WChar const* a, WChar const* b, std::uint64_t limit) noexcept {
-    a = textOrEmpty(a);
-    b = textOrEmpty(b);
-    for (; limit > 0; ++a, ++b, --limit) {
-        if (*a != *b) return static_cast<int>(*a) - static_cast<int>(*b);
-        if (*a == WChar()) return 0;
-    }
-    return 0;
 }
 
 char const* findText(char const* text, char const* wanted) noexcept {
@@ -69,10 +31,6 @@ WChar const* findText(WChar const* text, WChar const* wanted) noexcept {
 }
 
 // kept text-06: the size is what the caller said, so the units behind the terminator have to be defined
-void copyText(char* target, char const* source, std::uint64_t length) noexcept {
-    copyUpToTerminator(target, source, length);
-}
-
 void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept {
     copyUpToTerminator(target, source, length);
 }

@@ -24,14 +24,15 @@ bool InlineText<Owner, Char, N>::holds(Owner const& o, Char const* place) noexce
 }
 
 template <class Owner, class Char, std::uint64_t N>
-Char* InlineText<Owner, Char, N>::allocate(Owner& o, std::uint64_t capacity) {
+inline Char* InlineText<Owner, Char, N>::allocate(Owner& o, std::uint64_t capacity) {
     Char* block = capacity != TooLong ? o.alloc(capacity + 1) : nullptr;
     if (block == nullptr) std::abort();
     return block;
 }
 
 template <class Owner, class Char, std::uint64_t N>
-Char* InlineText<Owner, Char, N>::makeBlock(Owner& o, Char const* source, std::uint64_t capacity, std::uint64_t keep) {
+inline Char* InlineText<Owner, Char, N>::makeBlock(Owner& o, Char const* source, std::uint64_t capacity,
+                                                   std::uint64_t keep) {
     // kept text-08: callers rely on blocks being no larger than asked for
     Char* block = allocate(o, capacity);
     copyText(block, source, keep);
@@ -40,7 +41,7 @@ Char* InlineText<Owner, Char, N>::makeBlock(Owner& o, Char const* source, std::u
 }
 
 template <class Owner, class Char, std::uint64_t N>
-void InlineText<Owner, Char, N>::adopt(Owner& o, Char* block, std::uint64_t capacity) noexcept {
+inline void InlineText<Owner, Char, N>::adopt(Owner& o, Char* block, std::uint64_t capacity) noexcept {
     // kept text-07: the area holds the capacity from now on, so there is no way back into it
     end(o);
     o.text_ = block;
@@ -48,7 +49,8 @@ void InlineText<Owner, Char, N>::adopt(Owner& o, Char* block, std::uint64_t capa
 }
 
 template <class Owner, class Char, std::uint64_t N>
-bool InlineText<Owner, Char, N>::copyIfTooLong(Owner& o, Char const* source, std::uint64_t need, std::uint64_t keep) {
+inline bool InlineText<Owner, Char, N>::copyIfTooLong(Owner& o, Char const* source, std::uint64_t need,
+                                                      std::uint64_t keep) {
     std::uint64_t const required = std::max(need, plus(keep, 1));
     if (required <= capacity(o)) return false;
     adopt(o, makeBlock(o, source, required, keep), required);
@@ -78,6 +80,11 @@ void InlineText<Owner, Char, N>::appendInNewBlock(Owner& o, Char const* source, 
     copyText(block + o.size_, source, length);
     adopt(o, block, newSize);
     setSize(o, newSize);
+}
+
+template <class Owner, class Char, std::uint64_t N>
+void InlineText<Owner, Char, N>::appendUnitInNewBlock(Owner& o, Char unit) {
+    appendInNewBlock(o, &unit, 1);
 }
 
 template <class Owner, class Char, std::uint64_t N>

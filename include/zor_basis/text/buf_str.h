@@ -15,6 +15,7 @@
 #include "zor_basis/text/inline_text.h"
 #include "zor_basis/text/str.h"
 
+#include <compare>
 #include <concepts>
 #include <cstdint>
 #include <cstdlib>
@@ -40,15 +41,15 @@ public:
     /// Empty, inside the object.
     BufStr() noexcept { Text::start(*this); }
     /// Copies of texts, each made as by assigning to an empty string.
-    BufStr(char const* text, std::uint64_t n = 0) : BufStr() { Text::assign(*this, text, n); }
-    BufStr(Str const& text) : BufStr() { Text::assign(*this, text.c_str(), text.size()); }
-    BufStr(std::string const& text) : BufStr() { Text::assign(*this, text.c_str(), text.size()); }
-    BufStr(BufStr const& other) : BufStr() { Text::assign(*this, other.text_, other.size_); }
+    BufStr(char const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
+    BufStr(Str const& text) noexcept { Text::make(*this, text.c_str(), text.size()); }
+    BufStr(std::string const& text) noexcept { Text::makeOwned(*this, text.c_str(), text.size()); }
+    BufStr(BufStr const& other) noexcept : Str() { Text::makeOwned(*this, other.text_, other.size_); }
     ~BufStr() { Text::end(*this); }
 
     /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
     BufStr& operator=(BufStr const& other) {
-        if (this != &other) Text::assign(*this, other.text_, other.size_);
+        if (this != &other) Text::assignOwned(*this, other.text_, other.size_);
         return *this;
     }
     BufStr& operator=(Str const& text) {
@@ -56,7 +57,7 @@ public:
         return *this;
     }
     BufStr& operator=(std::string const& text) {
-        Text::assign(*this, text.c_str(), text.size());
+        Text::assignOwned(*this, text.c_str(), text.size());
         return *this;
     }
     BufStr& operator=(char const* text) {
@@ -66,6 +67,13 @@ public:
     BufStr& copy(char const* text, std::uint64_t n = 0) {
         Text::assign(*this, text, n);
         return *this;
+    }
+
+    using Str::compare;
+    /// As for any two texts, only faster.
+    template <std::same_as<BufStr> Other>
+    int compare(Other const& other) const noexcept {
+        return detail::compareOwned(text_, size_, other.text_, other.size_);
     }
 
     /// Appends a text; an empty source changes nothing.
@@ -193,6 +201,18 @@ private:
 
     detail::TextArea<char, N> area_;
 };
+
+/// Equality and order of two strings of the same kind: as for any two texts, only faster.
+template <std::uint64_t N>
+bool operator==(BufStr<N> const& a, BufStr<N> const& b) noexcept {
+    // kept text-01: the right-hand size decides here too
+    if (b.size() == 0) return a.eq(b.c_str(), 0);
+    return a.size() == b.size() && detail::sameOwned(a.c_str(), b.c_str(), b.size());
+}
+template <std::uint64_t N>
+std::weak_ordering operator<=>(BufStr<N> const& a, BufStr<N> const& b) noexcept {
+    return detail::compareOwned(a.c_str(), a.size(), b.c_str(), b.size()) <=> 0;
+}
 
 /// The everyday string: names, extensions, small numbers.
 ZB_EXTERN_TEMPLATE detail::InlineText<BufStr<15>, char, 15>;

@@ -50,10 +50,16 @@ ZB_API std::uint64_t textLengthUpTo(WChar const* text, std::uint64_t limit) noex
 /// Less than 0, 0 or greater than 0, by unsigned units, up to the terminators. Null counts as the empty text.
 ZB_API int compareTexts(char const* a, char const* b) noexcept;
 ZB_API int compareTexts(WChar const* a, WChar const* b) noexcept;
+/// The same; the sizes only tell how far the texts are likely to reach.
+ZB_API int compareTexts(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept;
 
 /// The same over at most `limit` units.
 ZB_API int compareTextsUpTo(char const* a, char const* b, std::uint64_t limit) noexcept;
 ZB_API int compareTextsUpTo(WChar const* a, WChar const* b, std::uint64_t limit) noexcept;
+
+/// Whether the texts are equal in so many units, or up to a terminator at the same place before.
+ZB_API bool sameTexts(char const* a, char const* b, std::uint64_t length) noexcept;
+ZB_API bool sameTexts(WChar const* a, WChar const* b, std::uint64_t length) noexcept;
 
 /// The first occurrence of `wanted` in `text`, or null; a null text or a null `wanted` has none.
 ZB_API char const* findText(char const* text, char const* wanted) noexcept;

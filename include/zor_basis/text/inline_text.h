@@ -9,6 +9,7 @@
 #define ZOR_BASIS_TEXT_INLINE_TEXT_H
 
 #include "zor_basis/text/char_ops.h"
+#include "zor_basis/text/word_ops.h"
 
 #include <cstdint>
 
@@ -34,6 +35,14 @@ struct StopAtTerminator {
         copyText(target, source, length);
     }
 };
+struct StopAtTerminatorOfOwned {
+    static void copy(char* target, char const* source, std::uint64_t length) noexcept {
+        copyOwned(target, source, length);
+    }
+    static void copy(WChar* target, WChar const* source, std::uint64_t length) noexcept {
+        copyText(target, source, length);
+    }
+};
 
 template <class Owner, class Char, std::uint64_t N>
 class InlineText {
@@ -50,6 +59,15 @@ public:
         o.text_ = o.area_.text;
         setSize(o, 0);
     }
+    /// What a constructor does: assigns to an empty string.
+    static void make(Owner& o, Char const* source, std::uint64_t length) {
+        o.text_ = o.area_.text;
+        assign(o, source, length);
+    }
+    static void makeOwned(Owner& o, Char const* source, std::uint64_t length) {
+        o.text_ = o.area_.text;
+        assignOwned(o, source, length);
+    }
     static void end(Owner& o) noexcept {
         if (!isInline(o)) o.free();
     }
@@ -65,6 +83,15 @@ public:
         }
     }
 
+    /// The same from a text that another string owns, so that all of its length may be read.
+    static void assignOwned(Owner& o, Char const* source, std::uint64_t length) {
+        if (length == 0 || *source == Char()) {
+            assign(o, source, length);
+        } else {
+            assignSome<StopAtTerminatorOfOwned>(o, source, length);
+        }
+    }
+
     /// Appends a copy of the source; a length of 0 is measured.
     static void append(Owner& o, Char const* source, std::uint64_t length) {
         if (isNothing(source)) return;
@@ -77,11 +104,14 @@ public:
 
     static void append(Owner& o, Char unit) {
         if (unit == Char()) return;
-        if (o.size_ < capacity(o)) {
-            text(o)[o.size_] = unit;
-            setSize(o, o.size_ + 1);
+        std::uint64_t const size = o.size_;
+        if (hasRoom(o, size, 1)) {
+            Char* target = text(o) + size;
+            o.size_ = size + 1;
+            target[0] = unit;
+            target[1] = Char();
         } else {
-            appendInNewBlock(o, &unit, 1);
+            appendUnitInNewBlock(o, unit);
         }
     }
 
@@ -100,6 +130,7 @@ public:
     static void assignExactly(Owner& o, Char const* source, std::uint64_t length);
     static void assignInNewBlock(Owner& o, Char const* source, std::uint64_t length);
     static void appendInNewBlock(Owner& o, Char const* source, std::uint64_t length);
+    static void appendUnitInNewBlock(Owner& o, Char unit);
     static void resize(Owner& o, std::uint64_t n) noexcept;
     static void insert(Owner& o, std::uint64_t position, Char const* source, std::uint64_t length);
     static void replace(Owner& o, std::uint64_t position, std::uint64_t count, Char const* source,
@@ -111,12 +142,21 @@ public:
     static bool holds(Owner const& o, Char const* place) noexcept;
 
 private:
+    /// Whether `length` units fit behind a text of `size` units. A block is never smaller than the area, so that the
+    /// state need not be known for short texts.
+    static bool hasRoom(Owner const& o, std::uint64_t size, std::uint64_t length) noexcept {
+        if (length < N && size <= N - length) return true;
+        return length <= capacity(o) - size;
+    }
+
     template <class Copier>
     static void assignSome(Owner& o, Char const* source, std::uint64_t length) {
         // kept text-04: assigning asks for one unit more than it needs; capacities that callers see depend on it
-        if (length < capacity(o)) {
-            Copier::copy(text(o), source, length);
-            setSize(o, length);
+        if (length < N || length < capacity(o)) {
+            Char* target = text(o);
+            o.size_ = length;
+            Copier::copy(target, source, length);
+            target[length] = Char();
         } else {
             assignInNewBlock(o, source, length);
         }
@@ -125,9 +165,12 @@ private:
     template <class Copier>
     static void appendSome(Owner& o, Char const* source, std::uint64_t length) {
         // kept text-05: appending uses the area to its last unit
-        if (length <= capacity(o) - o.size_) {
-            Copier::copy(text(o) + o.size_, source, length);
-            setSize(o, o.size_ + length);
+        std::uint64_t const size = o.size_;
+        if (hasRoom(o, size, length)) {
+            Char* target = text(o) + size;
+            o.size_ = size + length;
+            Copier::copy(target, source, length);
+            target[length] = Char();
         } else {
             appendInNewBlock(o, source, length);
         }

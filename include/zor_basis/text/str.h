@@ -97,18 +97,19 @@ public:
     bool eq(char const* text, std::uint64_t n = 0) const noexcept {
         if (text_ == text) return true;
         // kept text-01: callers compare parts of texts by giving the right-hand side a size
-        if (n != 0) return size_ == n && detail::compareTextsUpTo(text_, text, n) == 0;
+        if (n != 0) return size_ == n && detail::sameTexts(text_, text, n);
         return detail::compareTexts(text_, text) == 0;
     }
 
     /// -1, 0 or 1: the order of the unsigned bytes up to the terminators. The same text gives 0.
     /// \kept text-02: sizes do not take part, so a view of a part of a text is ordered as the whole rest of it
-    int compare(Str const& other) const noexcept { return compare(other.text_); }
-    int compare(char const* other) const noexcept {
-        if (text_ == other) return 0;
+    int compare(Str const& other) const noexcept {
+        if (text_ == other.text_) return 0;
         // kept text-02: ordering is by terminated texts, as sorted lists of views rely on it
-        int const order = detail::compareTexts(text_, other);
-        return (order > 0) - (order < 0);
+        return signOf(detail::compareTexts(text_, size_, other.text_, other.size_));
+    }
+    int compare(char const* other) const noexcept {
+        return text_ == other ? 0 : signOf(detail::compareTexts(text_, other));
     }
     /// The order of the first n unsigned bytes, as `strncmp` gives it; 0 for n = 0 and for the same text.
     int compare(char const* other, std::uint64_t n) const noexcept {
@@ -118,7 +119,7 @@ public:
     /// The order of `compare`, which also gives `>`, `<=`, `>=` and all of them from the other side.
     bool operator<(Str const& other) const noexcept { return compare(other) < 0; }
     std::weak_ordering operator<=>(Str const& other) const noexcept { return compare(other) <=> 0; }
-    std::weak_ordering operator<=>(std::string const& other) const noexcept { return compare(other.c_str()) <=> 0; }
+    std::weak_ordering operator<=>(std::string const& other) const noexcept { return compare(Str(other)) <=> 0; }
     std::weak_ordering operator<=>(char const* other) const noexcept { return compare(other) <=> 0; }
 
     /// `hashDjb2` of the text: over the bytes before the terminator, whatever the size.
@@ -145,6 +146,9 @@ public:
 protected:
     std::uint64_t size_;
     char const* text_;
+
+private:
+    static int signOf(int order) noexcept { return (order > 0) - (order < 0); }
 };
 
 static_assert(sizeof(Str) == 16);

@@ -33,14 +33,14 @@ public:
     /// Empty, inside the object.
     WBStr() noexcept { Text::start(*this); }
     /// Copies of texts, each made as by assigning to an empty string.
-    WBStr(WChar const* text, std::uint64_t n = 0) : WBStr() { Text::assign(*this, text, n); }
-    WBStr(WStr const& text) : WBStr() { Text::assign(*this, text.wstr(), text.size()); }
-    WBStr(WBStr const& other) : WBStr() { Text::assign(*this, other.text_, other.size_); }
+    WBStr(WChar const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
+    WBStr(WStr const& text) noexcept { Text::make(*this, text.wstr(), text.size()); }
+    WBStr(WBStr const& other) noexcept : WStr() { Text::makeOwned(*this, other.text_, other.size_); }
     ~WBStr() { Text::end(*this); }
 
     /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
     WBStr& operator=(WBStr const& other) {
-        if (this != &other) Text::assign(*this, other.text_, other.size_);
+        if (this != &other) Text::assignOwned(*this, other.text_, other.size_);
         return *this;
     }
     WBStr& operator=(WStr const& text) {

@@ -58,7 +58,7 @@ public:
     /// a common terminator. 0: the two texts up to their terminators. The same pointer is always equal.
     bool eq(WChar const* text, std::uint64_t n = 0) const noexcept {
         if (text_ == text) return true;
-        if (n != 0) return size_ == n && detail::compareTextsUpTo(text_, text, n) == 0;
+        if (n != 0) return size_ == n && detail::sameTexts(text_, text, n);
         return detail::compareTexts(text_, text) == 0;
     }
     /// The right-hand size alone chooses the comparison, as for `Str`.

@@ -1,0 +1,199 @@
+#include "basis/text/copy_text.h"
+
+#include "basis/text/vector_text.h"
+#include "zor_basis/text/word_ops.h"
+
+namespace ZOR_Basis::detail {
+
+#if ZB_VECTOR_TEXT
+
+namespace {
+
+/// How much of a text may be read before anything is known about its bytes.
+struct Given {
+    static bool readable(char const* text, std::uint64_t length) noexcept { return inOnePage(text, length); }
+};
+struct Owned {
+    static bool readable(char const*, std::uint64_t) noexcept { return true; }
+};
+
+// Each step reads everything before it writes anything, so that source and target may overlap.
+
+ZB_INLINE bool copyUpTo3(char* target, char const* source, std::uint64_t length) noexcept {
+    char const first = source[0];
+    char const middle = source[length / 2];
+    char const last = source[length - 1];
+    if (first == '\0' || middle == '\0' || last == '\0') return false;
+    target[0] = first;
+    target[length / 2] = middle;
+    target[length - 1] = last;
+    return true;
+}
+
+ZB_INLINE bool copy4To7(char* target, char const* source, std::uint64_t length) noexcept {
+    std::uint32_t const head = load4(source);
+    std::uint32_t const tail = load4(source + length - 4);
+    if (hasZero(head | std::uint64_t{tail} << 32)) return false;
+    std::memcpy(target, &head, sizeof head);
+    std::memcpy(target + length - 4, &tail, sizeof tail);
+    return true;
+}
+
+ZB_INLINE bool copy8To15(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const both = _mm_unpacklo_epi64(load8(source), load8(source + length - 8));
+    if (zerosOf(both) != 0) return false;
+    _mm_storel_epi64(reinterpret_cast<__m128i*>(target), both);
+    _mm_storel_epi64(reinterpret_cast<__m128i*>(target + length - 8), _mm_unpackhi_epi64(both, both));
+    return true;
+}
+
+ZB_INLINE bool copy16To32(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const head = load16(source);
+    __m128i const tail = load16(source + length - 16);
+    if (zerosOf(_mm_min_epu8(head, tail)) != 0) return false;
+    store16(target, head);
+    store16(target + length - 16, tail);
+    return true;
+}
+
+ZB_INLINE bool copy33To64(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const a = load16(source);
+    __m128i const b = load16(source + 16);
+    __m128i const c = load16(source + length - 32);
+    __m128i const d = load16(source + length - 16);
+    if (zerosOf(_mm_min_epu8(_mm_min_epu8(a, b), _mm_min_epu8(c, d))) != 0) return false;
+    store16(target, a);
+    store16(target + 16, b);
+    store16(target + length - 32, c);
+    store16(target + length - 16, d);
+    return true;
+}
+
+ZB_INLINE bool copyShort(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length >= 8) [[likely]]
+        return copy8To15(target, source, length);
+    if (length >= 4) return copy4To7(target, source, length);
+    return length == 0 || copyUpTo3(target, source, length);
+}
+
+ZB_COLD void copyOther(char* target, char const* source, std::uint64_t length) noexcept {
+    copyUpToTerminator(target, source, length);
+}
+
+#if ZB_WIDE_VECTOR_TEXT
+
+bool overlap(char const* target, char const* source, std::uint64_t length) noexcept {
+    auto const distance = static_cast<std::uint64_t>(target - source);
+    return distance < length || 0 - distance < length;
+}
+
+ZB_AVX2 ZB_INLINE bool copy65To128(char* target, char const* source, std::uint64_t length) noexcept {
+    __m256i const a = load32(source);
+    __m256i const b = load32(source + 32);
+    __m256i const c = load32(source + length - 64);
+    __m256i const d = load32(source + length - 32);
+    if (hasZero(_mm256_min_epu8(_mm256_min_epu8(a, b), _mm256_min_epu8(c, d)))) return false;
+    store32(target, a);
+    store32(target + 32, b);
+    store32(target + length - 64, c);
+    store32(target + length - 32, d);
+    return true;
+}
+
+ZB_AVX2 ZB_INLINE bool copy129To256(char* target, char const* source, std::uint64_t length) noexcept {
+    __m256i const a = load32(source);
+    __m256i const b = load32(source + 32);
+    __m256i const c = load32(source + 64);
+    __m256i const d = load32(source + 96);
+    __m256i const e = load32(source + length - 128);
+    __m256i const f = load32(source + length - 96);
+    __m256i const g = load32(source + length - 64);
+    __m256i const h = load32(source + length - 32);
+    __m256i const front = _mm256_min_epu8(_mm256_min_epu8(a, b), _mm256_min_epu8(c, d));
+    __m256i const back = _mm256_min_epu8(_mm256_min_epu8(e, f), _mm256_min_epu8(g, h));
+    if (hasZero(_mm256_min_epu8(front, back))) return false;
+    store32(target, a);
+    store32(target + 32, b);
+    store32(target + 64, c);
+    store32(target + 96, d);
+    store32(target + length - 128, e);
+    store32(target + length - 96, f);
+    store32(target + length - 64, g);
+    store32(target + length - 32, h);
+    return true;
+}
+
+/// More than 256 bytes: in runs of 128, then the rest.
+template <class Text>
+ZB_AVX2 ZB_COLD void copyRuns(char* target, char const* source, std::uint64_t length) noexcept {
+    if (overlap(target, source, length)) return copyOther(target, source, length);
+    for (; length > 256; target += 128, source += 128, length -= 128) {
+        if (!Text::readable(source, 128) || !copy65To128(target, source, 128)) return copyOther(target, source, length);
+    }
+    if (!Text::readable(source, length) || !copy129To256(target, source, length)) copyOther(target, source, length);
+}
+
+/// More than 64 bytes.
+template <class Text>
+ZB_AVX2 ZB_COLD void copyLong(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length > 256) return copyRuns<Text>(target, source, length);
+    if (Text::readable(source, length)) [[likely]] {
+        if (length <= 128) {
+            if (copy65To128(target, source, length)) [[likely]]
+                return;
+        } else {
+            if (copy129To256(target, source, length)) [[likely]]
+                return;
+        }
+    }
+    copyOther(target, source, length);
+}
+
+#endif
+
+template <class Text>
+void copyOf(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length < 16 && Text::readable(source, length)) [[likely]] {
+        if (copyShort(target, source, length)) [[likely]]
+            return;
+        return copyOther(target, source, length);
+    }
+#if ZB_WIDE_VECTOR_TEXT
+    if (length > 64 && __builtin_cpu_supports("avx2")) return copyLong<Text>(target, source, length);
+#endif
+    if (length <= 64 && Text::readable(source, length)) {
+        if (length > 32) {
+            if (copy33To64(target, source, length)) [[likely]]
+                return;
+        } else if (length >= 16) {
+            if (copy16To32(target, source, length)) [[likely]]
+                return;
+        }
+    }
+    copyOther(target, source, length);
+}
+
+} // namespace
+
+// kept text-06: the size is what the caller said, so the units behind the terminator have to be defined
+void copyText(char* target, char const* source, std::uint64_t length) noexcept {
+    copyOf<Given>(target, source, length);
+}
+
+void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept {
+    copyOf<Owned>(target, source, length);
+}
+
+#else
+
+void copyText(char* target, char const* source, std::uint64_t length) noexcept {
+    copyUpToTerminator(target, source, length);
+}
+
+void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept {
+    copyUpToTerminator(target, source, length);
+}
+
+#endif
+
+} // namespace ZOR_Basis::detail

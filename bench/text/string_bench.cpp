@@ -1,0 +1,192 @@
+// Strings beside std::string and llvm::SmallString. All sides get the same texts through pointers and lengths that the
+// compiler cannot see through.
+
+#include <zor_basis/text.h>
+
+#include <benchmark/benchmark.h>
+
+#include <cstring>
+#include <memory>
+#include <string>
+#include <string_view>
+
+#ifdef BENCH_HAS_LLVM
+#include <llvm/ADT/SmallString.h>
+#endif
+
+using namespace ZOR_Basis;
+
+namespace {
+
+/// A text of `size` bytes whose bytes and length are unknown to the compiler.
+std::string makeText(std::size_t size) {
+    std::string text;
+    for (std::size_t i = 0; i < size; ++i) text += static_cast<char>('a' + i % 26);
+    benchmark::DoNotOptimize(text);
+    return text;
+}
+
+template <class String>
+struct Maker {
+    static String make(char const* text, std::size_t size) { return String(text, size); }
+};
+
+template <std::uint64_t N>
+struct Maker<BufStr<N>> {
+    static BufStr<N> make(char const* text, std::size_t size) { return BufStr<N>(text, size); }
+    static void append(BufStr<N>& s, char c) { s += c; }
+};
+
+template <>
+struct Maker<std::string> {
+    static std::string make(char const* text, std::size_t size) { return {text, size}; }
+    static void append(std::string& s, char c) { s += c; }
+};
+
+#ifdef BENCH_HAS_LLVM
+template <unsigned N>
+struct Maker<llvm::SmallString<N>> {
+    static llvm::SmallString<N> make(char const* text, std::size_t size) {
+        return llvm::SmallString<N>(llvm::StringRef(text, size));
+    }
+    static void append(llvm::SmallString<N>& s, char c) { s.push_back(c); }
+};
+#endif
+
+template <class String>
+void construct(benchmark::State& state, std::size_t size) {
+    std::string const text = makeText(size);
+    char const* source = text.data();
+    std::size_t length = size;
+    for (auto _ : state) {
+        benchmark::DoNotOptimize(source);
+        benchmark::DoNotOptimize(length);
+        String s = Maker<String>::make(source, length);
+        benchmark::DoNotOptimize(s);
+        benchmark::ClobberMemory();
+    }
+}
+
+template <class String>
+void copy(benchmark::State& state, std::size_t size) {
+    String const original = Maker<String>::make(makeText(size).data(), size);
+    String const* source = &original;
+    for (auto _ : state) {
+        benchmark::DoNotOptimize(source);
+        String s(*source);
+        benchmark::DoNotOptimize(s);
+        benchmark::ClobberMemory();
+    }
+}
+
+template <class String>
+void append(benchmark::State& state, std::size_t count) {
+    for (auto _ : state) {
+        String s;
+        benchmark::DoNotOptimize(s);
+        for (std::size_t i = 0; i < count; ++i) Maker<String>::append(s, static_cast<char>('a' + (i & 15)));
+        benchmark::DoNotOptimize(s);
+        benchmark::ClobberMemory();
+    }
+}
+
+/// Sixteen pairs, equal texts and texts that differ in one place, the same ones for everybody.
+template <class String>
+struct Pairs {
+    static constexpr std::size_t Count = 16;
+    explicit Pairs(std::size_t size) {
+        for (std::size_t i = 0; i < Count; ++i) {
+            std::string text = makeText(size);
+            left[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
+            if (i % 2 == 1) text[(i * 7) % size] = '!';
+            right[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
+        }
+    }
+    std::unique_ptr<String> left[Count];
+    std::unique_ptr<String> right[Count];
+};
+
+template <class String, class Compare>
+void compare(benchmark::State& state, std::size_t size, Compare compareOne) {
+    Pairs<String> const pairs(size);
+    std::size_t i = 0;
+    for (auto _ : state) {
+        String const* left = pairs.left[i].get();
+        String const* right = pairs.right[i].get();
+        i = (i + 1) % Pairs<String>::Count;
+        benchmark::DoNotOptimize(left);
+        benchmark::DoNotOptimize(right);
+        auto result = compareOne(*left, *right);
+        benchmark::DoNotOptimize(result);
+    }
+}
+
+template <class... Arguments>
+void add(std::string const& row, char const* who, Arguments... arguments) {
+    benchmark::RegisterBenchmark((row + "/" + who).c_str(), arguments...);
+}
+
+template <class String>
+void addMaking(std::string const& kind, char const* who, std::size_t size) {
+    std::string const suffix = kind + "/" + std::to_string(size) + "B";
+    add("construct/" + suffix, who, [size](benchmark::State& state) { construct<String>(state, size); });
+    add("copy/" + suffix, who, [size](benchmark::State& state) { copy<String>(state, size); });
+}
+
+template <class String>
+void addAppending(std::string const& row, char const* who, std::size_t count) {
+    add(row, who, [count](benchmark::State& state) { append<String>(state, count); });
+}
+
+template <class String>
+void addComparing(std::string const& kind, char const* who, std::size_t size) {
+    std::string const suffix = kind + "/" + std::to_string(size) + "B";
+    add("equal/" + suffix, who, [size](benchmark::State& state) {
+        compare<String>(state, size, [](String const& a, String const& b) { return a == b; });
+    });
+    add("compare/" + suffix, who, [size](benchmark::State& state) {
+        compare<String>(state, size, [](String const& a, String const& b) { return a.compare(b); });
+    });
+    add("less/" + suffix, who, [size](benchmark::State& state) {
+        compare<String>(state, size, [](String const& a, String const& b) { return a < b; });
+    });
+}
+
+bool registerAll() {
+    for (std::size_t size : {5U, 14U, 40U, 200U}) {
+        addMaking<BufStr<255>>("BufStr255", "ours", size);
+        addMaking<std::string>("BufStr255", "std::string", size);
+#ifdef BENCH_HAS_LLVM
+        addMaking<llvm::SmallString<255>>("BufStr255", "llvm::SmallString", size);
+#endif
+    }
+    for (std::size_t size : {5U, 12U, 14U, 400U}) {
+        addMaking<BufStr<15>>("BufStr15", "ours", size);
+        addMaking<std::string>("BufStr15", "std::string", size);
+#ifdef BENCH_HAS_LLVM
+        addMaking<llvm::SmallString<15>>("BufStr15", "llvm::SmallString", size);
+#endif
+    }
+    addAppending<BufStr<15>>("append/BufStr15/14", "ours", 14);
+    addAppending<std::string>("append/BufStr15/14", "std::string", 14);
+    addAppending<BufStr<255>>("append/BufStr255/200", "ours", 200);
+    addAppending<std::string>("append/BufStr255/200", "std::string", 200);
+#ifdef BENCH_HAS_LLVM
+    addAppending<llvm::SmallString<15>>("append/BufStr15/14", "llvm::SmallString", 14);
+    addAppending<llvm::SmallString<255>>("append/BufStr255/200", "llvm::SmallString", 200);
+#endif
+    for (std::size_t size : {5U, 14U, 40U, 200U}) {
+        std::string const kind = size <= 14 ? "BufStr15" : "BufStr255";
+        if (size <= 14) {
+            addComparing<BufStr<15>>(kind, "ours", size);
+        } else {
+            addComparing<BufStr<255>>(kind, "ours", size);
+        }
+        addComparing<std::string>(kind, "std::string", size);
+    }
+    return true;
+}
+
+[[maybe_unused]] bool const registered = registerAll();
+
+} // namespace

@@ -1,0 +1,75 @@
+// Linux only, as the page behind a text is taken away here: nothing behind a terminator is read, whatever length is given.
+// The Windows build has the same code.
+
+#include "zor_basis/text.h"
+
+#include <gtest/gtest.h>
+
+#include <sys/mman.h>
+
+#include <cstring>
+#include <string>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+constexpr std::size_t PageSize = 4096;
+
+/// Two pages, of which the second cannot be read.
+class LastPage {
+public:
+    LastPage() {
+        void* pages = mmap(nullptr, 2 * PageSize, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+        begin_ = static_cast<char*>(pages);
+        mprotect(begin_ + PageSize, PageSize, PROT_NONE);
+    }
+    ~LastPage() { munmap(begin_, 2 * PageSize); }
+    LastPage(LastPage const&) = delete;
+    LastPage& operator=(LastPage const&) = delete;
+
+    template <class Char>
+    Char const* textAtTheEnd(std::basic_string<Char> const& text) {
+        std::size_t const bytes = (text.size() + 1) * sizeof(Char);
+        return static_cast<Char const*>(std::memcpy(begin_ + PageSize - bytes, text.c_str(), bytes));
+    }
+
+private:
+    char* begin_;
+};
+
+} // namespace
+
+TEST(TextAtThePagesEnd, is_read_up_to_its_terminator_only) {
+    LastPage first;
+    LastPage second;
+    for (std::size_t size = 1; size < 400; size += size < 70 ? 1 : 9) {
+        std::string const text(size, 'x');
+        char const* a = first.textAtTheEnd(text);
+        char const* b = second.textAtTheEnd(text);
+        for (std::uint64_t claimed : {size, size + 1, size + 9, size + 40, size + 200, size + 5000}) {
+            std::string padded = text;
+            padded.resize(claimed);
+            BufStr<255> const made(a, claimed);
+            ASSERT_EQ(std::string(made, made.size()), padded) << size << ' ' << claimed;
+            ASSERT_TRUE(Str(a, claimed) == Str(b, claimed));
+            ASSERT_EQ(Str(a, claimed).compare(Str(b, claimed)), 0);
+            ASSERT_TRUE(Str(a).beginWith(Str(b, claimed)));
+            ASSERT_EQ(HeapStr(a, claimed).size(), claimed);
+        }
+        ASSERT_EQ(BufStr<15>(a).size(), size);
+    }
+}
+
+TEST(TextAtThePagesEnd, wide_text_is_read_up_to_its_terminator_only) {
+    LastPage first;
+    LastPage second;
+    for (std::size_t size = 1; size < 300; ++size) {
+        std::basic_string<WChar> const text(size, WChar('x'));
+        WChar const* a = first.textAtTheEnd(text);
+        WChar const* b = second.textAtTheEnd(text);
+        ASSERT_EQ(WBStr(a, size + 40).size(), size + 40);
+        ASSERT_TRUE(WStr(a, size + 40) == WStr(b, size + 40));
+        ASSERT_EQ(WStr(a).compare(b, size + 40), 0);
+    }
+}
