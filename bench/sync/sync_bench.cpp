@@ -18,25 +18,30 @@ constexpr std::uint64_t KEYS = 1000;
 class MutexMap {
 public:
     void take(std::uint64_t key) {
-        std::shared_ptr<std::mutex> mutex;
+        std::mutex* mutex = nullptr;
         {
             std::lock_guard const lock(mapMutex_);
             auto& slot = map_[key];
-            if (slot == nullptr) slot = std::make_shared<std::mutex>();
-            mutex = slot;
+            if (slot == nullptr) slot = std::make_unique<Counted>();
+            ++slot->users;
+            mutex = &slot->mutex;
         }
         mutex->lock();
     }
     void give(std::uint64_t key) {
         std::lock_guard const lock(mapMutex_);
         auto const place = map_.find(key);
-        place->second->unlock();
-        if (place->second.use_count() == 1) map_.erase(place);
+        place->second->mutex.unlock();
+        if (--place->second->users == 0) map_.erase(place);
     }
 
 private:
+    struct Counted {
+        std::mutex mutex;
+        std::uint64_t users = 0;
+    };
     std::mutex mapMutex_;
-    std::unordered_map<std::uint64_t, std::shared_ptr<std::mutex>> map_;
+    std::unordered_map<std::uint64_t, std::unique_ptr<Counted>> map_;
 };
 
 SemSet ourSet(KEYS);
