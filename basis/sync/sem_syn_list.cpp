@@ -2,7 +2,6 @@
 
 #include "zor_basis/memory/mem_mgr.h"
 
-#include <mutex>
 #include <new>
 
 namespace ZOR_Basis {
@@ -11,10 +10,13 @@ SemSynList::SemSynList() : listMutex_(xos_SemMCreate()) {}
 
 SemSynList::~SemSynList() {
     xos_SemDestroy(listMutex_);
-    while (first_ != nullptr) {
-        Entry* const entry = first_;
+    while (Entry* const entry = load(first_)) {
         unlink(entry);
         xos_SemDestroy(entry->mutex);
+        freeEntry(entry);
+    }
+    while (Entry* const entry = spare_) {
+        spare_ = load(entry->next);
         freeEntry(entry);
     }
 }
@@ -29,9 +31,7 @@ bool SemSynList::take(std::uint64_t key) {
 
 bool SemSynList::give(std::uint64_t key) {
     // The caller holds the key, so its entry can be found before the list is taken, and cannot go meanwhile.
-    links_.lock();
-    Entry* const entry = find(key);
-    links_.unlock();
+    Entry* const entry = search(key);
     xos_SemTake(listMutex_);
     bool given = false;
     if (entry != nullptr) {
@@ -42,39 +42,62 @@ bool SemSynList::give(std::uint64_t key) {
         given = xos_SemGive(entry->mutex) == 0;
         if (unused) {
             xos_SemDestroy(entry->mutex);
-            freeEntry(entry);
+            store(entry->next, spare_);
+            spare_ = entry;
         }
     }
     xos_SemGive(listMutex_);
     return given;
 }
 
+/// \pre the list mutex is held
 SemSynList::Entry* SemSynList::find(std::uint64_t key) const {
-    Entry* entry = first_;
-    while (entry != nullptr && entry->key != key) entry = entry->next;
+    Entry* entry = load(first_);
+    while (entry != nullptr && entry->key.load(std::memory_order_relaxed) != key) entry = load(entry->next);
     return entry;
+}
+
+/// The same without the list mutex, again and again until nothing has changed meanwhile.
+SemSynList::Entry* SemSynList::search(std::uint64_t key) const {
+    for (;;) {
+        std::uint32_t const before = links_.beginReading();
+        Entry* entry = load(first_);
+        while (entry != nullptr && entry->key.load(std::memory_order_relaxed) != key && links_.isUnchanged(before)) {
+            entry = load(entry->next);
+        }
+        std::atomic_thread_fence(std::memory_order_acquire);
+        if (links_.isUnchanged(before)) return entry;
+    }
 }
 
 /// One more user for a key's entry, which is made if there is none. \pre the list mutex is held
 SemSynList::Entry* SemSynList::enter(std::uint64_t key) {
-    {
-        std::lock_guard const lock(links_);
-        if (Entry* const entry = find(key)) {
-            ++entry->users;
-            return entry;
-        }
-    }
-    // Entries are made under the list mutex only, so nobody makes one for this key at the same time.
-    Entry* const entry = makeEntry(key);
+    Entry* entry = find(key);
+    bool const isNew = entry == nullptr;
+    if (isNew) entry = makeEntry();
     if (entry == nullptr) return nullptr;
-    std::lock_guard const lock(links_);
-    linkFront(entry);
+    links_.lock();
+    if (isNew) {
+        entry->key.store(key, std::memory_order_relaxed);
+        linkFront(entry);
+    }
+    ++entry->users;
+    links_.unlock();
     return entry;
 }
 
-SemSynList::Entry* SemSynList::makeEntry(std::uint64_t key) {
-    void* const memory = entryMemory_ != nullptr ? entryMemory_->alloc() : ::operator new(sizeof(Entry), std::nothrow);
-    return memory != nullptr ? new (memory) Entry{nullptr, nullptr, xos_SemMCreate(), key, 1} : nullptr;
+SemSynList::Entry* SemSynList::makeEntry() {
+    Entry* entry = spare_;
+    if (entry != nullptr) {
+        spare_ = load(entry->next);
+    } else {
+        void* const memory =
+            entryMemory_ != nullptr ? entryMemory_->alloc() : ::operator new(sizeof(Entry), std::nothrow);
+        if (memory == nullptr) return nullptr;
+        entry = new (memory) Entry{};
+    }
+    entry->mutex = xos_SemMCreate();
+    return entry;
 }
 
 void SemSynList::freeEntry(Entry* entry) {
@@ -86,26 +109,31 @@ void SemSynList::freeEntry(Entry* entry) {
 }
 
 void SemSynList::linkFront(Entry* entry) {
-    entry->next = first_;
-    (first_ != nullptr ? first_->previous : last_) = entry;
-    first_ = entry;
+    Entry* const second = load(first_);
+    store(entry->previous, nullptr);
+    store(entry->next, second);
+    store(second != nullptr ? second->previous : last_, entry);
+    store(first_, entry);
     ++count_;
 }
 
 void SemSynList::unlink(Entry* entry) {
-    (entry->previous != nullptr ? entry->previous->next : first_) = entry->next;
-    (entry->next != nullptr ? entry->next->previous : last_) = entry->previous;
+    Entry* const previous = load(entry->previous);
+    Entry* const next = load(entry->next);
+    store(previous != nullptr ? previous->next : first_, next);
+    store(next != nullptr ? next->previous : last_, previous);
     --count_;
 }
 
 bool SemSynList::isConsistent() const {
     std::uint64_t entries = 0;
     Entry const* previous = nullptr;
-    for (Entry const* entry = first_; entry != nullptr && entries <= count_; entry = entry->next, ++entries) {
-        if (entry->previous != previous || entry->users == 0) return false;
+    for (Entry const* entry = load(first_); entry != nullptr && entries <= count_; entry = load(entry->next)) {
+        if (load(entry->previous) != previous || entry->users == 0) return false;
         previous = entry;
+        ++entries;
     }
-    return entries == count_ && previous == last_;
+    return entries == count_ && previous == load(last_);
 }
 
 } // namespace ZOR_Basis

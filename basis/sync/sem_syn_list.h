@@ -5,15 +5,17 @@
 #define BASIS_SYNC_SEM_SYN_LIST_H
 
 #include "basis/platform/xos_basics.h"
-#include "basis/sync/spin_lock.h"
+#include "basis/sync/sequence_lock.h"
 
+#include <atomic>
 #include <cstdint>
 
 namespace ZOR_Basis {
 
 class MemMgr;
 
-class SemSynList {
+/// Buckets stand side by side in a table; each has its cache lines to itself.
+class alignas(64) SemSynList {
 public:
     SemSynList();
     SemSynList(SemSynList const&) = delete;
@@ -29,29 +31,35 @@ public:
     bool isConsistent() const;
 
 private:
+    /// Atomic is what is read without the list mutex.
     struct Entry {
-        Entry* previous;
-        Entry* next;
+        std::atomic<Entry*> previous;
+        std::atomic<Entry*> next;
         xos_Sem mutex;
-        std::uint64_t key;
+        std::atomic<std::uint64_t> key;
         std::uint64_t users;
     };
 
-    /// \pre the link lock is held
+    static Entry* load(std::atomic<Entry*> const& link) { return link.load(std::memory_order_relaxed); }
+    static void store(std::atomic<Entry*>& link, Entry* entry) { link.store(entry, std::memory_order_relaxed); }
+
     Entry* find(std::uint64_t key) const;
+    Entry* search(std::uint64_t key) const;
     Entry* enter(std::uint64_t key);
-    Entry* makeEntry(std::uint64_t key);
+    Entry* makeEntry();
     void freeEntry(Entry* entry);
     void linkFront(Entry* entry);
     void unlink(Entry* entry);
 
     xos_Sem listMutex_;
-    Entry* first_ = nullptr;
-    Entry* last_ = nullptr;
+    std::atomic<Entry*> first_{nullptr};
+    std::atomic<Entry*> last_{nullptr};
     std::uint64_t count_ = 0;
     MemMgr* entryMemory_ = nullptr;
-    /// Guards the links and the users where the list mutex is not held.
-    mutable SpinLock links_;
+    /// Entries without users, kept for the next key: a search that comes too late may still read them.
+    Entry* spare_ = nullptr;
+    /// Tells a search that links have changed meanwhile.
+    mutable SequenceLock links_;
 };
 
 } // namespace ZOR_Basis
