@@ -53,7 +53,7 @@ bool SemSynList::give(std::uint64_t key) {
 /// \pre the list mutex is held
 SemSynList::Entry* SemSynList::find(std::uint64_t key) const {
     Entry* entry = load(first_);
-    while (entry != nullptr && entry->key.load(std::memory_order_relaxed) != key) entry = load(entry->next);
+    while (entry != nullptr && entry->key.load(std::memory_order_acquire) != key) entry = load(entry->next);
     return entry;
 }
 
@@ -62,10 +62,9 @@ SemSynList::Entry* SemSynList::search(std::uint64_t key) const {
     for (;;) {
         std::uint32_t const before = links_.beginReading();
         Entry* entry = load(first_);
-        while (entry != nullptr && entry->key.load(std::memory_order_relaxed) != key && links_.isUnchanged(before)) {
+        while (entry != nullptr && entry->key.load(std::memory_order_acquire) != key && links_.isUnchanged(before)) {
             entry = load(entry->next);
         }
-        std::atomic_thread_fence(std::memory_order_acquire);
         if (links_.isUnchanged(before)) return entry;
     }
 }
@@ -78,7 +77,7 @@ SemSynList::Entry* SemSynList::enter(std::uint64_t key) {
     if (entry == nullptr) return nullptr;
     links_.lock();
     if (isNew) {
-        entry->key.store(key, std::memory_order_relaxed);
+        entry->key.store(key, std::memory_order_release);
         linkFront(entry);
     }
     ++entry->users;

@@ -40,8 +40,8 @@ private:
         std::uint64_t users;
     };
 
-    static Entry* load(std::atomic<Entry*> const& link) { return link.load(std::memory_order_relaxed); }
-    static void store(std::atomic<Entry*>& link, Entry* entry) { link.store(entry, std::memory_order_relaxed); }
+    static Entry* load(std::atomic<Entry*> const& link) { return link.load(std::memory_order_acquire); }
+    static void store(std::atomic<Entry*>& link, Entry* entry) { link.store(entry, std::memory_order_release); }
 
     Entry* find(std::uint64_t key) const;
     Entry* search(std::uint64_t key) const;

@@ -1,5 +1,6 @@
 /// \file
 /// Lets readers go without a lock and see afterwards whether they read something whole. Writers wait for each other.
+/// What is guarded is read with acquire and written with release order, which keeps it between the looks at the number.
 
 #ifndef BASIS_SYNC_SEQUENCE_LOCK_H
 #define BASIS_SYNC_SEQUENCE_LOCK_H
@@ -19,7 +20,6 @@ public:
         while (!sequence_.compare_exchange_weak(expected, expected + 1, std::memory_order_acquire)) {
             expected = beginReading();
         }
-        std::atomic_thread_fence(std::memory_order_release);
     }
     void unlock() { sequence_.store(sequence_.load(std::memory_order_relaxed) + 1, std::memory_order_release); }
     /// @}
