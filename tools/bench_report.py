@@ -44,7 +44,7 @@ def measure(program):
     for entry in json.loads(report.read_text())["benchmarks"]:
         if entry.get("aggregate_name") != "median":
             continue
-        name = re.sub(r"/(manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)",
+        name = re.sub(r"/(manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)|/\d+$",
                       "", entry["run_name"])
         row, who = name.rsplit("/", 1)
         scale = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}[entry["time_unit"]]

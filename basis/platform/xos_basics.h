@@ -1,8 +1,16 @@
 /// \file
 /// Module `xos_basics`: tasks, semaphores, files, directories, parameters, configuration groups, assertions. C-clean.
 ///
-/// Results are 0 for success unless said otherwise. Handles are 64-bit numbers, 0 for none. Paths are zero-terminated
-/// 8-bit text and take both slash kinds.
+/// These are the server's functions as the library calls them, and what the library relies on in each. The stand-alone
+/// layer in host/ implements all of them; where a remark says "stand-alone", the server's own module decides otherwise.
+///
+/// `int` results are 0 for success and non-zero for failure unless said otherwise; the system's last error (errno,
+/// `GetLastError`) then says why. Handles are 64-bit numbers, 0 for none. Texts are zero-terminated and borrowed for the
+/// call. Paths are 8-bit text, on Windows in the process's ANSI code page, and take both slash kinds on every target.
+/// Parameters called `reserved` are 0 in every call of the library. Flags without a meaning here are accepted and ignored.
+///
+/// \thread every function may be called by any thread at any time; one open file, listing or configuration group belongs
+/// to one thread at a time
 
 #ifndef BASIS_PLATFORM_XOS_BASICS_H
 #define BASIS_PLATFORM_XOS_BASICS_H
@@ -20,56 +28,123 @@ typedef uint64_t xos_Task;
 
 /* Semaphores */
 
-/// A mutex, recursive for its owning thread.
+/// Makes a mutex, free, recursive for the thread that takes it.
+/// \return 0 on failure
+/// \cost stand-alone: no system call; about as much as allocating a small block
 XOS_API xos_Sem xos_SemMCreate(void);
-/// A binary semaphore. \param available  1: can be taken at once; 0: taken
+
+/// Makes a binary semaphore, which any thread may give.
+/// \param available  not 0: can be taken at once; 0: taken
+/// \return 0 on failure
 XOS_API xos_Sem xos_SemBCreate(int available);
-/// A mutex that all processes of one user share under `id`. `word` caches its handle in this process.
+
+/// Opens the mutex that all processes of one user share under `id`, recursive for the thread that takes it. When a thread
+/// or process ends that holds it, however it ends, it is free again: the next to take it takes it over.
+///
+/// Stand-alone on Linux it is a locked file in `xos-UID`, a folder of that user alone (mode 0700) in /run/lock, else in
+/// /dev/shm, else in /tmp; on Windows a kernel mutex named after the user.
+/// \param flags  0 in every call of the library; ignored
+/// \param word   null or a word of the process, 0 before the first call: keeps the handle between calls, so that opening it
+///               again opens nothing
+/// \return the same handle for the same `id`, as long as the process lives; 0 on failure
 XOS_API xos_Sem xos_SemNamedMutexCreate(int id, int flags, int reserved, uint32_t* word);
+
+/// Waits without limit until the semaphore can be taken. A mutex that the thread holds already is taken once more.
+/// \error no semaphore: 0, or one that was destroyed
+/// \cost stand-alone, uncontended: no system call
 XOS_API int xos_SemTake(xos_Sem sem);
+
+/// Gives a semaphore. A mutex is free when it has been given as often as it was taken; a binary semaphore that is available
+/// stays so, which is a success.
+/// \error a mutex that the calling thread does not hold; no semaphore
 XOS_API int xos_SemGive(xos_Sem sem);
+
+/// Ends a semaphore, held or not. A named mutex stays for the life of the process: destroying it changes nothing.
+/// \pre no thread waits for it
+/// \error no semaphore: 0, or one that was destroyed already
 XOS_API int xos_SemDestroy(xos_Sem sem);
 
 /* Tasks */
 
+/// What a task is made of. The library passes options 0, priority -9, stack size 0 and reserved 0.
 typedef struct xos_TaskParams {
     void (*entry)(void*);
     void* argument;
-    uint32_t options;
-    int32_t priority;
-    uint64_t stackSize;
-    char const* name;
+    uint32_t options;   /* stand-alone: ignored */
+    int32_t priority;   /* stand-alone: ignored */
+    uint64_t stackSize; /* bytes at least; 0: the system's usual size */
+    char const* name;   /* what a debugger shows; copied; stand-alone: 15 bytes of it on Linux, 63 on Windows */
     uint64_t reserved;
 } xos_TaskParams;
 
-/// Starts a task. \return its handle; all ones when it could not be created
+/// Starts a task: `entry(argument)` runs on a thread of its own, at the same time as everything else. No task waits for
+/// another's end; a task that never returns keeps nothing but its thread, and the process may end meanwhile. Threads are
+/// used again for later tasks, so what a task leaves in its thread another may find.
+/// \return the task's number, not 0; all ones when it could not be created, also for a null block or entry
+/// \cost stand-alone: most tasks start without a system call
 XOS_API xos_Task xos_TaskCreate(xos_TaskParams const* params);
+
+/// Rests the calling thread for at least so many milliseconds.
 XOS_API void xos_TaskSleep(uint32_t ms);
-/// Milliseconds of an arbitrary start, wrapping at 32 bits.
+
+/// Milliseconds since an arbitrary start, on a clock that nobody sets, wrapping at 32 bits: differences are taken on 32
+/// bits.
 XOS_API uint32_t xos_MsCount(void);
 
 /* Files */
 
-/// \param flags  0x01 truncate, 0x02 read, 0x14 write and create, 0x08 append, 0x20 text
+/// Opens a file.
+/// \param flags  0x02 read; 0x14 write, and create what is not there (0x04 without creating); 0x01 truncate; 0x08 write
+///               at the end whatever the position; 0x20 text: on Windows line ends are translated
+/// \return 0 on failure, also for a directory, for flags without any access, and where a handle that cannot write would
+///         truncate or create
 XOS_API xos_File xos_FileOpen(char const* path, uint32_t flags);
+
+/// Closes the file; it is closed whatever the result.
+/// \error the system reports only now that something could not be written; no file
 XOS_API int xos_FileCloseEx(xos_File file, int reserved);
-/// \return the bytes transferred
+
+/// \return the bytes read, fewer than `size` at the end of the file or on an error only; 0 for no file
 XOS_API uint64_t xos_FileReadEx(xos_File file, void* buffer, uint64_t size, int reserved1, int reserved2);
-/// \return the bytes transferred
+
+/// Others see what was written at once. What was read ahead is forgotten: the bytes go where `xos_FileTellEx` says.
+/// \return the bytes written, fewer than `size` on an error only; 0 for no file
 XOS_API uint64_t xos_FileWriteEx(xos_File file, void const* buffer, uint64_t size, int reserved1, int reserved2);
-/// Reads one line, its end included, into a buffer of `size` bytes. \return `buffer`; null at the end of the file
+
+/// Reads one line, its end included, or as much of it as fits into a buffer of `size` bytes with a terminator.
+/// \return `buffer`; null at the end of the file, on an error, for no file
 XOS_API char* xos_FileGetsEx(xos_File file, char* buffer, uint64_t size, int reserved);
+
+/// Waits until everything written so far has reached the device. Nothing to do for a handle that cannot write.
+/// \cost a device's time: milliseconds on a disk
 XOS_API int xos_FileFlush(xos_File file);
+
 /// \param origin  0 the start, 1 the current position, 2 the end
 XOS_API int xos_FileSeekEx(xos_File file, int64_t offset, int origin, int reserved);
-/// \return the position; -1 on failure
+
+/// \return the position in bytes from the start; -1 on failure
 XOS_API int64_t xos_FileTellEx(xos_File file, int reserved);
+
+/// Removes a file, or a link itself; never a directory.
 XOS_API int xos_FileRemove(char const* path, uint32_t flags);
+
+/// Copies a file, or the file that a link leads to, with its permissions and modification time. The destination appears
+/// whole or not at all.
+/// \param overwrite  0: fails when anything exists there, and changes nothing; else a file or link
+///                   there is replaced, a directory not
+/// \error also when `src` and `dst` are one file
 XOS_API int xos_FileCopy(char const* dst, char const* src, int overwrite);
+
+/// Renames a file, or a link itself; no directory. Onto itself: nothing to do, where it may overwrite.
+/// \param overwrite  as for `xos_FileCopy`
+/// \error also when `dst` is on another file system: the caller copies then
 XOS_API int xos_FileMove(char const* dst, char const* src, int overwrite);
+
+/// Gives the file `src` a second name `dst`, which must not exist.
 XOS_API int xos_FileHardLink(char const* src, char const* dst);
 
-/// The 64-bit status record of Windows, the same on every target.
+/// The 64-bit status record of Windows, the same 56 bytes on every target. Times are seconds since 1970 UTC. The names end
+/// in "_", as the plain ones are macros in some systems' headers.
 struct xos_Stat {
     uint32_t st_dev_;
     uint16_t st_ino_;
@@ -84,42 +159,99 @@ struct xos_Stat {
     int64_t st_ctime_;
 };
 
-/// Status of an entry; of a link itself, not of what it leads to.
+/// Takes the status of an entry; of a link itself, not of what it leads to.
 XOS_API int xos_FileStatByNameEx(char const* path, struct xos_Stat* record, uint32_t flags);
 
 /* Directories */
 
+/// Makes one directory.
+/// \error anything exists there already, a directory too; the parent does not exist
 XOS_API int xos_DirCreateEx(char const* path, int reserved);
-/// \param flags  0x200 with its contents
+
+/// Removes a directory; in place of one also a link itself.
+/// \param flags  0x200 with everything in it, links themselves and never what they lead to, to any depth
+/// \error without 0x200: it is not empty; nothing is removed then. With it: something cannot be removed; the rest is
+///        gone. A path that ends in "." or ".." or is a root
 XOS_API int xos_DirRemove(char const* path, uint32_t flags);
-/// \param flags  0x001 overwrite, 0x200 recursive
+
+/// Copies a directory and its files into `dst`, which is made or, where it exists, added to. A new `dst` appears when it
+/// is complete; in one that exists, each file does. Links and special entries are copied as what they are, also in place
+/// of `src`. New directories keep permissions and modification times, too.
+/// \param flags  0x200 its sub-directories too; 0x001 replaces files that exist, which else fail the call
+/// \error also when `dst` is `src` or lies in it; a file and a directory of one name
 XOS_API int xos_DirCopy(char const* dst, char const* src, uint32_t flags);
-/// \param flags  0x001 overwrite
+
+/// Renames a directory; in place of one also a link itself. Onto itself: nothing to do, with 0x001.
+/// \param flags  0x001 removes an existing directory `dst` first, but only when the move can follow
+/// \error anything exists at `dst`, without 0x001; `dst` is on another file system: the caller copies then
 XOS_API int xos_DirMove(char const* dst, char const* src, uint32_t flags);
+
+/// Opens a listing of a directory.
+/// \param pattern  null: everything; else names that match it by the library's wildcard rule
+/// \return 0 on failure
 XOS_API xos_Dir xos_DirOpenEx(char const* path, char const* pattern, uint32_t flags);
-/// Makes the listing match its pattern whatever the case of the letters (`on` not 0).
+
+/// Makes the listing match its pattern whatever the case of ASCII letters (`on` not 0).
 XOS_API void xos_DirForceCaseAny(xos_Dir dir, int on);
-/// The next entry's name, never "." or "..". \param kind  0 all, 1 directories, 2 files \return null at the end
+
+/// \param kind  0 all entries, 1 directories, 2 everything else; a link is never a directory
+/// \return the next entry's name, never "." or "..", valid until the listing's next call; null at the end
 XOS_API char const* xos_DirNextEx(xos_Dir dir, int kind, int reserved, uint32_t flags);
+
+/// Closes a listing; nothing for 0.
 XOS_API void xos_DirClose(xos_Dir dir);
+
+/// Compares texts byte by byte, bytes as unsigned numbers.
+/// \return 0 when they are equal, else below or above 0; null equals null and comes before every text
 XOS_API int xos_StrCmp(char const* a, char const* b);
-/// The configured root of the file system, or an empty text.
+
+/// The configured root of the file system as it was configured, or an empty text. Stand-alone: what `xos_HostSetRoot` set,
+/// else the environment variable `XOS_ROOT`. \return a text that stays valid for ever
 XOS_API char const* xos_FileSystemRoot(void);
 
 /* Shell, libraries, parameters, assertions */
 
-/// Runs a command line. With a `result` slot: waits and stores the exit code there.
+/// Runs a command line in the system's command interpreter: /bin/sh, or cmd.exe (`COMSPEC`).
+///
+/// A line of the form `cd DIRECTORY& COMMAND` runs the command in that directory, and not at all where the directory cannot
+/// be entered. The first "& " ends the directory, which is taken as it stands: both slash kinds, double quotes around it
+/// allowed, any drive. Nothing between `cd ` and `& ` leaves the directory as it is.
+/// \param result  null: returns as soon as the interpreter has started; else waits and stores the exit code (128 + the
+///                signal of a command that one ended; -1 where the process ignores its children's ends)
+/// \return 0 once the interpreter has started, whatever becomes of the command
 XOS_API int xos_ShellExecuteEx(char const* commandLine, int64_t* result);
+
+/// Loads a shared library for the life of the process, by path or by the system's search order.
+/// \return the system's handle of it; null on failure
 XOS_API void* xos_LibraryLoad(char const* name);
-/// \return the bytes stored at `out`; below 1: unknown
+
+/// Looks up a parameter of the platform. 0xFFFF8006 is its function resolver, `void* (*)(void* module, char const* name)`,
+/// of 8 bytes; stand-alone it is the only one, once `xos_HostSetResolver` has set it.
+/// \return the bytes stored at `out`; below 1: unknown, or `size` is too small, nothing is stored
 XOS_API int xos_BasicsParamLookup(uint32_t id, void* out, uint64_t size);
+
+/// Reports a programming error and returns. Stand-alone: `module:line: message` on standard error, or a call of the handler
+/// that `xos_HostSetAssertHandler` set.
 XOS_API void xos_Assert(int line, char const* module, char const* message);
 
 /* Configuration groups */
 
 struct cfg_Group;
+
+/// Loads the configuration group `name`. Stand-alone: the file `NAME.cfg` in the folder that `xos_HostSetConfigDir` set,
+/// else in that of `XOS_CONFIG`, else in "config" beneath the root. Lines are `key = value`; of several with one key the
+/// last counts. "#" at a line's start or behind white space begins a comment. Any other line is reported once on standard
+/// error, with file and line, and left out.
+/// \param name  a name and not a path
+/// \return the group, to be released by `cfg_GroupDelete`; null when there is none
 XOS_API struct cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2, int reserved3);
+
+/// Reads a switch: `true`, `yes`, `on`, `1` are 1 and `false`, `no`, `off`, `0` are 0, in any case.
+/// \return `fallback` where the group (or `group` itself) is missing the key, or its value is none of these, which is
+///         reported once on standard error
 XOS_API int cfg_KeyGetOpt_Bool(struct cfg_Group* group, char const* key, int fallback);
+
+/// Releases a group; nothing for null.
 XOS_API void cfg_GroupDelete(struct cfg_Group* group, int reserved);
 
 ZB_PLATFORM_C_END

@@ -8,8 +8,20 @@
 
 ZB_PLATFORM_C_BEGIN
 
-/// Fetches `url` into the file `target`. `first` and `second` are the user name and the password, or null.
-/// \return 0 for success
+/// Fetches `url` into the file `target`, which appears whole or stays as it was: the bytes go into a file beside it that is
+/// renamed at the end. A file that exists is replaced.
+///
+/// Stand-alone: `http`, `https` and `file` URLs. Up to 10 redirects are followed, to `http` and `https` only. `file` URLs
+/// name regular files of this machine, on Windows also `file://server/share/...`. Blanks and bytes above 126 in a URL
+/// count as their percent escapes. Proxies are the system's.
+/// \param first   the user name for the server that `url` names, or null; no other server gets it
+/// \param second  the password, or null
+/// \return 0 when the server answered with success (200 to 299) and the body arrived and could be stored
+/// \error an unknown scheme, nobody who answers within 30 s, any other status, a connection that falls silent for 60 s, a
+///        body shorter than announced, a target that cannot be written. Where no length is announced, WinHTTP takes what
+///        came before a lost connection for the whole.
+/// \thread any thread; the calling one waits
+/// \cost constant memory, whatever the length
 XOS_API int xos_URLGet(char const* url, char const* target, char const* first, char const* second);
 
 ZB_PLATFORM_C_END

@@ -4,6 +4,7 @@
 
 #include <curl/curl.h>
 #include <memory>
+#include <string_view>
 
 namespace host {
 
@@ -22,6 +23,17 @@ std::size_t takeBody(char* data, std::size_t unit, std::size_t count, void* sink
     return static_cast<BodySink*>(sink)->take(data, size) ? size : 0;
 }
 
+/// Notes whether the answer's head came to its end: a connection that is lost before counts as an empty answer here.
+std::size_t watchHead(char* line, std::size_t unit, std::size_t count, void* hasHead) {
+    std::string_view const text{line, unit * count};
+    if (text.substr(0, 5) == "HTTP/") {
+        *static_cast<bool*>(hasHead) = false;
+    } else if (text == "\r\n" || text == "\n") {
+        *static_cast<bool*>(hasHead) = true;
+    }
+    return text.size();
+}
+
 template <class Value>
 bool set(Handle const& handle, CURLoption option, Value value) {
     return curl_easy_setopt(handle.get(), option, value) == CURLE_OK;
@@ -33,7 +45,7 @@ bool setCredentials(Handle const& handle, FetchRequest const& request) {
            set(handle, CURLOPT_PASSWORD, request.password == nullptr ? "" : request.password);
 }
 
-bool prepare(Handle const& handle, FetchRequest const& request, BodySink& sink) {
+bool prepare(Handle const& handle, FetchRequest const& request, BodySink& sink, bool& hasHead) {
     return set(handle, CURLOPT_URL, request.url.c_str()) && set(handle, CURLOPT_NOSIGNAL, 1L) &&
            set(handle, CURLOPT_PROTOCOLS_STR, "http,https") && set(handle, CURLOPT_REDIR_PROTOCOLS_STR, "http,https") &&
            set(handle, CURLOPT_FOLLOWLOCATION, 1L) && set(handle, CURLOPT_MAXREDIRS, long{MOST_REDIRECTS}) &&
@@ -43,6 +55,7 @@ bool prepare(Handle const& handle, FetchRequest const& request, BodySink& sink) 
            set(handle, CURLOPT_LOW_SPEED_TIME, static_cast<long>(request.stallSeconds)) &&
            set(handle, CURLOPT_HTTPAUTH, static_cast<long>(CURLAUTH_ANY)) &&
            set(handle, CURLOPT_WRITEFUNCTION, takeBody) && set(handle, CURLOPT_WRITEDATA, &sink) &&
+           set(handle, CURLOPT_HEADERFUNCTION, watchHead) && set(handle, CURLOPT_HEADERDATA, &hasHead) &&
            setCredentials(handle, request);
 }
 
@@ -57,8 +70,9 @@ bool isGoodAnswer(Handle const& handle) {
 bool fetch(FetchRequest const& request, BodySink& sink) {
     if (!isReady()) { return false; }
     Handle const handle{curl_easy_init(), curl_easy_cleanup};
-    return handle != nullptr && prepare(handle, request, sink) && curl_easy_perform(handle.get()) == CURLE_OK &&
-           isGoodAnswer(handle);
+    bool hasHead = false;
+    return handle != nullptr && prepare(handle, request, sink, hasHead) &&
+           curl_easy_perform(handle.get()) == CURLE_OK && hasHead && isGoodAnswer(handle);
 }
 
 } // namespace host

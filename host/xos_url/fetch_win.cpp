@@ -3,8 +3,10 @@
 #include "host/windows_api.h"
 #include "host/xos_url/fetch.h"
 
+#include <cwchar>
 #include <memory>
 #include <optional>
+#include <shlwapi.h>
 #include <string>
 #include <vector>
 #include <winhttp.h>
@@ -56,8 +58,7 @@ void takeCredentials(FetchRequest const& request, URL_COMPONENTS const& parts, A
     }
 }
 
-std::optional<Address> addressOf(FetchRequest const& request) {
-    std::wstring url = wide(request.url, CP_UTF8);
+std::optional<Address> addressOf(std::wstring url, FetchRequest const& request) {
     url.resize(url.find(L'#') == std::wstring::npos ? url.size() : url.find(L'#'));
     URL_COMPONENTS parts{};
     parts.dwStructSize = sizeof parts;
@@ -95,8 +96,7 @@ Handle openRequest(HINTERNET connection, Address const& address) {
     Handle request{WinHttpOpenRequest(connection, L"GET", address.object.c_str(), nullptr, WINHTTP_NO_REFERER,
                                       WINHTTP_DEFAULT_ACCEPT_TYPES, address.isSecure ? WINHTTP_FLAG_SECURE : 0)};
     if (request != nullptr) {
-        setNumber(request.get(), WINHTTP_OPTION_REDIRECT_POLICY, WINHTTP_OPTION_REDIRECT_POLICY_ALWAYS);
-        setNumber(request.get(), WINHTTP_OPTION_MAX_HTTP_AUTOMATIC_REDIRECTS, MOST_REDIRECTS);
+        setNumber(request.get(), WINHTTP_OPTION_REDIRECT_POLICY, WINHTTP_OPTION_REDIRECT_POLICY_NEVER);
     }
     return request;
 }
@@ -137,14 +137,22 @@ DWORD exchangeWithCredentials(HINTERNET request, Address const& address) {
     return isAsked && giveCredentials(request, address) ? exchange(request) : status;
 }
 
-std::optional<std::uint64_t> announcedLength(HINTERNET request) {
-    wchar_t digits[32] = L"";
-    DWORD size = sizeof digits - sizeof(wchar_t);
-    if (WinHttpQueryHeaders(request, WINHTTP_QUERY_CONTENT_LENGTH, WINHTTP_HEADER_NAME_BY_INDEX, digits, &size,
+std::wstring header(HINTERNET request, DWORD which) {
+    DWORD size = 0;
+    WinHttpQueryHeaders(request, which, WINHTTP_HEADER_NAME_BY_INDEX, nullptr, &size, WINHTTP_NO_HEADER_INDEX);
+    std::wstring text(size / sizeof(wchar_t) + 1, L'\0');
+    size = static_cast<DWORD>(text.size() * sizeof(wchar_t));
+    if (WinHttpQueryHeaders(request, which, WINHTTP_HEADER_NAME_BY_INDEX, text.data(), &size,
                             WINHTTP_NO_HEADER_INDEX) == FALSE) {
-        return std::nullopt;
+        return {};
     }
-    return std::wcstoull(digits, nullptr, 10);
+    text.resize(size / sizeof(wchar_t));
+    return text;
+}
+
+std::optional<std::uint64_t> announcedLength(HINTERNET request) {
+    std::wstring const digits = header(request, WINHTTP_QUERY_CONTENT_LENGTH);
+    return digits.empty() ? std::nullopt : std::optional<std::uint64_t>{std::wcstoull(digits.c_str(), nullptr, 10)};
 }
 
 /// A connection that ends early reads like the end of the body, so the length is compared.
@@ -161,19 +169,59 @@ bool readBody(HINTERNET request, BodySink& sink) {
     }
 }
 
+bool leadsOn(DWORD status) {
+    constexpr DWORD PERMANENT_REDIRECT = 308; // as 301, and newer than some of the libraries
+    return status == HTTP_STATUS_MOVED || status == HTTP_STATUS_REDIRECT || status == HTTP_STATUS_REDIRECT_METHOD ||
+           status == HTTP_STATUS_REDIRECT_KEEP_VERB || status == PERMANENT_REDIRECT;
+}
+
+std::wstring combined(std::wstring const& base, std::wstring const& relative) {
+    constexpr DWORD LONGEST = 2083; // the system combines no longer ones
+    wchar_t url[LONGEST + 1] = L"";
+    DWORD size = LONGEST;
+    return SUCCEEDED(UrlCombineW(base.c_str(), relative.c_str(), url, &size, 0)) ? url : std::wstring{};
+}
+
+enum class Outcome { good, failed, leadsOn };
+
+/// \param url  where to ask; then, where the answer leads
+Outcome fetchOnce(HINTERNET session, FetchRequest const& wanted, std::wstring& url, BodySink& sink) {
+    std::optional<Address> const address = addressOf(url, wanted);
+    if (!address.has_value()) { return Outcome::failed; }
+    Handle const connection{WinHttpConnect(session, address->host.c_str(), address->port, 0)};
+    Handle const request = connection == nullptr ? Handle{} : openRequest(connection.get(), *address);
+    if (request == nullptr) { return Outcome::failed; }
+    DWORD const status = exchangeWithCredentials(request.get(), *address);
+    if (leadsOn(status)) {
+        std::wstring const location = header(request.get(), WINHTTP_QUERY_LOCATION);
+        url = combined(url, location);
+        return location.empty() ? Outcome::failed : Outcome::leadsOn;
+    }
+    return status >= 200 && status < 300 && readBody(request.get(), sink) ? Outcome::good : Outcome::failed;
+}
+
+bool isSameServer(std::wstring const& a, std::wstring const& b, FetchRequest const& request) {
+    std::optional<Address> const first = addressOf(a, request);
+    std::optional<Address> const second = addressOf(b, request);
+    return first.has_value() && second.has_value() && first->host == second->host && first->port == second->port;
+}
+
 } // namespace
 
 bool fetch(FetchRequest const& wanted, BodySink& sink) {
-    std::optional<Address> const address = addressOf(wanted);
-    if (!address.has_value()) { return false; }
     Handle const session = openSession(wanted);
-    if (session == nullptr) { return false; }
-    Handle const connection{WinHttpConnect(session.get(), address->host.c_str(), address->port, 0)};
-    if (connection == nullptr) { return false; }
-    Handle const request = openRequest(connection.get(), *address);
-    if (request == nullptr) { return false; }
-    DWORD const status = exchangeWithCredentials(request.get(), *address);
-    return status >= 200 && status < 300 && readBody(request.get(), sink);
+    FetchRequest request = wanted;
+    std::wstring url = wide(wanted.url, CP_UTF8);
+    Outcome outcome = session == nullptr ? Outcome::failed : Outcome::leadsOn;
+    for (std::uint32_t i = 0; i <= MOST_REDIRECTS && outcome == Outcome::leadsOn; ++i) {
+        std::wstring const asked = url;
+        outcome = fetchOnce(session.get(), request, url, sink);
+        if (outcome == Outcome::leadsOn && !isSameServer(asked, url, request)) {
+            // Name and password are for the server that was named, not for one to which it leads on.
+            request.user = nullptr;
+        }
+    }
+    return outcome == Outcome::good;
 }
 
 } // namespace host

@@ -33,11 +33,15 @@ bool copyBytes(std::FILE* from, TargetFile& to) {
     return std::ferror(from) == 0;
 }
 
+/// Closed when it returns: the source may be the target itself.
+bool readFile(FileUrl const& url, TargetFile& target) {
+    std::unique_ptr<std::FILE, int (*)(std::FILE*)> const source{openRegularFile(pathOfFileUrl(url)), std::fclose};
+    return source != nullptr && target.open() && copyBytes(source.get(), target);
+}
+
 bool getFile(char const* url, TargetFile& target) {
     std::optional<FileUrl> const parsed = parseFileUrl(url);
-    if (!parsed.has_value()) { return false; }
-    std::unique_ptr<std::FILE, int (*)(std::FILE*)> const source{openRegularFile(pathOfFileUrl(*parsed)), std::fclose};
-    return source != nullptr && target.open() && copyBytes(source.get(), target) && target.commit();
+    return parsed.has_value() && readFile(*parsed, target) && target.commit();
 }
 
 bool getOverHttp(FetchRequest const& request, TargetFile& target) {

@@ -24,9 +24,9 @@ namespace {
 constinit host::Setting directory{"XOS_CONFIG"};
 
 std::string configurationDirectory() {
-    std::string const set = directory.get();
+    std::string set = directory.get();
     if (!set.empty()) { return set; }
-    std::string const root = host::configuredRoot();
+    std::string root = host::configuredRoot();
     if (root.empty()) { return "config"; }
     bool const endsInSlash = root.back() == '/' || root.back() == '\\';
     return root + (endsInSlash ? "config" : "/config");

@@ -2,8 +2,10 @@
 /// What one thread remembers of its last call of each function, readable by others while it is written.
 ///
 /// Each thread writes its own records with plain stores: no two threads write one cache line and no instruction locks
-/// the bus. A reader retries while the sequence is odd or has changed. Every store of a payload releases and every load
-/// of it acquires, so a reader that sees a new payload also sees the odd sequence before it.
+/// the bus. A record has two slots, which calls use in turn, so that the last call stands still while the next one is
+/// noted, however long that takes. A reader begins anew when the next one has been completed meanwhile. Every store of a
+/// payload releases and every load of it acquires, so a reader that sees anything of a call also sees all calls before it
+/// completed.
 ///
 /// Records outlive their thread: the next new thread takes them over and counts on. Nothing a reader looks at is ever
 /// freed.
@@ -28,13 +30,20 @@ struct TextBuffer {
     std::atomic<std::uint64_t>* data;
 };
 
-struct CallRecord {
-    /// Twice the calls so far; odd while a call is noted.
-    std::atomic<std::uint64_t> sequence;
+struct CallSlot {
     std::array<std::atomic<std::uint64_t>, MAX_ARGUMENTS> words;
     /// When the call was made, where several threads call the function; 0 where one does.
     std::atomic<std::uint64_t> stamp;
     std::atomic<TextBuffer*> texts;
+    /// How many words of the texts the call uses.
+    std::atomic<std::uint64_t> textWords;
+};
+
+struct CallRecord {
+    /// How many calls have been noted.
+    std::atomic<std::uint64_t> completed;
+    /// The call that has number n, from 1 on, is in slot n modulo 2.
+    std::array<CallSlot, 2> slots;
 };
 
 struct Semaphore;
@@ -46,15 +55,15 @@ struct ThreadCalls {
     /// The thread's time as call_order.h counts it.
     std::atomic<std::uint64_t> time;
     std::array<CallRecord, FUNCTION_COUNT> records;
-    /// Sequences at the last reset. Under the registry's mutex, as are `next` and `inUse`.
-    std::array<std::uint64_t, FUNCTION_COUNT> sequenceAtReset;
+    /// How many calls had been noted at the last reset. Under the registry's mutex, as are `next` and `inUse`.
+    std::array<std::uint64_t, FUNCTION_COUNT> completedAtReset;
     /// The thread's store of semaphore blocks.
     Semaphore* freeSemaphores;
     std::uint32_t freeSemaphoreCount;
     ThreadCalls* next;
     bool inUse;
-    /// The text that `xos_HostLastCall` handed to this thread.
-    std::string lastCallText;
+    /// The text that `xos_HostLastCall` handed to this thread; null before.
+    std::string* lastCallText;
 };
 
 /// The calling thread's records; null before its first call and while it ends.
@@ -71,8 +80,8 @@ inline ThreadCalls& threadCalls() {
     return mine != nullptr ? *mine : *adoptThreadCalls();
 }
 
-/// Copies a text argument behind the `used` words of texts already in the record. \return the argument's word
-std::uint64_t keepText(CallRecord& record, char const* text, std::size_t& used);
+/// Copies a text argument behind the `used` words of texts already in the slot. \return the argument's word
+std::uint64_t keepText(CallSlot& slot, char const* text, std::size_t& used);
 
 /// The word of a null text.
 constexpr std::uint64_t NULL_TEXT = ~std::uint64_t{0};

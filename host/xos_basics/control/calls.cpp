@@ -12,13 +12,7 @@ namespace host {
 
 namespace {
 
-std::uint64_t callsSince(std::uint64_t sequence, std::uint64_t base) {
-    // An odd sequence is a call being noted, which may have been so at the reset already.
-    return sequence / 2 - base / 2;
-}
-
 struct Reading {
-    std::uint64_t sequence;
     std::uint64_t stamp;
     CallSnapshot call;
 };
@@ -35,29 +29,35 @@ bool textsAreWhole(char const* kinds, CallSnapshot const& call) {
     return true;
 }
 
-void copyTexts(CallRecord const& record, std::vector<std::uint64_t>& texts) {
-    TextBuffer const* const buffer = record.texts.load(std::memory_order_acquire);
+void copyTexts(CallSlot const& slot, std::vector<std::uint64_t>& texts) {
+    TextBuffer const* const buffer = slot.texts.load(std::memory_order_acquire);
+    std::uint64_t const used = slot.textWords.load(std::memory_order_acquire);
     texts.clear();
-    for (std::size_t i = 0; buffer != nullptr && i < buffer->words; ++i) {
+    for (std::size_t i = 0; buffer != nullptr && i < std::min<std::uint64_t>(used, buffer->words); ++i) {
         texts.push_back(buffer->data[i].load(std::memory_order_acquire));
     }
 }
 
+/// \return false: another call has been completed meanwhile, and one more may be written where this one stands
 bool tryRead(CallRecord const& record, char const* kinds, Reading& reading) {
-    reading.sequence = record.sequence.load(std::memory_order_acquire);
-    if (reading.sequence % 2 != 0) { return false; }
-    reading.stamp = record.stamp.load(std::memory_order_acquire);
+    std::uint64_t const number = record.completed.load(std::memory_order_acquire);
+    CallSlot const& slot = record.slots[number % 2];
+    reading.stamp = slot.stamp.load(std::memory_order_acquire);
     for (std::size_t i = 0; i < MAX_ARGUMENTS; ++i) {
-        reading.call.words[i] = record.words[i].load(std::memory_order_acquire);
+        reading.call.words[i] = slot.words[i].load(std::memory_order_acquire);
     }
-    if (std::strchr(kinds, 't') != nullptr) { copyTexts(record, reading.call.texts); }
-    return record.sequence.load(std::memory_order_relaxed) == reading.sequence && textsAreWhole(kinds, reading.call);
+    if (std::strchr(kinds, 't') != nullptr) { copyTexts(slot, reading.call.texts); }
+    return record.completed.load(std::memory_order_relaxed) == number && textsAreWhole(kinds, reading.call);
 }
 
 Reading readRecord(CallRecord const& record, char const* kinds) {
     Reading reading{};
     while (!tryRead(record, kinds, reading)) { pauseBriefly(); }
     return reading;
+}
+
+std::uint64_t callsSinceReset(ThreadCalls const& calls, std::size_t index) {
+    return calls.records[index].completed.load(std::memory_order_acquire) - calls.completedAtReset[index];
 }
 
 } // namespace
@@ -67,8 +67,7 @@ std::uint64_t callsOf(Function function) {
     std::lock_guard const lock{registryMutex};
     std::uint64_t sum = 0;
     for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) {
-        sum +=
-            callsSince(calls->records[index].sequence.load(std::memory_order_acquire), calls->sequenceAtReset[index]);
+        sum += callsSinceReset(*calls, index);
     }
     return sum;
 }
@@ -77,7 +76,7 @@ void resetCalls() {
     std::lock_guard const lock{registryMutex};
     for (ThreadCalls* calls = registryHead; calls != nullptr; calls = calls->next) {
         for (std::size_t i = 0; i < FUNCTION_COUNT; ++i) {
-            calls->sequenceAtReset[i] = calls->records[i].sequence.load(std::memory_order_acquire);
+            calls->completedAtReset[i] = calls->records[i].completed.load(std::memory_order_acquire);
         }
     }
 }
@@ -91,11 +90,9 @@ bool lastCallOf(Function function, std::string& text) {
     bool found = false;
     Reading last{};
     for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) {
-        if (calls == &spareThreadCalls) {
-            continue; // threads without memory for records of their own may write it together
-        }
+        // Threads without memory for records of their own may write the spare ones together.
+        if (calls == &spareThreadCalls || callsSinceReset(*calls, index) == 0) { continue; }
         Reading reading = readRecord(calls->records[index], kinds);
-        if (callsSince(reading.sequence, calls->sequenceAtReset[index]) == 0) { continue; }
         // Without stamps it was the sole caller's.
         if (!found || reading.stamp > last.stamp || (reading.stamp == last.stamp && calls == sole)) {
             last = std::move(reading);

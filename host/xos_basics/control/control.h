@@ -37,11 +37,11 @@ public:
     [[gnu::always_inline]] explicit CallNote(Function function) : CallNote(function, threadCalls()) {}
     CallNote(CallNote const&) = delete;
     CallNote& operator=(CallNote const&) = delete;
-    ~CallNote() { _record.sequence.store(_sequence + 2, std::memory_order_release); }
+    ~CallNote() { _record.completed.store(_number, std::memory_order_release); }
 
-    void addWord(std::uint64_t word) { _record.words[_arguments++].store(word, std::memory_order_release); }
+    void addWord(std::uint64_t word) { _slot.words[_arguments++].store(word, std::memory_order_release); }
 
-    void addText(char const* text) { addWord(keepText(_record, text, _textWords)); }
+    void addText(char const* text) { addWord(keepText(_slot, text, _textWords)); }
 
     template <class Argument>
     void add(Argument const& argument) {
@@ -58,14 +58,16 @@ public:
 
 private:
     [[gnu::always_inline]] CallNote(Function function, ThreadCalls& mine)
-        : _record(mine.records[indexOf(function)]), _sequence(_record.sequence.load(std::memory_order_relaxed)) {
-        _record.sequence.store(_sequence + 1, std::memory_order_relaxed);
+        : _record(mine.records[indexOf(function)]),
+          _number(_record.completed.load(std::memory_order_relaxed) + 1),
+          _slot(_record.slots[_number % 2]) {
         bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &mine;
-        _record.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
+        _slot.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
     }
 
     CallRecord& _record;
-    std::uint64_t const _sequence;
+    std::uint64_t const _number;
+    CallSlot& _slot;
     std::size_t _arguments{0};
     std::size_t _textWords{0};
 };

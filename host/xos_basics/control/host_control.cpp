@@ -5,6 +5,8 @@
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/control/faults.h"
 
+#include <string>
+
 namespace {
 
 /// Notes a call whose arguments come as words, texts by their address.
@@ -42,8 +44,9 @@ void xos_HostCallsReset(void) { host::resetCalls(); }
 
 char const* xos_HostLastCall(char const* name) {
     host::Function const function = host::functionNamed(name);
-    std::string& text = host::threadCalls().lastCallText;
-    return function != host::Function::none && host::lastCallOf(function, text) ? text.c_str() : nullptr;
+    std::string*& text = host::threadCalls().lastCallText;
+    if (text == nullptr) { text = new std::string; }
+    return function != host::Function::none && host::lastCallOf(function, *text) ? text->c_str() : nullptr;
 }
 
 int xos_HostEnter(char const* name, uint64_t const* arguments, uint32_t count) {

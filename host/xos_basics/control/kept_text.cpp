@@ -20,7 +20,7 @@ TextBuffer* largerBuffer(TextBuffer* older, std::size_t used, std::size_t needed
         delete buffer;
         return nullptr;
     }
-    for (std::size_t i = 0; i < used; ++i) {
+    for (std::size_t i = 0; older != nullptr && i < used; ++i) {
         buffer->data[i].store(older->data[i].load(std::memory_order_relaxed), std::memory_order_relaxed);
     }
     return buffer;
@@ -28,16 +28,16 @@ TextBuffer* largerBuffer(TextBuffer* older, std::size_t used, std::size_t needed
 
 } // namespace
 
-std::uint64_t keepText(CallRecord& record, char const* text, std::size_t& used) {
+std::uint64_t keepText(CallSlot& slot, char const* text, std::size_t& used) {
     if (text == nullptr) { return NULL_TEXT; }
     std::size_t const bytes = std::strlen(text) + 1;
     std::size_t const start = used;
     std::size_t const end = start + (bytes + WORD - 1) / WORD;
-    TextBuffer* buffer = record.texts.load(std::memory_order_relaxed);
+    TextBuffer* buffer = slot.texts.load(std::memory_order_relaxed);
     if (buffer == nullptr || buffer->words < end) {
         buffer = largerBuffer(buffer, start, end);
         if (buffer == nullptr) { return NULL_TEXT; }
-        record.texts.store(buffer, std::memory_order_release);
+        slot.texts.store(buffer, std::memory_order_release);
     }
     for (std::size_t i = start, done = 0; i < end; ++i, done += WORD) {
         std::uint64_t word = 0;
@@ -45,6 +45,7 @@ std::uint64_t keepText(CallRecord& record, char const* text, std::size_t& used) 
         buffer->data[i].store(word, std::memory_order_release);
     }
     used = end;
+    slot.textWords.store(end, std::memory_order_release);
     return start;
 }
 

@@ -5,6 +5,7 @@
 #include "host/xos_basics/directories/directory_chain_posix.h"
 #include "host/xos_basics/directories/dirents_posix.h"
 #include "host/xos_basics/directories/name_queue.h"
+#include "host/xos_basics/result.h"
 
 #include <climits>
 #include <sys/sysmacros.h>
@@ -145,7 +146,9 @@ bool TreeCopy::leave() {
 } // namespace
 
 bool copyTree(Descriptor from, struct stat const& fromStatus, Descriptor to, CopyRules rules) {
-    return std::make_unique<TreeCopy>(rules)->run(std::move(from), fromStatus, std::move(to));
+    // Told as any other failure, so that the caller can clear away what is there already.
+    return unlessMemoryLacks(
+        false, [&] { return std::make_unique<TreeCopy>(rules)->run(std::move(from), fromStatus, std::move(to)); });
 }
 
 bool copySpecial(int fromAt, char const* from, struct stat const& status, int toAt, char const* to, CopyRules rules) {

@@ -5,6 +5,7 @@
 #include "host/xos_basics/directories/directory_chain_posix.h"
 #include "host/xos_basics/directories/dirents_posix.h"
 #include "host/xos_basics/directories/name_queue.h"
+#include "host/xos_basics/result.h"
 
 #include <memory>
 #include <unistd.h>
@@ -120,7 +121,9 @@ bool TreeRemoval::removeUnentered(char const* name) {
 
 bool removeTree(int at, char const* name) {
     Descriptor directory{::fcntl(at, F_DUPFD_CLOEXEC, 0)};
-    return directory && std::make_unique_for_overwrite<TreeRemoval>()->run(std::move(directory), name);
+    return directory && unlessMemoryLacks(false, [&] {
+               return std::make_unique_for_overwrite<TreeRemoval>()->run(std::move(directory), name);
+           });
 }
 
 } // namespace host

@@ -3,6 +3,7 @@
 #include "host/xos_basics/directories/tree.h"
 
 #include "host/xos_basics/files/entry_win.h"
+#include "host/xos_basics/result.h"
 
 #include <cstring>
 #include <vector>
@@ -97,6 +98,10 @@ private:
     DWORD firstError_ = ERROR_SUCCESS;
 };
 
+bool removeTree(std::wstring const& top) {
+    return unlessMemoryLacks(false, [&] { return TreeRemoval{top}.run(); });
+}
+
 struct CopyRules {
     bool overwrite;
     bool recursive;
@@ -185,6 +190,11 @@ private:
     std::vector<bool> isNew_{rules_.unseen};
 };
 
+/// Lack of memory is told as any other failure, so that the caller can clear away what is there already.
+bool copyTree(std::wstring const& from, std::wstring const& to, CopyRules rules) {
+    return unlessMemoryLacks(false, [&] { return TreeCopy{from, to, rules}.run(); });
+}
+
 /// The physical path of a directory: no part of it is a link.
 bool physicalPath(std::wstring const& directory, std::wstring& physical) {
     Handle const entry{CreateFileW(directory.c_str(), FILE_READ_ATTRIBUTES,
@@ -221,9 +231,9 @@ bool copyToNewDirectory(std::wstring const& from, std::wstring const& to, CopyRu
     std::wstring const temporary = temporaryBeside(to);
     if (CreateDirectoryW(temporary.c_str(), nullptr) == 0) { return false; }
     rules.unseen = true;
-    if (TreeCopy{from, temporary, rules}.run() && renameEntry(temporary, to, false)) { return true; }
+    if (copyTree(from, temporary, rules) && renameEntry(temporary, to, false)) { return true; }
     KeepLastError const keep;
-    TreeRemoval{temporary}.run();
+    removeTree(temporary);
     return false;
 }
 
@@ -240,7 +250,7 @@ bool removeDirectory(char const* path, bool recursive) {
     if (!entryPath(path, full) || !factsOf(full, facts)) { return false; }
     if (facts.link) { return removeFileEntry(full); }
     if (!facts.isDirectory()) { return failWith(ERROR_DIRECTORY); }
-    return recursive ? TreeRemoval{full}.run() : removeEmptyDirectory(full);
+    return recursive ? removeTree(full) : removeEmptyDirectory(full);
 }
 
 bool copyDirectory(char const* dst, char const* src, bool overwrite, bool recursive) {
@@ -259,7 +269,7 @@ bool copyDirectory(char const* dst, char const* src, bool overwrite, bool recurs
         return isMissing() && isOutside(parentOf(to), source) && copyToNewDirectory(from, to, rules);
     }
     if ((present.information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) == 0) { return failWith(ERROR_DIRECTORY); }
-    return isOutside(to, source) && TreeCopy{from, to, rules}.run();
+    return isOutside(to, source) && copyTree(from, to, rules);
 }
 
 bool moveDirectory(char const* dst, char const* src, bool overwrite) {
@@ -279,7 +289,7 @@ bool moveDirectory(char const* dst, char const* src, bool overwrite) {
     std::wstring const aside = temporaryBeside(to);
     if (!renameEntry(to, aside, false)) { return false; }
     bool const moved = renameEntry(from, to, false);
-    if (moved && TreeRemoval{aside}.run()) { return true; }
+    if (moved && removeTree(aside)) { return true; }
     KeepLastError const keep;
     if (moved) { renameEntry(to, from, false); }
     renameEntry(aside, to, false);

@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <ctime>
 #include <fcntl.h>
+#include <new>
 #include <unistd.h>
 
 namespace host {
@@ -184,7 +185,8 @@ bool FileCopier::copyRange(int source, int copy, off_t size) {
 }
 
 bool FileCopier::copyByBuffer(int source, int copy, off_t size, off_t expected) {
-    if (buffer_ == nullptr) { buffer_.reset(new char[BUFFER_SIZE]); }
+    if (buffer_ == nullptr) { buffer_.reset(new (std::nothrow) char[BUFFER_SIZE]); }
+    if (buffer_ == nullptr) { return failWith(ENOMEM); }
     off_t done = 0;
     while (size < 0 || done < size) {
         std::size_t const most =

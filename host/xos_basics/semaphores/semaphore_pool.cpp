@@ -3,6 +3,7 @@
 #include "host/xos_basics/semaphores/semaphore.h"
 #include "host/xos_basics/wait/quick_mutex.h"
 
+#include <array>
 #include <mutex>
 #include <new>
 
@@ -13,8 +14,16 @@ namespace {
 /// Blocks move between a thread's own store and the common one by the batch.
 constexpr std::uint32_t BATCH = 16;
 
+/// Blocks that were made together. A handle hides its block's address from whoever looks for lost memory, so that all of
+/// them are kept in a list.
+struct Slab {
+    std::array<Semaphore, BATCH> blocks;
+    Slab* older;
+};
+
 constinit QuickMutex poolMutex;
 constinit Semaphore* pool = nullptr;
+constinit Slab* slabs = nullptr;
 
 void push(Semaphore*& list, Semaphore* semaphore) {
     semaphore->nextFree = list;
@@ -27,11 +36,15 @@ Semaphore* pop(Semaphore*& list) {
     return first;
 }
 
+/// \pre the mutex is held
 bool fillPool() {
     if (pool != nullptr) { return true; }
-    auto* const blocks = new (std::nothrow) Semaphore[BATCH]();
-    for (std::uint32_t i = 0; blocks != nullptr && i < BATCH; ++i) { push(pool, &blocks[i]); }
-    return blocks != nullptr;
+    auto* const slab = new (std::nothrow) Slab();
+    if (slab == nullptr) { return false; }
+    slab->older = slabs;
+    slabs = slab;
+    for (Semaphore& block : slab->blocks) { push(pool, &block); }
+    return true;
 }
 
 void refill(ThreadCalls& mine) {

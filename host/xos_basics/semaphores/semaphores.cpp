@@ -81,7 +81,7 @@ xos_Sem xos_SemBCreate(int available) {
 int xos_SemTake(xos_Sem sem) {
     if (failsNow(Function::xos_SemTake, sem)) { return host::FAILED; }
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return host::FAILED; }
+    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
     switch (semaphore->kind) {
     case host::SemaphoreKind::mutex:
         return takeMutex(*semaphore);
@@ -95,7 +95,7 @@ int xos_SemTake(xos_Sem sem) {
 int xos_SemGive(xos_Sem sem) {
     if (failsNow(Function::xos_SemGive, sem)) { return host::FAILED; }
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return host::FAILED; }
+    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
     switch (semaphore->kind) {
     case host::SemaphoreKind::mutex:
         return giveMutex(*semaphore);
@@ -109,7 +109,7 @@ int xos_SemGive(xos_Sem sem) {
 int xos_SemDestroy(xos_Sem sem) {
     if (failsNow(Function::xos_SemDestroy, sem)) { return host::FAILED; }
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return host::FAILED; }
+    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
     // A named mutex is the process's, not the caller's: others hold the same handle.
     if (semaphore->kind != host::SemaphoreKind::named) { host::freeSemaphore(semaphore); }
     return 0;

@@ -201,12 +201,8 @@ void runJob(Worker& worker, std::unique_ptr<QueuedJob> owned) {
 void runJobs(std::unique_ptr<QueuedJob> job) {
     Worker worker{};
     for (;;) {
-        if (job == nullptr) {
-            job = awaitJob(worker);
-        }
-        if (job == nullptr) {
-            return;
-        }
+        if (job == nullptr) { job = awaitJob(worker); }
+        if (job == nullptr) { return; }
         runJob(worker, std::move(job));
         job = nextOrReady();
     }

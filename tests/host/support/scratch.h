@@ -50,7 +50,8 @@ private:
 using Names = std::set<std::string>;
 
 inline void put(std::string const& path, std::string const& text) {
-    std::ofstream{path, std::ios::binary | std::ios::trunc}.write(text.data(), static_cast<std::streamsize>(text.size()));
+    std::ofstream{path, std::ios::binary | std::ios::trunc}.write(text.data(),
+                                                                  static_cast<std::streamsize>(text.size()));
 }
 
 inline std::string textOf(std::string const& path) {
@@ -58,9 +59,7 @@ inline std::string textOf(std::string const& path) {
     return {std::istreambuf_iterator<char>{file}, std::istreambuf_iterator<char>{}};
 }
 
-inline bool exists(std::string const& path) {
-    return std::filesystem::exists(std::filesystem::symlink_status(path));
-}
+inline bool exists(std::string const& path) { return std::filesystem::exists(std::filesystem::symlink_status(path)); }
 
 inline void makeFolder(std::string const& path) { std::filesystem::create_directories(path); }
 

@@ -1,0 +1,138 @@
+#include "zor_basis/files/dir.h"
+
+#include "basis/files/path_rules.h"
+#include "basis/files/platform_flags.h"
+#include "basis/files/system_calls.h"
+#include "zor_basis/files/f_stat.h"
+#include "zor_basis/files/wc_path.h"
+
+namespace ZOR_Basis {
+namespace {
+
+/// What stands in the way of a directory, or is one.
+enum class Place { FREE, DIRECTORY, BLOCKED };
+
+bool leadsToDirectory(char const* path) {
+    xos_Stat record{};
+    return systemCalls.statusOfTarget(path, record) && (record.st_mode_ & MODE_TYPE) == MODE_DIRECTORY;
+}
+
+/// Narrow paths: the platform layer makes directories.
+struct Narrow {
+    using Path = FPath;
+
+    static Place look(FPath const& path) {
+        FStat const entry(path.c_str());
+        if (entry.isDir()) return Place::DIRECTORY;
+        if (entry.isFile()) return Place::BLOCKED;
+        bool const link = entry.type() == FStat::ST_LINK && leadsToDirectory(path);
+        return link ? Place::DIRECTORY : Place::FREE;
+    }
+    static bool make(FPath const& path) { return xos_DirCreateEx(path, 0) == 0; }
+};
+
+/// Wide paths: the system makes them, and whatever exists and is no directory is in the way.
+struct Wide {
+    using Path = WcPath;
+
+    static Place look(WcPath const& path) {
+        FStat entry;
+        if (!entry.updateW(path)) return Place::FREE;
+        return entry.isDir() ? Place::DIRECTORY : Place::BLOCKED;
+    }
+    static bool make(WcPath const& path) { return systemCalls.makeDirectoryWide(path); }
+};
+
+template <class Kind>
+bool isOrBecomesDirectory(typename Kind::Path const& path, Place place) {
+    return place == Place::DIRECTORY || (place == Place::FREE && Kind::make(path));
+}
+
+/// Makes sure of a directory: itself if that can be, else after the one above it.
+template <class Kind>
+bool ensure(typename Kind::Path path) {
+    Place const place = Kind::look(path);
+    if (place == Place::BLOCKED) return false;
+    if (isOrBecomesDirectory<Kind>(path, place)) return true;
+    std::uint64_t const name = path.offsetName();
+    // Behind a slash at the very front is nothing more to cut.
+    if (name < 2) return false;
+    typename Kind::Path parent(path);
+    parent.cut(name - 1);
+    return ensure<Kind>(parent) && isOrBecomesDirectory<Kind>(path, Kind::look(path));
+}
+
+template <class Kind>
+bool newFor(typename Kind::Path parent) {
+    std::uint64_t const name = parent.offsetName();
+    if (name == 0) return false;
+    // kept dir-02: cutting before the first character is read as not cutting.
+    if (name > 1) parent.cut(name - 1);
+    return ensure<Kind>(parent);
+}
+
+template <class Kind>
+bool makeNew(typename Kind::Path const& path, bool makeParents) {
+    Place const place = Kind::look(path);
+    if (place != Place::FREE) return place == Place::DIRECTORY;
+    // kept dir-01: the parent of a bare name is the current directory, which nobody can make.
+    return (!makeParents || newFor<Kind>(path)) && Kind::make(path);
+}
+
+} // namespace
+
+bool Dir::Exist(char const* path) { return FStat::exist(path); }
+
+bool Dir::New(char const* path, bool makeParents) { return makeNew<Narrow>(path, makeParents); }
+bool Dir::NewFor(char const* path) { return newFor<Narrow>(path); }
+bool Dir::NewW(WChar const* path, bool makeParents) { return makeNew<Wide>(path, makeParents); }
+bool Dir::NewForW(WChar const* path) { return newFor<Wide>(path); }
+
+bool Dir::Rem(char const* path, bool recursive, bool flagB) {
+    FStat const entry(path);
+    if (!entry.exist()) return true;
+    if (entry.isFile()) return false;
+    return xos_DirRemove(path, REMOVE_ALWAYS | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
+}
+
+bool Dir::Copy(char const* dst, char const* src, bool recursive, bool overwrite, bool flagB) {
+    return xos_DirCopy(dst, src,
+                       flagIf(overwrite, OVERWRITE) | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
+}
+
+bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
+    std::uint32_t const flags = flagIf(overwrite, OVERWRITE) | flagIf(flagB, SECOND_FLAG);
+    if (xos_DirMove(dst, src, flags) == 0) return true;
+    bool const copied = xos_DirCopy(dst, src, flags | RECURSIVE) == 0;
+    // kept dir-03: who moves wants the source gone, and jobs are sent again rather than found twice.
+    Rem(src, true, flagB);
+    return copied;
+}
+
+bool Dir::Link(char const* dst, char const* src) { return xos_FileHardLink(src, dst) == 0; }
+
+bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
+    // kept dir-04: where only a first component could exist, there is nothing to split off.
+    constexpr std::uint64_t FIRST_INDEX = 1;
+    existing.clear();
+    rest.clear();
+    FPath const whole(path);
+    if (whole.size() < 3) return false;
+
+    // Existing components that end in a slash belong to the rest as a whole, without that slash.
+    std::uint64_t end = whole.size() - 1;
+    while (whole.isSlash(end) && FStat::exist(FPath(whole, end))) {
+        if (--end == FIRST_INDEX) return false;
+    }
+    for (std::uint64_t slash = end - 1; slash > FIRST_INDEX; --slash) {
+        if (!whole.isSlash(slash)) continue;
+        FPath const above(whole, slash);
+        if (!FStat::exist(above)) continue;
+        existing = above;
+        if (end > slash) rest = FPath(whole.c_str() + slash + 1, end - slash);
+        return true;
+    }
+    return false;
+}
+
+} // namespace ZOR_Basis

@@ -1,0 +1,94 @@
+#include "zor_basis/files/file.h"
+
+#include "basis/files/file_backends.h"
+#include "basis/files/platform_flags.h"
+#include "zor_basis/files/dir.h"
+#include "zor_basis/files/f_stat.h"
+
+#include <new>
+
+namespace ZOR_Basis {
+namespace {
+
+constexpr std::uint32_t WRITE_AND_CREATE = 0x54;
+
+IFile* makeBackend(char const* path, int mode, bool flag) {
+    if ((mode & File::FILE_CRT) == 0) {
+        return new (std::nothrow) FileXosBasics(path, flag ? mode | File::FILE_NOCREATEFLAG : mode);
+    }
+    if (flag) return new (std::nothrow) FileStdBuf(path, mode);
+    return new (std::nothrow) FileStdDir(path, mode);
+}
+
+bool remove(char const* path) { return xos_FileRemove(path, REMOVE_ALWAYS) == 0; }
+
+bool copy(char const* dst, char const* src, bool overwrite) { return xos_FileCopy(dst, src, overwrite ? 1 : 0) == 0; }
+
+bool removeEntry(char const* path, FStat const& entry) {
+    return entry.isDir() ? Dir::Rem(path, true, false) : remove(path);
+}
+
+} // namespace
+
+IFile::~IFile() = default;
+
+std::uint64_t IFile::getline(char*, std::uint64_t) { return 0; }
+
+bool File::attach(IFile* file) {
+    file_ = file;
+    return isOpen();
+}
+
+bool File::open(char const* path, int mode, bool flag) {
+    close();
+    return attach(makeBackend(path, mode, flag));
+}
+
+bool File::openW(WChar const* path, int mode) { return attach(new (std::nothrow) FileStdBuf(path, mode)); }
+
+void File::close() {
+    delete file_;
+    file_ = nullptr;
+}
+
+bool File::New(char const* path, bool makeDirs) {
+    FStat entry(path);
+    if (entry.isDir()) return false;
+    if (entry.isFile()) return true;
+    if (makeDirs && !Dir::NewFor(path)) return false;
+    xos_File const made = xos_FileOpen(path, WRITE_AND_CREATE);
+    if (made != 0) xos_FileCloseEx(made, 0);
+    entry.update(path);
+    return entry.isFile();
+}
+
+bool File::Rem(char const* path, bool flagA, bool flagB) {
+    return xos_FileRemove(path, flagIf(flagA, REMOVE_ALWAYS) | flagIf(flagB, SECOND_FLAG)) == 0;
+}
+
+bool File::Copy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
+    if (makeDirs && !Dir::NewFor(dst)) return false;
+    return copy(dst, src, overwrite);
+}
+
+bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs) {
+    if (makeDirs && !Dir::NewFor(dst)) return false;
+    if (xos_FileMove(dst, src, overwrite ? 1 : 0) == 0) return true;
+    bool const hasPlace = !makeDirs || Dir::NewFor(dst);
+    bool const copied = hasPlace && copy(dst, src, overwrite);
+    // kept file-04: who moves wants the source gone, and jobs are sent again rather than found twice.
+    remove(src);
+    return copied;
+}
+
+bool File::LinkOrCopy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
+    FStat const entry(dst);
+    if (entry.exist()) {
+        if (!overwrite || !removeEntry(dst, entry)) return false;
+    } else if (makeDirs && !Dir::NewFor(dst)) {
+        return false;
+    }
+    return Dir::Link(dst, src) || copy(dst, src, true);
+}
+
+} // namespace ZOR_Basis

@@ -1,0 +1,94 @@
+/// \file
+/// `PtrArray<T>`: a growable array of pointers that owns none of what they point to.
+///
+/// \thread  one thread at a time
+/// \error  memory that runs short ends the program
+
+#ifndef ZOR_BASIS_CONTAINERS_PTR_ARRAY_H
+#define ZOR_BASIS_CONTAINERS_PTR_ARRAY_H
+
+#include "zor_basis/text/char_ops.h"
+
+#include <cstdint>
+#include <cstdlib>
+#include <cstring>
+
+namespace ZOR_Basis {
+
+template <class T>
+class PtrArray {
+public:
+    /// An empty array with room for n pointers; 0 counts as 1.
+    PtrArray(std::uint64_t n = 8) { extend(n != 0 ? n : 1); }
+    PtrArray(PtrArray const& other) : PtrArray(other.capacity_) { copySlots(other); }
+    /// Holds the other's pointers afterwards, in a block of its own with at least the other's capacity.
+    PtrArray& operator=(PtrArray const& other) {
+        if (this == &other) return *this;
+        if (capacity_ < other.capacity_) {
+            std::free(slots_);
+            slots_ = makeSlots(capacity_ = other.capacity_);
+        } else {
+            std::memset(slots_, 0, count_ * sizeof(T*));
+        }
+        copySlots(other);
+        return *this;
+    }
+    /// Leaves what is pointed to alone.
+    ~PtrArray() { std::free(slots_); }
+
+    /// Appends a pointer. \return its index
+    std::uint64_t insertBack(T* pointer) {
+        if (count_ == capacity_) extend(2 * capacity_);
+        slots_[count_] = pointer;
+        return count_++;
+    }
+
+    /// Stores a pointer at an index; slots that are skipped are null.
+    void set(T* pointer, std::uint64_t index) {
+        if (index >= capacity_) extend(index + 1);
+        slots_[index] = pointer;
+        if (index >= count_) count_ = index + 1;
+    }
+
+    /// The pointer at an index; null at the size and beyond.
+    template <detail::Index I>
+    T* operator[](I index) const {
+        auto const i = static_cast<std::uint64_t>(index);
+        return i < count_ ? slots_[i] : nullptr;
+    }
+
+    /// One more than the highest index in use.
+    std::uint64_t size() const { return count_; }
+
+protected:
+    /// Makes room for n pointers, and for at least twice as many as before where that is not enough already.
+    void extend(std::uint64_t n) {
+        if (n <= capacity_) return;
+        std::uint64_t const capacity = n > 2 * capacity_ ? n : 2 * capacity_;
+        T** const slots = makeSlots(capacity);
+        if (count_ != 0) std::memcpy(slots, slots_, count_ * sizeof(T*));
+        std::free(slots_);
+        slots_ = slots;
+        capacity_ = capacity;
+    }
+
+    std::uint64_t capacity_ = 0;
+    std::uint64_t count_ = 0;
+    T** slots_ = nullptr;
+
+private:
+    static T** makeSlots(std::uint64_t n) {
+        T** const slots = static_cast<T**>(std::calloc(n, sizeof(T*)));
+        if (slots == nullptr) std::abort();
+        return slots;
+    }
+
+    void copySlots(PtrArray const& other) {
+        count_ = other.count_;
+        if (count_ != 0) std::memcpy(slots_, other.slots_, count_ * sizeof(T*));
+    }
+};
+
+} // namespace ZOR_Basis
+
+#endif

@@ -1,0 +1,261 @@
+/// \file
+/// `SngList<T>`: a singly linked list of units, each a link and a value.
+///
+/// The list owns its units: `new` makes them, `delete` ends them. A unit taken out (`take`, `takeFirst`) is the caller's,
+/// who gives it back to a list or deletes it; a unit put in is adopted. Positions are iterators, which remember the unit
+/// before their own so that they can remove and insert there; any other change of the list at their place makes them
+/// invalid.
+///
+/// Values need to be copied only by the members that copy, and compared (`<`) only by those that sort.
+///
+/// \thread  one thread at a time
+/// \error  memory that runs short when a unit is made comes out as `std::bad_alloc`
+
+#ifndef ZOR_BASIS_CONTAINERS_SNG_LIST_H
+#define ZOR_BASIS_CONTAINERS_SNG_LIST_H
+
+#include <algorithm>
+#include <cstdint>
+#include <cstdlib>
+#include <utility>
+
+namespace ZOR_Basis {
+
+template <class T>
+class SngList {
+public:
+    struct Unit {
+        Unit* next;
+        T value;
+    };
+
+    class iterator {
+    public:
+        iterator() = default;
+        T& operator*() const { return current_->value; }
+        T* operator->() const { return &current_->value; }
+        /// The unit itself; null at the end.
+        Unit* unit() const { return current_; }
+        iterator& operator++() {
+            previous_ = current_;
+            current_ = current_->next;
+            return *this;
+        }
+        bool operator==(iterator const& other) const { return current_ == other.current_; }
+        bool operator!=(iterator const& other) const { return current_ != other.current_; }
+
+    private:
+        friend SngList;
+        iterator(Unit* current, Unit* previous) : current_(current), previous_(previous) {}
+
+        Unit* current_ = nullptr;
+        Unit* previous_ = nullptr;
+    };
+
+    SngList() = default;
+    /// Adopts a chain as it is. \pre `first` leads to `last`, whose link is null, over `count` units
+    SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_(count) {}
+    /// Copies the values in their order.
+    SngList(SngList const& other) {
+        for (Unit* unit = other.first_; unit != nullptr; unit = unit->next) insertBack(unit->value);
+    }
+    SngList& operator=(SngList const& other) {
+        if (this != &other) {
+            SngList copy(other);
+            swap(copy);
+        }
+        return *this;
+    }
+    ~SngList() { clear(); }
+
+    /// Deletes all units, from the front.
+    void clear() {
+        while (first_ != nullptr) delete std::exchange(first_, first_->next);
+        last_ = nullptr;
+        count_ = 0;
+    }
+
+    /// The first and the last unit; null in an empty list.
+    Unit* first() const { return first_; }
+    Unit* last() const { return last_; }
+    std::uint64_t size() const { return count_; }
+    iterator begin() { return {first_, nullptr}; }
+    iterator end() { return {}; }
+
+    void insertFront(T const& value) { insertFront(new Unit{nullptr, value}); }
+    void insertFront(Unit* unit) {
+        unit->next = first_;
+        first_ = unit;
+        if (last_ == nullptr) last_ = unit;
+        ++count_;
+    }
+    void insertBack(T const& value) { insertBack(new Unit{nullptr, value}); }
+    void insertBack(Unit* unit) {
+        unit->next = nullptr;
+        (last_ != nullptr ? last_->next : first_) = unit;
+        last_ = unit;
+        ++count_;
+    }
+
+    /// Inserts behind the iterator's unit; at the end of the list, and for an iterator without a unit, appends.
+    void insertAfter(T const& value, iterator& place) { insertAfter(new Unit{nullptr, value}, place); }
+    void insertAfter(Unit* unit, iterator& place) {
+        if (place.current_ == nullptr || place.current_ == last_) {
+            insertBack(unit);
+        } else {
+            link(unit, place.current_);
+        }
+    }
+    /// Inserts before the iterator's unit, which stays its own; an iterator without a unit appends.
+    void insertBefore(T const& value, iterator& place) { insertBefore(new Unit{nullptr, value}, place); }
+    void insertBefore(Unit* unit, iterator& place) {
+        if (place.current_ == nullptr) {
+            insertBack(unit);
+            return;
+        }
+        if (place.current_ == first_) {
+            insertFront(unit);
+        } else {
+            link(unit, place.previous_);
+        }
+        place.previous_ = unit;
+    }
+
+    /// Deletes the iterator's unit and moves the iterator to the next one; nothing without a unit.
+    void remove(iterator& place) { delete take(place); }
+    /// Takes the iterator's unit out and moves the iterator on.
+    /// \return the unit with its value, now the caller's; null without a unit
+    Unit* take(iterator& place) {
+        if (place.current_ == nullptr) return nullptr;
+        Unit* const taken = unlink(place.previous_, place.current_);
+        place.current_ = taken->next;
+        taken->next = nullptr;
+        return taken;
+    }
+    /// The same for the first unit.
+    void removeFirst() { delete takeFirst(); }
+    Unit* takeFirst() {
+        if (first_ == nullptr) return nullptr;
+        Unit* const taken = unlink(nullptr, first_);
+        taken->next = nullptr;
+        return taken;
+    }
+
+    /// Turns the order round, in place.
+    void reverse() {
+        Unit* reversed = nullptr;
+        last_ = first_;
+        for (Unit* unit = first_; unit != nullptr;) {
+            Unit* const next = std::exchange(unit->next, reversed);
+            reversed = std::exchange(unit, next);
+        }
+        first_ = reversed;
+    }
+
+    /// Sorts by the links; values stay where they are. Equal values keep their order.
+    /// \kept list-01: except in a list of exactly two, which are swapped unless the first comes strictly before the
+    ///     second, so that two equal ones change places
+    /// \cost n log n comparisons, and for the time of the call one pointer a unit, where memory allows it
+    void sort(bool ascending) {
+        if (count_ < 2) return;
+        if (count_ == 2) {
+            // kept list-01: two units are compared once, and whatever is not less goes behind.
+            if (!comp(first_, last_, ascending)) reverse();
+        } else if (!sortGathered(ascending)) {
+            sortLinked(ascending);
+        }
+    }
+
+    /// Merges another sorted list into this sorted one; the other ends empty.
+    /// \kept list-02: of equal values the other list's comes first
+    void merge(SngList& other, bool ascending) {
+        if (this == &other || other.first_ == nullptr) return;
+        Unit* mine = first_;
+        Unit* theirs = other.first_;
+        Unit** link = &first_;
+        while (mine != nullptr && theirs != nullptr) {
+            // kept list-02: sorting merges the first half as the other list, and so keeps equal values in order.
+            Unit*& source = comp(mine, theirs, ascending) ? mine : theirs;
+            *link = source;
+            link = &source->next;
+            source = source->next;
+        }
+        *link = mine != nullptr ? mine : theirs;
+        if (theirs != nullptr) last_ = other.last_;
+        count_ += other.count_;
+        other.first_ = other.last_ = nullptr;
+        other.count_ = 0;
+    }
+
+    /// Whether a comes strictly before b.
+    static bool comp(Unit* a, Unit* b, bool ascending) { return ascending ? a->value < b->value : b->value < a->value; }
+
+    /// Whether links, tail and count agree. \cost a walk over all units
+    bool isConsistent() const {
+        std::uint64_t units = 0;
+        Unit const* tail = nullptr;
+        for (Unit const* unit = first_; unit != nullptr && units <= count_; unit = unit->next, ++units) tail = unit;
+        return units == count_ && tail == last_;
+    }
+
+private:
+    void swap(SngList& other) {
+        std::swap(first_, other.first_);
+        std::swap(last_, other.last_);
+        std::swap(count_, other.count_);
+    }
+
+    /// Puts a unit behind one that is not the last.
+    void link(Unit* unit, Unit* previous) {
+        unit->next = previous->next;
+        previous->next = unit;
+        ++count_;
+    }
+
+    Unit* unlink(Unit* previous, Unit* unit) {
+        (previous != nullptr ? previous->next : first_) = unit->next;
+        if (unit == last_) last_ = previous;
+        --count_;
+        return unit;
+    }
+
+    /// Sorts an array of the units and links them anew: neighbours in memory compare faster than links are followed.
+    /// \return false, with nothing changed, where there is no memory for the array
+    bool sortGathered(bool ascending) {
+        Unit** const units = static_cast<Unit**>(std::malloc(count_ * sizeof(Unit*)));
+        if (units == nullptr) return false;
+        Unit** end = units;
+        for (Unit* unit = first_; unit != nullptr; unit = unit->next) *end++ = unit;
+        if (ascending) {
+            std::stable_sort(units, end, [](Unit* a, Unit* b) { return comp(a, b, true); });
+        } else {
+            std::stable_sort(units, end, [](Unit* a, Unit* b) { return comp(a, b, false); });
+        }
+        for (Unit** unit = units; unit + 1 != end; ++unit) (*unit)->next = unit[1];
+        first_ = units[0];
+        last_ = end[-1];
+        last_->next = nullptr;
+        std::free(units);
+        return true;
+    }
+
+    void sortLinked(bool ascending) {
+        if (count_ < 2) return;
+        Unit* cut = first_;
+        for (std::uint64_t i = 1; i < count_ / 2; ++i) cut = cut->next;
+        SngList front(first_, cut, count_ / 2);
+        first_ = std::exchange(cut->next, nullptr);
+        count_ -= front.count_;
+        front.sortLinked(ascending);
+        sortLinked(ascending);
+        merge(front, ascending);
+    }
+
+    Unit* first_ = nullptr;
+    Unit* last_ = nullptr;
+    std::uint64_t count_ = 0;
+};
+
+} // namespace ZOR_Basis
+
+#endif

@@ -1,0 +1,29 @@
+/// \file
+/// `LookForType`: which entries a listing reports.
+
+#ifndef ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
+#define ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
+
+#include <cstdint>
+
+namespace ZOR_Basis {
+
+enum LookForType : std::uint32_t {
+    LOOK_ALL = 0,
+    LOOK_FILES = 1,
+    LOOK_DIRS = 2,
+    LOOK_BOTH = 3,    ///< the same as `LOOK_ALL`
+    LOOK_ANYCASE = 4, ///< may be added: the wildcard matches whatever the case of the letters, where a listing heeds it
+};
+
+constexpr LookForType operator|(LookForType a, LookForType b) {
+    return static_cast<LookForType>(static_cast<std::uint32_t>(a) | static_cast<std::uint32_t>(b));
+}
+constexpr LookForType operator&(LookForType a, LookForType b) {
+    return static_cast<LookForType>(static_cast<std::uint32_t>(a) & static_cast<std::uint32_t>(b));
+}
+constexpr LookForType& operator|=(LookForType& a, LookForType b) { return a = a | b; }
+
+} // namespace ZOR_Basis
+
+#endif

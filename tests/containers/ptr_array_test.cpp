@@ -1,0 +1,129 @@
+#include <zor_basis/containers/ptr_array.h>
+
+#include "tests/support/random_steps.h"
+
+#include <gtest/gtest.h>
+
+#include <vector>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+/// Shows the capacity.
+class Array : public PtrArray<int> {
+public:
+    using PtrArray::PtrArray;
+    std::uint64_t capacity() const { return capacity_; }
+};
+
+int values[64];
+
+} // namespace
+
+TEST(PtrArray, breathes) {
+    PtrArray<int> array;
+    EXPECT_EQ(array.size(), 0u);
+    EXPECT_EQ(array[0], nullptr);
+    EXPECT_EQ(array.insertBack(&values[1]), 0u);
+    EXPECT_EQ(array.insertBack(&values[2]), 1u);
+    EXPECT_EQ(array[0], &values[1]);
+    EXPECT_EQ(array[1u], &values[2]);
+    EXPECT_EQ(array[2], nullptr) << "below the capacity, and not in use";
+    EXPECT_EQ(array[1000], nullptr);
+    EXPECT_EQ(array.size(), 2u);
+}
+
+TEST(PtrArray, at_least_doubles_when_it_grows) {
+    Array array;
+    EXPECT_EQ(array.capacity(), 8u);
+    for (int i = 0; i < 8; ++i) array.insertBack(&values[i]);
+    EXPECT_EQ(array.capacity(), 8u);
+    array.insertBack(&values[8]);
+    EXPECT_EQ(array.capacity(), 16u);
+    for (int i = 0; i < 9; ++i) EXPECT_EQ(array[i], &values[i]);
+    array.set(&values[9], 16);
+    EXPECT_EQ(array.capacity(), 32u) << "one more is asked for, twice as many come";
+}
+
+TEST(PtrArray, leaves_skipped_slots_null) {
+    Array array;
+    array.set(&values[0], 20);
+    EXPECT_EQ(array.capacity(), 21u);
+    EXPECT_EQ(array.size(), 21u);
+    for (int i = 0; i < 20; ++i) EXPECT_EQ(array[i], nullptr);
+    EXPECT_EQ(array[20], &values[0]);
+    array.set(&values[1], 3);
+    EXPECT_EQ(array.size(), 21u);
+    EXPECT_EQ(array[3], &values[1]);
+    EXPECT_EQ(array.insertBack(&values[2]), 21u);
+    EXPECT_EQ(array.capacity(), 42u);
+}
+
+TEST(PtrArray, takes_a_capacity_of_0_for_1) {
+    Array array(0);
+    EXPECT_EQ(array.capacity(), 1u);
+    array.insertBack(&values[0]);
+    array.insertBack(&values[1]);
+    EXPECT_EQ(array.capacity(), 2u);
+    EXPECT_EQ(array[1], &values[1]);
+}
+
+TEST(PtrArray, copies_the_slots_into_a_block_of_its_own) {
+    Array source(4);
+    for (int i = 0; i < 3; ++i) source.insertBack(&values[i]);
+    Array target;
+    for (int i = 0; i < 8; ++i) target.insertBack(&values[63]);
+    target = source;
+    EXPECT_EQ(target.size(), 3u);
+    for (int i = 0; i < 3; ++i) EXPECT_EQ(target[i], &values[i]);
+    target.set(&values[9], 5);
+    EXPECT_EQ(target[3], nullptr) << "what was there before is gone";
+    EXPECT_EQ(source.size(), 3u);
+    source.insertBack(&values[7]);
+    source.insertBack(&values[8]); // grows, and frees its old block
+    EXPECT_EQ(target[0], &values[0]);
+
+    Array large;
+    large.set(&values[1], 40);
+    target = large;
+    EXPECT_EQ(target.size(), 41u);
+    EXPECT_EQ(target[40], &values[1]);
+    Array const& self = target;
+    target = self;
+    EXPECT_EQ(target[40], &values[1]);
+    Array const copy(target);
+    EXPECT_EQ(copy[40], &values[1]);
+}
+
+TEST(PtrArrayModel, stays_what_a_plain_vector_is) {
+    std::mt19937_64 random = randomSource();
+    Array array(random() % 3);
+    std::vector<int*> model;
+    for (std::uint64_t step = randomSteps(100'000); step > 0; --step) {
+        int* const pointer = random() % 5 == 0 ? nullptr : &values[random() % 64];
+        std::uint64_t const capacity = array.capacity();
+        switch (random() % 3) {
+        case 0:
+            ASSERT_EQ(array.insertBack(pointer), model.size());
+            model.push_back(pointer);
+            break;
+        case 1: {
+            std::uint64_t const index = random() % 40;
+            array.set(pointer, index);
+            if (index >= model.size()) model.resize(index + 1);
+            model[index] = pointer;
+            break;
+        }
+        default:
+            if (random() % 20 == 0) {
+                array = Array(random() % 20);
+                model.clear();
+            }
+        }
+        ASSERT_TRUE(array.capacity() == capacity || array.capacity() >= 2 * capacity);
+        ASSERT_EQ(array.size(), model.size());
+        std::uint64_t const index = random() % (model.size() + 5);
+        ASSERT_EQ(array[index], index < model.size() ? model[index] : nullptr);
+    }
+}
