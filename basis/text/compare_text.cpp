@@ -78,6 +78,13 @@ ZB_COLD int orderByRuntime(char const* a, char const* b) noexcept {
     return std::strcmp(textOrEmpty(a), textOrEmpty(b));
 }
 
+/// Of texts that are equal so far and have not ended.
+inline int orderAtTheEnd(char const* a, char const* b) noexcept {
+    if (*a == *b && *a != '\0') [[unlikely]]
+        return orderByRuntime(a, b);
+    return orderAt(a, b, 0);
+}
+
 #if ZB_WIDE_VECTOR_TEXT
 
 constexpr std::uint64_t Undecided = std::numeric_limits<std::uint64_t>::max();
@@ -114,7 +121,7 @@ ZB_AVX2 ZB_COLD bool sameLongTexts(char const* a, char const* b, std::uint64_t l
     return place == Undecided || a[place] == b[place];
 }
 
-/// The same for texts that are likely to end there.
+/// The same, and how texts compare that are likely to end there.
 template <class Text>
 ZB_AVX2 ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
     for (; length > 64; a += 64, b += 64, length -= 64) {
@@ -122,13 +129,13 @@ ZB_AVX2 ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t
         std::uint64_t const place = decisionIn(a, b, 32);
         if (place != Undecided) return orderAt(a, b, place);
     }
-    if (length == 0 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
+    if (!Text::readable(a, b, length)) return orderByRuntime(a, b);
     std::uint64_t const back = length < 32 ? 32 - length : 0;
     a -= back;
     b -= back;
     std::uint64_t const second = length + back - 32;
     std::uint64_t const place = decisionIn(a, b, second);
-    return place != Undecided ? orderAt(a, b, place) : orderByRuntime(a + second + 32, b + second + 32);
+    return place != Undecided ? orderAt(a, b, place) : orderAtTheEnd(a + second + 32, b + second + 32);
 }
 
 #endif
@@ -149,26 +156,26 @@ bool same(char const* a, char const* b, std::uint64_t length) noexcept {
 
 template <class Text>
 int order(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
-    std::uint64_t const last = std::min(aSize, bSize); // where the shorter one ends
-    std::uint64_t const length = last + 1;
+    std::uint64_t const length = std::min(aSize, bSize); // where the shorter one is likely to end
 #if ZB_WIDE_VECTOR_TEXT
-    if (last >= 32 && __builtin_cpu_supports("avx2")) return orderOfLongTexts<Text>(a, b, length);
+    if (length > 32 && __builtin_cpu_supports("avx2")) return orderOfLongTexts<Text>(a, b, length);
 #endif
-    if (last >= 32 || length < 4 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
-    std::uint64_t first;
-    std::uint64_t front;
+    if (length > 32 || length < 4 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
+    Places<std::uint32_t> places;
+    std::uint64_t front; // places from the first end of the texts
     if (length > 16) {
-        first = placesOfTwo(a, b, length).first();
+        places = placesOfTwo(a, b, length);
         front = 16;
     } else if (length >= 8) [[likely]] {
-        first = placesOf(ends8To16(a, length), ends8To16(b, length)).first();
+        places = placesOf(ends8To16(a, length), ends8To16(b, length));
         front = 8;
     } else {
-        first = placesOf(ends4To7(a, length), ends4To7(b, length)).first();
+        places = placesOf(ends4To7(a, length), ends4To7(b, length));
+        places.decided &= 0xFFU;
         front = 4;
     }
-    if (first >= 2 * front) [[unlikely]]
-        return orderByRuntime(a + length, b + length);
+    if (places.decided == 0) return orderAtTheEnd(a + length, b + length);
+    std::uint64_t const first = places.first();
     return orderAt(a, b, first < front ? first : length - 2 * front + first);
 }
 

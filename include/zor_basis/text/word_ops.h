@@ -172,17 +172,19 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
 
 /// -1, 0 or 1; both texts have a terminator at their size.
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
-    std::uint64_t const length = (aSize < bSize ? aSize : bSize) + 1;
+    std::uint64_t const length = aSize < bSize ? aSize : bSize;
     if (WordsBeginLow && length >= 4 && length <= 16) {
-        if (length < 8) {
-            WordPair const both(loadEnds(a, length), loadEnds(b, length));
-            if (both.decided != 0) return both.order();
-        } else {
-            WordPair const head(loadWord<std::uint64_t>(a), loadWord<std::uint64_t>(b));
-            if (head.decided != 0) return head.order();
+        bool const one = length < 8;
+        WordPair const head(one ? loadEnds(a, length) : loadWord<std::uint64_t>(a),
+                            one ? loadEnds(b, length) : loadWord<std::uint64_t>(b));
+        if (head.decided != 0) return head.order();
+        if (!one) {
             WordPair const tail(loadWord<std::uint64_t>(a + length - 8), loadWord<std::uint64_t>(b + length - 8));
             if (tail.decided != 0) return tail.order();
         }
+        auto const left = static_cast<unsigned char>(a[length]);
+        auto const right = static_cast<unsigned char>(b[length]);
+        if (left != right || left == 0) return (left > right) - (left < right);
     }
     int const order = compareOwnedTexts(a, aSize, b, bSize);
     return (order > 0) - (order < 0);
