@@ -129,7 +129,7 @@ bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
         FPath const above(whole, slash);
         if (!FStat::exist(above)) continue;
         existing = above;
-        if (end > slash) rest = FPath(whole.c_str() + slash + 1, end - slash);
+        rest = FPath(whole.c_str() + slash + 1, end - slash);
         return true;
     }
     return false;

@@ -43,14 +43,17 @@ public:
     bool isDir() override { return !isFile(); }
     bool isFile() override {
         switch (entry_->d_type) {
-        case DT_DIR: return false;
+        case DT_DIR:
+            return false;
         case DT_LNK:
-        case DT_UNKNOWN: return !S_ISDIR(status().st_mode);
-        default: return true;
+        case DT_UNKNOWN:
+            return !S_ISDIR(status().st_mode);
+        default:
+            return true;
         }
     }
     std::int64_t time() override { return status().st_mtim.tv_sec; }
-    std::uint64_t size() override { return static_cast<std::uint64_t>(status().st_size); }
+    std::uint64_t size() override { return isFile() ? static_cast<std::uint64_t>(status().st_size) : 0; }
 
 private:
     void start() {
@@ -79,7 +82,8 @@ private:
     }
 
     bool end() {
-        if (lastError_ == 0) lastError_ = errno != 0 ? systemCalls.lastError() : anyFits_ ? NO_MORE_FILES : FILE_NOT_FOUND;
+        if (lastError_ == 0)
+            lastError_ = errno != 0 ? systemCalls.lastError() : anyFits_ ? NO_MORE_FILES : FILE_NOT_FOUND;
         return false;
     }
 

@@ -28,9 +28,12 @@ void DirIterImplW::removeWildCard() {
 
 bool DirIterImplW::isWanted(bool isDirectory) const {
     switch (type_ & LOOK_BOTH) {
-    case LOOK_FILES: return !isDirectory;
-    case LOOK_DIRS: return isDirectory;
-    default: return true;
+    case LOOK_FILES:
+        return !isDirectory;
+    case LOOK_DIRS:
+        return isDirectory;
+    default:
+        return true;
     }
 }
 

@@ -13,10 +13,14 @@ constexpr std::int32_t MOST_DENIALS = 5;
 
 FStat::StatMode kindOf(std::uint32_t mode) {
     switch (mode & MODE_TYPE) {
-    case MODE_FILE: return FStat::ST_FILE;
-    case MODE_DIRECTORY: return FStat::ST_DIR;
-    case MODE_LINK: return FStat::ST_LINK;
-    default: return FStat::ST_OTHER;
+    case MODE_FILE:
+        return FStat::ST_FILE;
+    case MODE_DIRECTORY:
+        return FStat::ST_DIR;
+    case MODE_LINK:
+        return FStat::ST_LINK;
+    default:
+        return FStat::ST_OTHER;
     }
 }
 
@@ -25,13 +29,17 @@ class Retries {
 public:
     bool mayGoOn(std::uint32_t error) {
         switch (error) {
-        case NETWORK_NAME_GONE: break;
+        case NETWORK_NAME_GONE:
+            break;
         case LOGON_FAILURE:
             ++logonFailures_;
             if (systemCalls.tick() - start_ > LONGEST_LOGON_MS) return false;
             break;
-        case ACCESS_DENIED: ++denials_; break;
-        default: return false;
+        case ACCESS_DENIED:
+            ++denials_;
+            break;
+        default:
+            return false;
         }
         return attempts_ - denials_ - logonFailures_ <= MOST_ATTEMPTS && logonFailures_ <= MOST_LOGON_FAILURES &&
                denials_ <= MOST_DENIALS;

@@ -44,6 +44,7 @@ bool File::open(char const* path, int mode, bool flag) {
     return attach(makeBackend(path, mode, flag));
 }
 
+// kept file-05: the handle is closed beforehand, by agreement.
 bool File::openW(WChar const* path, int mode) { return attach(new (std::nothrow) FileStdBuf(path, mode)); }
 
 void File::close() {

@@ -2,6 +2,7 @@
 
 #include "basis/files/file_backends.h"
 #include "basis/files/os_path_posix.h"
+#include "basis/files/pieces.h"
 #include "zor_basis/files/file.h"
 
 #include <fcntl.h>
@@ -34,11 +35,13 @@ FileStdDir::~FileStdDir() {
 
 // kept file-01: the runtime's -1 comes out as it is, as all ones.
 std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
-    return static_cast<std::uint64_t>(::read(descriptor_, buffer, n));
+    return inPieces(static_cast<char*>(buffer), n,
+                    [this](char* to, unsigned piece) { return ::read(descriptor_, to, piece); });
 }
 
 std::uint64_t FileStdDir::write(void const* buffer, std::uint64_t n) {
-    return static_cast<std::uint64_t>(::write(descriptor_, buffer, n));
+    return inPieces(static_cast<char const*>(buffer), n,
+                    [this](char const* from, unsigned piece) { return ::write(descriptor_, from, piece); });
 }
 
 bool FileStdDir::flush() { return ::fsync(descriptor_) == 0; }

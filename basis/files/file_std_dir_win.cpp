@@ -1,6 +1,7 @@
 // The sibling is file_std_dir_posix.cpp.
 
 #include "basis/files/file_backends.h"
+#include "basis/files/pieces.h"
 #include "zor_basis/files/file.h"
 
 #include <fcntl.h>
@@ -10,9 +11,6 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr int OWNER_READS_AND_WRITES = 0x180;
-constexpr std::uint64_t FAILED = ~std::uint64_t{0};
-/// What the runtime transfers at once, at most.
-constexpr std::uint64_t LARGEST_PIECE = 0x40000000;
 
 int flagsOf(int mode) {
     int flags = (mode & File::FILE_WRITE) != 0 ? _O_CREAT | _O_RDWR : _O_RDONLY;
@@ -21,20 +19,6 @@ int flagsOf(int mode) {
     flags |= (mode & File::FILE_BINARY) != 0 ? _O_BINARY : _O_TEXT;
     flags |= (mode & File::FILE_SEQUENTIAL) != 0 ? _O_SEQUENTIAL : _O_RANDOM;
     return flags;
-}
-
-/// Transfers in pieces that the runtime can count. \return the bytes transferred, all ones if the first piece failed
-template <class Byte, class Transfer>
-std::uint64_t inPieces(Byte* buffer, std::uint64_t n, Transfer transfer) {
-    std::uint64_t done = 0;
-    do {
-        std::uint64_t const piece = n - done < LARGEST_PIECE ? n - done : LARGEST_PIECE;
-        int const moved = transfer(buffer + done, static_cast<unsigned>(piece));
-        if (moved < 0) return done != 0 ? done : FAILED;
-        done += static_cast<unsigned>(moved);
-        if (static_cast<unsigned>(moved) != piece) break;
-    } while (done < n);
-    return done;
 }
 
 } // namespace
@@ -49,13 +33,13 @@ FileStdDir::~FileStdDir() {
 // kept file-01: the runtime's -1 comes out as it is, as all ones. No descriptor is never handed to the runtime, which
 // may end the process for it.
 std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
-    if (descriptor_ == -1) return FAILED;
+    if (descriptor_ == -1) return TRANSFER_FAILED;
     return inPieces(static_cast<char*>(buffer), n,
                     [this](char* to, unsigned piece) { return ::_read(descriptor_, to, piece); });
 }
 
 std::uint64_t FileStdDir::write(void const* buffer, std::uint64_t n) {
-    if (descriptor_ == -1) return FAILED;
+    if (descriptor_ == -1) return TRANSFER_FAILED;
     return inPieces(static_cast<char const*>(buffer), n,
                     [this](char const* from, unsigned piece) { return ::_write(descriptor_, from, piece); });
 }

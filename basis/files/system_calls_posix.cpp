@@ -57,10 +57,14 @@ std::FILE* openStreamWide(WChar const* path, char const* mode) { return std::fop
 
 std::uint32_t lastError() {
     switch (errno) {
-    case 0: return NO_ERROR_YET;
-    case ENOENT: return FILE_NOT_FOUND;
-    case ENOTDIR: return PATH_NOT_FOUND;
-    case EACCES: return ACCESS_DENIED;
+    case 0:
+        return NO_ERROR_YET;
+    case ENOENT:
+        return FILE_NOT_FOUND;
+    case ENOTDIR:
+        return PATH_NOT_FOUND;
+    case EACCES:
+        return ACCESS_DENIED;
     case ESTALE:
     case EHOSTDOWN:
     case EHOSTUNREACH:
@@ -68,12 +72,15 @@ std::uint32_t lastError() {
     case ENETUNREACH:
     case ENETRESET:
     case ENOLINK:
-    case EREMOTEIO: return NETWORK_NAME_GONE;
+    case EREMOTEIO:
+        return NETWORK_NAME_GONE;
     case EKEYREJECTED:
     case EKEYEXPIRED:
     case EKEYREVOKED:
-    case ENOKEY: return LOGON_FAILURE;
-    default: return GENERAL_FAILURE;
+    case ENOKEY:
+        return LOGON_FAILURE;
+    default:
+        return GENERAL_FAILURE;
     }
 }
 
@@ -90,7 +97,7 @@ std::uint64_t tick() {
 
 } // namespace
 
-SystemCalls systemCalls{status,     statusOfTarget, statusWide, makeDirectoryWide, openStream,
-                        openStreamWide, lastError,      sleepMs,    tick};
+SystemCalls systemCalls{status,    statusOfTarget, statusWide, makeDirectoryWide, openStream, openStreamWide,
+                        lastError, sleepMs,        tick};
 
 } // namespace ZOR_Basis

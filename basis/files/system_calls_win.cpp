@@ -59,7 +59,7 @@ std::uint64_t tick() { return GetTickCount64(); }
 
 } // namespace
 
-SystemCalls systemCalls{status,         status,    statusWide, makeDirectoryWide, openStream,
-                        openStreamWide, lastError, sleepMs,    tick};
+SystemCalls systemCalls{status,    status,  statusWide, makeDirectoryWide, openStream, openStreamWide,
+                        lastError, sleepMs, tick};
 
 } // namespace ZOR_Basis

@@ -1,9 +1,10 @@
 /// \file
-/// Lists, pointer arrays, hashed texts, and the integer helpers that size their tables.
+/// Lists, pointer arrays, the dictionary and its file, hashed texts, and the integer helpers that size their tables.
 
 #ifndef ZOR_BASIS_CONTAINERS_H
 #define ZOR_BASIS_CONTAINERS_H
 
+#include "zor_basis/containers/dict.h"
 #include "zor_basis/containers/hashed_str.h"
 #include "zor_basis/containers/hashing.h"
 #include "zor_basis/containers/ptr_array.h"

@@ -1,6 +1,6 @@
 /// \file
 /// Text: views (`Str`, `WStr`, `WFxStr`), strings that keep short text inside the object (`BufStr`, `WBStr`), exact heap
-/// strings (`HeapStr`), and buffers for calls that fill them (`Auto_ptr_CStr`).
+/// strings (`HeapStr`), and buffers for calls that fill them (`Auto_ptr_CStr`). Bytes: `Blob`, `SecretBlob`.
 ///
 /// Narrow text is a sequence of bytes, wide text one of 16-bit code units. Views never copy; strings always do, and
 /// copying a string copies its text. Nothing here is synchronised: an object belongs to one thread at a time.
@@ -9,6 +9,7 @@
 #define ZOR_BASIS_TEXT_H
 
 #include "zor_basis/text/auto_ptr_cstr.h"
+#include "zor_basis/text/blob.h"
 #include "zor_basis/text/buf_str.h"
 #include "zor_basis/text/convert.h"
 #include "zor_basis/text/heap_str.h"

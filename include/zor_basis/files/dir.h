@@ -35,7 +35,8 @@ public:
     /// \cost tries from the deepest directory upwards and then makes them downwards
     static bool NewFor(char const* path);
 
-    /// The same by wide paths, through the system instead of the platform layer.
+    /// The same by wide paths, through the system instead of the platform layer; whatever exists and is no directory is in
+    /// the way. Under Windows parents that are followed by two slashes are not found.
     static bool NewW(WChar const* path, bool makeParents);
     static bool NewForW(WChar const* path);
 

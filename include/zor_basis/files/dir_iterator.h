@@ -42,7 +42,7 @@ public:
     virtual bool isFile() = 0;
     /// Last write, seconds since 1970 UTC.
     virtual std::int64_t time() = 0;
-    /// Bytes.
+    /// Bytes; 0 for a directory.
     virtual std::uint64_t size() = 0;
     /// @}
 

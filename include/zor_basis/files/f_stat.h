@@ -50,9 +50,9 @@ public:
     ///
     /// | last error | given up |
     /// |---|---|
-    /// | 64, the network name is gone | after 5 tries that failed so, beyond those for the other two reasons |
-    /// | 1326, logon failure | after 100 of them, or two minutes |
-    /// | 5, access denied | after 5 of them |
+    /// | 64, the network name is gone | when more than 5 further tries have failed so |
+    /// | 1326, logon failure | at the 101st, or at one that comes more than two minutes after the first failure |
+    /// | 5, access denied | at the sixth |
     /// | any other | at once |
     ///
     /// On Linux ESTALE and the errors of unreachable hosts and networks stand for 64, EKEYREJECTED and its like for

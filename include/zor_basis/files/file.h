@@ -59,7 +59,8 @@ public:
     /// \return whether the file is open
     bool open(char const* path, int mode, bool flag = false);
     /// Opens a stream by a wide path.
-    /// \pre nothing is held: unlike `open` this does not close it, and it would be lost
+    /// \kept file-05: unlike `open` this does not close what is held, which then belongs to whoever has its pointer
+    /// \pre nothing is held, or the caller has taken its `ptr()` to delete it
     bool openW(WChar const* path, int mode);
     /// Closes what is held, if anything.
     void close();

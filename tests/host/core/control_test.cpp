@@ -4,8 +4,8 @@
 #include "basis/platform/xos_basics.h"
 #include "basis/platform/xos_url.h"
 #include "tests/host/support/child.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/support/system_error.h"
+#include "tests/support/scratch.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>

@@ -4,7 +4,7 @@
 #include "basis/platform/hq_basis.h"
 #include "basis/platform/xos_basics.h"
 #include "host/include/xos_host.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <chrono>
 #include <cstdio>

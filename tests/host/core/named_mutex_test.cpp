@@ -1,7 +1,7 @@
 #include "basis/platform/xos_basics.h"
 #include "tests/host/core/thread_facts.h"
 #include "tests/host/support/child.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

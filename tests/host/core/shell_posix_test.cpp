@@ -1,7 +1,7 @@
 // What the command interpreter of this system alone can show.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

@@ -1,7 +1,7 @@
 // Trees deeper than any path can say, with few descriptors.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,6 @@
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/support/system_error.h"
+#include "tests/support/scratch.h"
 #include "xos_host.h"
 
 #include <gtest/gtest.h>

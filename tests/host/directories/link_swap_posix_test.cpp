@@ -1,8 +1,8 @@
 // Removal while somebody exchanges directories for links that lead out of the tree.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
 #include "tests/support/random_steps.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

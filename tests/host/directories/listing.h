@@ -5,7 +5,7 @@
 #define TESTS_HOST_DIRECTORIES_LISTING_H
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 enum Kind { ALL, DIRECTORIES, FILES };
 

@@ -1,8 +1,8 @@
 // What only Linux can show of trees: links, permissions, special entries.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/support/status.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

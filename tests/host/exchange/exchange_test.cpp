@@ -2,7 +2,7 @@
 
 #include "tests/host/exchange/answers.h"
 #include "tests/host/support/child.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 // A disk that runs full, and one that cannot be written: nothing is lost, nothing half made stays.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 #include "tests/support/skip.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 // Sibling: text_mode_win_test.cpp.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

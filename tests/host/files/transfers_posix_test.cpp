@@ -1,7 +1,7 @@
 // Transfers that the system cuts short or interrupts.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

@@ -1,9 +1,9 @@
 // What only Linux can show of whole files: links, permissions, names of any bytes, holes, other file systems.
 
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/support/status.h"
 #include "tests/host/support/system_error.h"
+#include "tests/support/scratch.h"
 #include "tests/support/skip.h"
 
 #include <gtest/gtest.h>

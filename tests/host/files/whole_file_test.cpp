@@ -1,7 +1,7 @@
 #include "basis/platform/xos_basics.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/support/status.h"
 #include "tests/host/support/system_error.h"
+#include "tests/support/scratch.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>

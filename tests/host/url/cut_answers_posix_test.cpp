@@ -2,8 +2,8 @@
 // this system only.
 
 #include "basis/platform/xos_url.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/url/http_server.h"
+#include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
 

@@ -1,8 +1,8 @@
 #include "basis/platform/xos_url.h"
 #include "host/include/xos_host.h"
 #include "tests/host/support/child.h"
-#include "tests/host/support/scratch.h"
 #include "tests/host/url/http_server.h"
+#include "tests/support/scratch.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>

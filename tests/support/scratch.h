@@ -1,8 +1,8 @@
 /// \file
 /// A folder of its own for one test, and plain ways to make and to look at what lies in it.
 
-#ifndef TESTS_HOST_SUPPORT_SCRATCH_H
-#define TESTS_HOST_SUPPORT_SCRATCH_H
+#ifndef TESTS_SUPPORT_SCRATCH_H
+#define TESTS_SUPPORT_SCRATCH_H
 
 #include <atomic>
 #include <chrono>
@@ -19,7 +19,7 @@ public:
     explicit Scratch(std::filesystem::path const& where) {
         static std::atomic<unsigned> counter{0};
         auto const now = std::chrono::system_clock::now().time_since_epoch().count();
-        path_ = (where / ("host-test-" + std::to_string(now) + "-" + std::to_string(counter++))).generic_string();
+        path_ = (where / ("zb-test-" + std::to_string(now) + "-" + std::to_string(counter++))).generic_string();
         std::filesystem::create_directory(path_);
     }
     ~Scratch() {

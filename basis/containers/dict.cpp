@@ -1,0 +1,134 @@
+#include "zor_basis/containers/dict.h"
+
+#include "basis/containers/dict_index.h"
+#include "basis/containers/dict_records.h"
+#include "zor_basis/files/file.h"
+
+#include <cstring>
+
+namespace ZOR_Basis {
+namespace {
+
+constexpr int LOAD = File::FILE_READ | File::FILE_BINARY | File::FILE_SEQUENTIAL;
+constexpr int SAVE = File::FILE_WRITE | File::FILE_TRUNC | File::FILE_BINARY | File::FILE_SEQUENTIAL;
+/// Leaves out the platform layer's flag 0x40.
+constexpr bool WITHOUT_CREATE_FLAG = true;
+
+bool isValue(Blob const& blob, RecordBytes bytes) {
+    return blob.size() == bytes.size && (bytes.size == 0 || std::memcmp(blob.val(), bytes.place, bytes.size) == 0);
+}
+
+/// Puts the records of a file into an empty list.
+void load(IFile& file, SngList<DictEntry<Blob, Blob>>& list) {
+    using Entry = DictEntry<Blob, Blob>;
+    using Unit = SngList<Entry>::Unit;
+    Blob const empty;
+    DictIndex index;
+    RecordReader records(file);
+    while (records.next()) {
+        RecordBytes const key = records.key();
+        RecordBytes const value = records.value();
+        Entry* entry = index.find(key);
+        if (entry == nullptr) {
+            // kept dict-03: the steps of storing a key put each before the others.
+            list.insertFront(new Unit{nullptr, Entry(empty)});
+            entry = index.place() = &list.first()->value;
+            entry->key.copy(key.size, key.place);
+        }
+        if (!isValue(entry->value, value)) entry->value.copy(value.size, value.place);
+    }
+}
+
+} // namespace
+
+template <class K, class V>
+Dict<K, V>::Dict(Str const& path) : path_(path), modified_(true) {
+    read();
+}
+
+template <class K, class V>
+typename Dict<K, V>::Entry* Dict<K, V>::find(K const& key) const {
+    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
+        if (unit->value.eq(key)) return &unit->value;
+    }
+    return nullptr;
+}
+
+template <class K, class V>
+bool Dict<K, V>::get(K const& key, V& out) const {
+    Entry const* const entry = find(key);
+    if (entry == nullptr) return false;
+    out = entry->value;
+    return true;
+}
+
+template <class K, class V>
+void Dict<K, V>::set(K const& key, V const& value) {
+    modified_ = true;
+    Entry* const entry = find(key);
+    if (entry == nullptr) {
+        this->insertFront(new typename SngList<Entry>::Unit{nullptr, Entry(key, value)});
+    } else if (entry->value == value) {
+        // kept dict-01: callers that store the same again and again do not write the file for it.
+        modified_ = false;
+    } else {
+        entry->set(value);
+    }
+}
+
+template <class K, class V>
+void Dict<K, V>::rm(K const& key) {
+    for (auto at = this->begin(); at != this->end(); ++at) {
+        if (!at->eq(key)) continue;
+        this->remove(at);
+        modified_ = true;
+        return;
+    }
+}
+
+template <class K, class V>
+void Dict<K, V>::clean() {
+    if (this->first() == nullptr) return;
+    modified_ = true;
+    this->clear();
+}
+
+template <class K, class V>
+void Dict<K, V>::intersect(Dict const& other) {
+    // kept dict-02: what is left is a view for the moment, and the file keeps the rest.
+    for (auto at = this->begin(); at != this->end();) {
+        if (other.find(at->key) == nullptr) {
+            this->remove(at);
+        } else {
+            ++at;
+        }
+    }
+}
+
+template <class K, class V>
+bool Dict<K, V>::read() {
+    clean();
+    File file;
+    if (!file.open(path_, LOAD, WITHOUT_CREATE_FLAG)) return false;
+    load(*file.ptr(), *this);
+    modified_ = false;
+    return true;
+}
+
+template <class K, class V>
+bool Dict<K, V>::write() {
+    if (!modified_) return true;
+    File file;
+    if (!file.open(path_, SAVE, WITHOUT_CREATE_FLAG)) return false;
+    RecordWriter records(*file.ptr());
+    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
+        if (!records.add(unit->value.key) || !records.add(unit->value.value)) return false;
+    }
+    if (!records.finish()) return false;
+    modified_ = false;
+    return true;
+}
+
+ZB_INSTANTIATE_TEMPLATE Dict<Blob, Blob>;
+
+} // namespace ZOR_Basis
