@@ -2,6 +2,7 @@
 
 #include "basis/timers/base_timer_impl.h"
 #include "basis/timers/complaint.h"
+#include "basis/timers/measurement.h"
 
 namespace ZOR_Basis {
 
@@ -14,24 +15,12 @@ std::int64_t checkedFrequency(PerformanceCounter::Frequency const& answer) {
 }
 
 BaseTimer::BaseTimer(bool startNow, bool beginSuspended) : zbTimerDat{} {
-    if (startNow) start(beginSuspended);
+    if (startNow) Measurement::start(*this, beginSuspended);
 }
 
-void BaseTimer::start(bool beginSuspended) {
-    if (zbTimerDat::start == 0) zbTimerDat::start = PerformanceCounter::now();
-    if (beginSuspended) suspend();
-}
-
-void BaseTimer::suspend() {
-    // kept timers-02: whether the timer runs is not asked.
-    if (suspendStart == 0) suspendStart = PerformanceCounter::now();
-}
-
-void BaseTimer::resume() {
-    if (suspendStart == 0) return;
-    zbTimerDat::suspended += PerformanceCounter::now() - suspendStart;
-    suspendStart = 0;
-}
+void BaseTimer::start(bool beginSuspended) { Measurement::start(*this, beginSuspended); }
+void BaseTimer::suspend() { Measurement::suspend(*this); }
+void BaseTimer::resume() { Measurement::resume(*this); }
 
 std::int64_t BaseTimer::Clock() { return PerformanceCounter::now(); }
 std::int64_t BaseTimer::Init() { return checkedFrequency(PerformanceCounter::frequency()); }

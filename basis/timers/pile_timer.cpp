@@ -2,6 +2,7 @@
 
 #include "basis/timers/clock.h"
 #include "basis/timers/complaint.h"
+#include "basis/timers/measurement.h"
 #include "basis/timers/report_row.h"
 
 namespace ZOR_Basis {
@@ -12,20 +13,12 @@ constexpr int LINE_STOP = 190;
 constexpr int LINE_SUSPEND = 197;
 constexpr int LINE_RESUME = 204;
 
-/// Ends the measurement and its suspension at one reading.
-void finish(zbTimerDat& measured) {
-    measured.stop = PerformanceCounter::now();
-    if (measured.suspendStart <= 0) return;
-    measured.suspended += measured.stop - measured.suspendStart;
-    measured.suspendStart = 0;
-}
-
 } // namespace
 
 // Here and not beside its class, which knows nothing of piles.
 void BaseTimer::stop(PileTimer* pile) {
     if (zbTimerDat::start == 0) return;
-    finish(*this);
+    Measurement::finish(*this);
     if (pile != nullptr) pile->addTotal(*this);
     // kept timers-01: the record is idle whatever became of the measurement.
     reset();
@@ -40,7 +33,7 @@ void PileTimer::unlock() {}
 
 void PileTimer::start(bool beginSuspended) {
     if (checks_ && started()) complain(LINE_START, "PileTimer::start() : already started");
-    BaseTimer::start(beginSuspended);
+    Measurement::start(*this, beginSuspended);
 }
 
 void PileTimer::suspend() {
@@ -53,7 +46,7 @@ void PileTimer::suspend() {
 
 void PileTimer::resume() {
     if (checks_ && !isSuspended()) complain(LINE_RESUME, "PileTimer::resume() : not suspended");
-    BaseTimer::resume();
+    Measurement::resume(*this);
 }
 
 void PileTimer::stop() {

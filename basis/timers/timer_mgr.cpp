@@ -44,11 +44,18 @@ PileTimer* TimerMgr::get(TimerMgr* manager, std::uint64_t id) {
     return manager != nullptr ? manager->getTimer(id) : nullptr;
 }
 
-// The manager may be switched off while the timer is looked up, so each of these asks once more.
-void TimerMgr::startSlot(std::uint64_t id) { start(getTimer(id)); }
-void TimerMgr::stopSlot(std::uint64_t id) { stop(getTimer(id)); }
-void TimerMgr::suspendSlot(std::uint64_t id) { suspend(getTimer(id)); }
-void TimerMgr::resumeSlot(std::uint64_t id) { resume(getTimer(id)); }
+void TimerMgr::startSlot(std::uint64_t id) {
+    if (PileTimer* const timer = activeSlot(id)) timer->start(false);
+}
+void TimerMgr::stopSlot(std::uint64_t id) {
+    if (PileTimer* const timer = activeSlot(id)) timer->stop();
+}
+void TimerMgr::suspendSlot(std::uint64_t id) {
+    if (PileTimer* const timer = activeSlot(id)) timer->suspend();
+}
+void TimerMgr::resumeSlot(std::uint64_t id) {
+    if (PileTimer* const timer = activeSlot(id)) timer->resume();
+}
 
 void TimerMgr::start(PileTimer* timer) {
     if (active()) PileTimer::start(timer, false);

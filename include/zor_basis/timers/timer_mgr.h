@@ -123,6 +123,11 @@ protected:
     virtual ~TimerMgr();
 
 private:
+    /// Asks once more whether it is active, as that may change while the timer is looked up.
+    PileTimer* activeSlot(std::uint64_t id) {
+        PileTimer* const timer = getTimer(id);
+        return active() ? timer : nullptr;
+    }
     void startSlot(std::uint64_t id);
     void stopSlot(std::uint64_t id);
     void suspendSlot(std::uint64_t id);
