@@ -5,7 +5,7 @@
 #define BASIS_CONTAINERS_DICT_INDEX_H
 
 #include "basis/containers/dict_records.h"
-#include "zor_basis/containers/dict.h"
+#include "zor_basis/containers/dict_entry.h"
 
 #include <cstdint>
 #include <vector>
