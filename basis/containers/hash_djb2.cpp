@@ -59,7 +59,9 @@ __m128i load(char const* p) { return _mm_loadu_si128(reinterpret_cast<__m128i co
 #endif
 inline __m128i
 loadText(char const* text) {
-    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) return load(text);
+    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) {
+        return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); // not load(): that one is sanitized
+    }
     char bytes[BLOCK] = {};
     for (unsigned i = 0; i < BLOCK && text[i] != '\0'; ++i) bytes[i] = text[i];
     return load(bytes);

@@ -1,10 +1,6 @@
 #include "zor_basis/memory/mem_mgr.h"
 
-#include "basis/memory/sm_bl_mem_mgr.h"
-#include "basis/memory/stack_mem_mgr.h"
-
 #include <cstdlib>
-#include <new>
 
 namespace ZOR_Basis {
 
@@ -17,13 +13,5 @@ void MemMgr::free(void* p) { std::free(p); }
 MemMgr::~MemMgr() = default;
 
 MemMgr* MemMgr::makeStd() { return &_Only; }
-
-MemMgr* MemMgr::makeSmlBlk(std::uint64_t elemSize, std::uint64_t count, std::uint64_t maxCount, std::uint64_t align) {
-    return new (std::nothrow) SmBlMemMgr(elemSize, count, maxCount, align);
-}
-
-MemMgr* MemMgr::makeStack(std::uint64_t blockSize, void* buffer) {
-    return new (std::nothrow) StackMemMgr(blockSize, buffer);
-}
 
 } // namespace ZOR_Basis

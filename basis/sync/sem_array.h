@@ -5,7 +5,7 @@
 #define BASIS_SYNC_SEM_ARRAY_H
 
 #include "basis/sync/sem_syn_list.h"
-#include "zor_basis/sync/sem_set.h"
+#include "zor_basis/sync/i_sem_set.h"
 
 namespace ZOR_Basis {
 

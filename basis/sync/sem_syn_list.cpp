@@ -103,7 +103,7 @@ void SemSynList::freeEntry(Entry* entry) {
     if (entryMemory_ != nullptr) {
         entryMemory_->free(entry);
     } else {
-        ::operator delete(entry, sizeof(Entry));
+        ::operator delete(entry);
     }
 }
 

@@ -1,17 +1,12 @@
 #include "zor_basis/system/sys.h"
 
 #include "basis/files/root_folder.h"
+#include "basis/system/beneath_root.h"
 
 namespace ZOR_Basis {
 namespace {
 
 constexpr char TEMP[] = "tmp";
-
-FPath makeTemp(RootFolder::Root const& root) {
-    FPath temp(root.text);
-    if (root.isFileSystem) temp = "/";
-    return temp.add(TEMP);
-}
 
 } // namespace
 
@@ -33,9 +28,9 @@ FPath const& Sys::temp() {
     RootFolder::Root const& root = RootFolder::get();
     if (root.text.empty()) {
         thread_local FPath passing;
-        return passing = makeTemp(root);
+        return passing = beneathRoot(root, TEMP);
     }
-    static FPath const* const kept = new FPath(makeTemp(root));
+    static FPath const* const kept = new FPath(beneathRoot(root, TEMP));
     return *kept;
 }
 

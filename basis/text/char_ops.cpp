@@ -1,4 +1,4 @@
-#include "basis/text/copy_text.h"
+#include "zor_basis/text/char_ops.h"
 
 #include <cstring>
 #include <limits>
@@ -28,11 +28,6 @@ WChar const* findText(WChar const* text, WChar const* wanted) noexcept {
         if (compareTextsUpTo(text, wanted, length) == 0) return text;
         if (*text == WChar()) return nullptr;
     }
-}
-
-// kept text-06: the size is what the caller said, so the units behind the terminator have to be defined
-void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept {
-    copyUpToTerminator(target, source, length);
 }
 
 } // namespace ZOR_Basis::detail

@@ -78,30 +78,31 @@ ZB_COLD int orderByRuntime(char const* a, char const* b) noexcept {
     return std::strcmp(textOrEmpty(a), textOrEmpty(b));
 }
 
+/// Of texts that are equal so far and have not ended.
+inline int orderAtTheEnd(char const* a, char const* b) noexcept {
+    if (*a == *b && *a != '\0') [[unlikely]]
+        return orderByRuntime(a, b);
+    return orderAt(a, b, 0);
+}
+
 #if ZB_WIDE_VECTOR_TEXT
 
-ZB_AVX2 ZB_INLINE std::uint64_t bitsOf(__m256i low, __m256i high) noexcept {
-    return std::uint64_t{static_cast<std::uint32_t>(_mm256_movemask_epi8(low))} |
-           std::uint64_t{static_cast<std::uint32_t>(_mm256_movemask_epi8(high))} << 32;
+constexpr std::uint64_t Undecided = std::numeric_limits<std::uint64_t>::max();
+
+ZB_AVX2 ZB_INLINE unsigned zerosOf(__m256i bytes) noexcept {
+    return static_cast<unsigned>(_mm256_movemask_epi8(_mm256_cmpeq_epi8(bytes, _mm256_setzero_si256())));
 }
 
-ZB_AVX2 ZB_INLINE Places<std::uint64_t> placesOfWide(char const* a, char const* b, std::uint64_t second) noexcept {
-    __m256i const zero = _mm256_setzero_si256();
+/// Where the texts are decided in two vectors of 32 bytes, the second of which may overlap the first.
+ZB_AVX2 ZB_INLINE std::uint64_t decisionIn(char const* a, char const* b, std::uint64_t second) noexcept {
     __m256i const head = load32(a);
     __m256i const tail = load32(a + second);
-    __m256i const headEqual = _mm256_cmpeq_epi8(head, load32(b));
-    __m256i const tailEqual = _mm256_cmpeq_epi8(tail, load32(b + second));
-    return {~bitsOf(headEqual, tailEqual), bitsOf(_mm256_cmpeq_epi8(_mm256_min_epu8(headEqual, head), zero),
-                                                  _mm256_cmpeq_epi8(_mm256_min_epu8(tailEqual, tail), zero))};
-}
-
-/// Whether anything is decided in two vectors of 32 bytes.
-ZB_AVX2 ZB_INLINE bool isDecided(char const* a, char const* b, std::uint64_t second) noexcept {
-    __m256i const head = load32(a);
-    __m256i const tail = load32(a + second);
-    __m256i const headEqual = _mm256_cmpeq_epi8(head, load32(b));
-    __m256i const tailEqual = _mm256_cmpeq_epi8(tail, load32(b + second));
-    return hasZero(_mm256_min_epu8(_mm256_min_epu8(headEqual, head), _mm256_min_epu8(tailEqual, tail)));
+    __m256i const undecidedHead = _mm256_min_epu8(_mm256_cmpeq_epi8(head, load32(b)), head);
+    __m256i const undecidedTail = _mm256_min_epu8(_mm256_cmpeq_epi8(tail, load32(b + second)), tail);
+    if (zerosOf(_mm256_min_epu8(undecidedHead, undecidedTail)) == 0) return Undecided;
+    unsigned const headPlaces = zerosOf(undecidedHead);
+    if (headPlaces != 0) return static_cast<std::uint64_t>(std::countr_zero(headPlaces));
+    return second + static_cast<std::uint64_t>(std::countr_zero(zerosOf(undecidedTail)));
 }
 
 /// More than 32 bytes, in runs of 64. The last run of a longer text begins in the one before.
@@ -109,78 +110,73 @@ template <class Text>
 ZB_AVX2 ZB_COLD bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
     for (; length > 64; a += 64, b += 64, length -= 64) {
         if (!Text::readable(a, b, 64)) return sameByRuntime(a, b, length);
-        if (isDecided(a, b, 32)) return placesOfWide(a, b, 32).same();
+        std::uint64_t const place = decisionIn(a, b, 32);
+        if (place != Undecided) return a[place] == b[place];
     }
     if (!Text::readable(a, b, length)) return sameByRuntime(a, b, length);
     std::uint64_t const back = length < 32 ? 32 - length : 0;
     a -= back;
     b -= back;
-    std::uint64_t const second = length + back - 32;
-    return !isDecided(a, b, second) || placesOfWide(a, b, second).same();
+    std::uint64_t const place = decisionIn(a, b, length + back - 32);
+    return place == Undecided || a[place] == b[place];
 }
 
-/// The same for texts that are likely to end there.
+/// The same, and how texts compare that are likely to end there.
 template <class Text>
 ZB_AVX2 ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
     for (; length > 64; a += 64, b += 64, length -= 64) {
         if (!Text::readable(a, b, 64)) return orderByRuntime(a, b);
-        if (isDecided(a, b, 32)) return orderAt(a, b, placesOfWide(a, b, 32).first());
+        std::uint64_t const place = decisionIn(a, b, 32);
+        if (place != Undecided) return orderAt(a, b, place);
     }
-    if (length == 0 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
+    if (!Text::readable(a, b, length)) return orderByRuntime(a, b);
     std::uint64_t const back = length < 32 ? 32 - length : 0;
     a -= back;
     b -= back;
     std::uint64_t const second = length + back - 32;
-    auto const places = placesOfWide(a, b, second);
-    if (places.decided == 0) return orderByRuntime(a + second + 32, b + second + 32);
-    std::uint64_t const first = places.first();
-    return orderAt(a, b, first < 32 ? first : second + first - 32);
+    std::uint64_t const place = decisionIn(a, b, second);
+    return place != Undecided ? orderAt(a, b, place) : orderAtTheEnd(a + second + 32, b + second + 32);
 }
 
 #endif
 
 template <class Text>
 bool same(char const* a, char const* b, std::uint64_t length) noexcept {
-    if (length <= 16 && Text::readable(a, b, length)) [[likely]] {
-        if (length >= 8) [[likely]]
-            return placesOf(ends8To16(a, length), ends8To16(b, length)).same();
-        if (length >= 4) return placesOf(ends4To7(a, length), ends4To7(b, length)).same();
-        return length == 0 || placesOf(ends1To3(a, length), ends1To3(b, length)).same();
-    }
 #if ZB_WIDE_VECTOR_TEXT
     if (length > 32 && __builtin_cpu_supports("avx2")) return sameLongTexts<Text>(a, b, length);
 #endif
-    if (length > 16 && length <= 32 && Text::readable(a, b, length)) return placesOfTwo(a, b, length).same();
-    return sameByRuntime(a, b, length);
+    if (length > 32 || !Text::readable(a, b, length)) [[unlikely]]
+        return sameByRuntime(a, b, length);
+    if (length > 16) return placesOfTwo(a, b, length).same();
+    if (length >= 8) [[likely]]
+        return placesOf(ends8To16(a, length), ends8To16(b, length)).same();
+    if (length >= 4) return placesOf(ends4To7(a, length), ends4To7(b, length)).same();
+    return length == 0 || placesOf(ends1To3(a, length), ends1To3(b, length)).same();
 }
 
 template <class Text>
 int order(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
-    std::uint64_t const last = std::min(aSize, bSize); // where the shorter one ends
-    std::uint64_t const length = last + 1;
-    if (last < 16 && length >= 4 && Text::readable(a, b, length)) [[likely]] {
-        std::uint64_t first;
-        std::uint64_t front;
-        if (length >= 8) [[likely]] {
-            first = placesOf(ends8To16(a, length), ends8To16(b, length)).first();
-            front = 8;
-        } else {
-            first = placesOf(ends4To7(a, length), ends4To7(b, length)).first();
-            front = 4;
-        }
-        if (first >= 2 * front) [[unlikely]]
-            return orderByRuntime(a + length, b + length);
-        return orderAt(a, b, first < front ? first : length - 2 * front + first);
-    }
+    std::uint64_t const length = std::min(aSize, bSize); // where the shorter one is likely to end
 #if ZB_WIDE_VECTOR_TEXT
-    if (last >= 32 && __builtin_cpu_supports("avx2")) return orderOfLongTexts<Text>(a, b, length);
+    if (length > 32 && __builtin_cpu_supports("avx2")) return orderOfLongTexts<Text>(a, b, length);
 #endif
-    if (last >= 16 && last < 32 && Text::readable(a, b, length)) {
-        std::uint64_t const first = placesOfTwo(a, b, length).first();
-        if (first >= 32) return orderByRuntime(a + length, b + length);
-        return orderAt(a, b, first < 16 ? first : length - 32 + first);
+    if (length > 32 || length < 4 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
+    Places<std::uint32_t> places;
+    std::uint64_t front; // places from the first end of the texts
+    if (length > 16) {
+        places = placesOfTwo(a, b, length);
+        front = 16;
+    } else if (length >= 8) [[likely]] {
+        places = placesOf(ends8To16(a, length), ends8To16(b, length));
+        front = 8;
+    } else {
+        places = placesOf(ends4To7(a, length), ends4To7(b, length));
+        places.decided &= 0xFFU;
+        front = 4;
     }
-    return orderByRuntime(a, b);
+    if (places.decided == 0) return orderAtTheEnd(a + length, b + length);
+    std::uint64_t const first = places.first();
+    return orderAt(a, b, first < front ? first : length - 2 * front + first);
 }
 
 #endif

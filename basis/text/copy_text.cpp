@@ -1,9 +1,21 @@
-#include "basis/text/copy_text.h"
-
 #include "basis/text/vector_text.h"
+#include "zor_basis/text/char_ops.h"
 #include "zor_basis/text/word_ops.h"
 
 namespace ZOR_Basis::detail {
+
+namespace {
+
+/// A step at a time, for every source and every overlap.
+template <class Char>
+void copyUpToTerminator(Char* target, Char const* source, std::uint64_t length) noexcept {
+    if (length == 0) return;
+    std::uint64_t const copied = textLengthUpTo(source, length);
+    std::memmove(target, source, copied * sizeof(Char));
+    std::memset(target + copied, 0, (length - copied) * sizeof(Char));
+}
+
+} // namespace
 
 #if ZB_VECTOR_TEXT
 
@@ -69,7 +81,12 @@ ZB_INLINE bool copy33To64(char* target, char const* source, std::uint64_t length
     return true;
 }
 
+/// At most 64 bytes.
 ZB_INLINE bool copyShort(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length >= 16) {
+        if (length <= 32) return copy16To32(target, source, length);
+        return copy33To64(target, source, length);
+    }
     if (length >= 8) [[likely]]
         return copy8To15(target, source, length);
     if (length >= 4) return copy4To7(target, source, length);
@@ -128,7 +145,8 @@ template <class Text>
 ZB_AVX2 ZB_COLD void copyRuns(char* target, char const* source, std::uint64_t length) noexcept {
     if (overlap(target, source, length)) return copyOther(target, source, length);
     for (; length > 256; target += 128, source += 128, length -= 128) {
-        if (!Text::readable(source, 128) || !copy65To128(target, source, 128)) return copyOther(target, source, length);
+        bool const readable = Text::readable(source, 128) || textLengthUpTo(source, 128) == 128;
+        if (!readable || !copy65To128(target, source, 128)) return copyOther(target, source, length);
     }
     if (!Text::readable(source, length) || !copy129To256(target, source, length)) copyOther(target, source, length);
 }
@@ -136,40 +154,28 @@ ZB_AVX2 ZB_COLD void copyRuns(char* target, char const* source, std::uint64_t le
 /// More than 64 bytes.
 template <class Text>
 ZB_AVX2 ZB_COLD void copyLong(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length > 256) return copyRuns<Text>(target, source, length);
-    if (Text::readable(source, length)) [[likely]] {
-        if (length <= 128) {
-            if (copy65To128(target, source, length)) [[likely]]
+    if (length <= 256 && Text::readable(source, length)) [[likely]] {
+        if (length > 128) [[likely]] {
+            if (copy129To256(target, source, length)) [[likely]]
                 return;
         } else {
-            if (copy129To256(target, source, length)) [[likely]]
+            if (copy65To128(target, source, length)) [[likely]]
                 return;
         }
     }
+    if (length > 256) return copyRuns<Text>(target, source, length);
     copyOther(target, source, length);
 }
 
 #endif
 
 template <class Text>
-void copyOf(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length < 16 && Text::readable(source, length)) [[likely]] {
-        if (copyShort(target, source, length)) [[likely]]
-            return;
-        return copyOther(target, source, length);
-    }
+ZB_INLINE void copyOf(char* target, char const* source, std::uint64_t length) noexcept {
 #if ZB_WIDE_VECTOR_TEXT
-    if (length > 64 && __builtin_cpu_supports("avx2")) return copyLong<Text>(target, source, length);
+    if (length > 64 && __builtin_cpu_supports("avx2")) [[likely]]
+        return copyLong<Text>(target, source, length);
 #endif
-    if (length <= 64 && Text::readable(source, length)) {
-        if (length > 32) {
-            if (copy33To64(target, source, length)) [[likely]]
-                return;
-        } else if (length >= 16) {
-            if (copy16To32(target, source, length)) [[likely]]
-                return;
-        }
-    }
+    if (length <= 64 && Text::readable(source, length) && copyShort(target, source, length)) return;
     copyOther(target, source, length);
 }
 
@@ -195,5 +201,9 @@ void copyOwnedText(char* target, char const* source, std::uint64_t length) noexc
 }
 
 #endif
+
+void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept {
+    copyUpToTerminator(target, source, length);
+}
 
 } // namespace ZOR_Basis::detail

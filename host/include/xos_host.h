@@ -97,7 +97,9 @@ XOS_HOST_API void xos_HostCallsReset(void);
 ///
 /// \return null: no such function, or no call of it since the start or the last reset; else a text that is valid until
 ///         the calling thread's next `xos_HostLastCall`
-/// \thread of calls that ended before this one began, the one that was made last
+/// \thread of calls that ended before this one began, the one that was made last. Only of `xos_SemTake` and `xos_SemGive`,
+///         which cost less than reading a clock: calls of two threads have an order where a semaphore, a start or end of a
+///         thread or task, a question for a last call, or another function that both call came between them.
 XOS_HOST_API char const* xos_HostLastCall(char const* function);
 
 /* Functions by name */

@@ -5,6 +5,9 @@
 #define ZOR_BASIS_FLAT_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/timers/timer_dat.h"
+
+#include <stdint.h>
 
 /// A copy of a zero-terminated text in a block of its own.
 /// \return the copy, owned by the caller, who releases it with the runtime's `free`; null for null, and where memory
@@ -35,5 +38,64 @@ ZB_EXTERN_C ZB_API void ZB_replaceBackSlashes2(char const* source, char* target)
 /// \return 0, without a meaning
 /// \thread any
 ZB_EXTERN_C ZB_API int ZB_resolveURIEscapes(char const* in, char* out);
+
+/* Timers. Null arguments do nothing, and give null where there is a result. Flags: 0 is false, all else true. */
+
+/// Opaque here; the classes of `zor_basis/timers.h`.
+#ifdef __cplusplus
+namespace ZOR_Basis {
+class PileTimer;
+class TimerMgr;
+} // namespace ZOR_Basis
+typedef ZOR_Basis::PileTimer zbPileTimer;
+typedef ZOR_Basis::TimerMgr zbTimerMgr;
+#else
+typedef struct zbPileTimer zbPileTimer;
+typedef struct zbTimerMgr zbTimerMgr;
+#endif
+
+/// Starts a measurement in a record of the caller's, whatever the record held.
+/// \kept flat-01: a measurement that runs is lost and starts anew, where `BaseTimer::start` keeps it
+/// \param suspended  begins suspended
+/// \thread one thread at a time for each record, here and below
+ZB_EXTERN_C ZB_API void zbTimerBaseStart(zbTimerDat* measurement, int suspended);
+/// Ends a started measurement, piles it and makes the record idle.
+/// \kept flat-02: without a pile the measurement goes on
+/// \thread many threads may stop records of their own into one pile of `zbTimerMgrCreateMT`
+ZB_EXTERN_C ZB_API void zbTimerBaseStop(zbTimerDat* measurement, zbPileTimer* pile);
+/// Opens a suspension, unless one is open.
+ZB_EXTERN_C ZB_API void zbTimerBaseSuspend(zbTimerDat* measurement);
+/// Ends the suspension, if one is open.
+ZB_EXTERN_C ZB_API void zbTimerBaseResume(zbTimerDat* measurement);
+
+/// `PileTimer::start(false)`, `stop()`, `suspend()` and `resume()`, with their complaints about misuse.
+/// \thread one thread at a time for each timer
+ZB_EXTERN_C ZB_API void zbTimerStart(zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerStop(zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerSuspend(zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerResume(zbPileTimer* timer);
+
+/// Makes a manager, inactive at first; it lives as long as the process. Timers with ids of their own take those up to
+/// `maxId`. \thread any
+ZB_EXTERN_C ZB_API zbTimerMgr* zbTimerMgrNew(char const* name, uint64_t maxId);
+/// The first manager of that name; null if there is none. \thread any
+ZB_EXTERN_C ZB_API zbTimerMgr* zbTimerMgrGetMgr(char const* name);
+/// Makes a timer, owned by its manager. \param id  0: the next behind the last \thread any, while nobody looks timers up
+ZB_EXTERN_C ZB_API zbPileTimer* zbTimerMgrCreate(zbTimerMgr* manager, char const* name, uint64_t id);
+/// The same for a pile that many threads feed.
+ZB_EXTERN_C ZB_API zbPileTimer* zbTimerMgrCreateMT(zbTimerMgr* manager, char const* name, uint64_t id);
+/// The timer of an id; null if there is none. \thread any, while nobody creates
+ZB_EXTERN_C ZB_API zbPileTimer* zbTimerMgrGet(zbTimerMgr* manager, uint64_t id);
+/// Switches a manager on or off. \thread any
+ZB_EXTERN_C ZB_API void zbTimerMgrSetActive(zbTimerMgr* manager, int active);
+/// Resets all timers of an active manager. \param print  writes their report first \thread any
+ZB_EXTERN_C ZB_API void zbTimerMgrReset(zbTimerMgr* manager, int print);
+
+/// `zbTimerStart` and the others, while the manager is active. The timer may be another manager's.
+/// \thread one thread at a time for each timer
+ZB_EXTERN_C ZB_API void zbTimerMgrStart(zbTimerMgr* manager, zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerMgrStop(zbTimerMgr* manager, zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerMgrSuspend(zbTimerMgr* manager, zbPileTimer* timer);
+ZB_EXTERN_C ZB_API void zbTimerMgrResume(zbTimerMgr* manager, zbPileTimer* timer);
 
 #endif

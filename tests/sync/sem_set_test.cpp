@@ -80,8 +80,6 @@ TEST_F(SemSetTest, keeps_others_out_of_a_key_and_of_no_other) {
     });
     EXPECT_TRUE(soon(hasOther));
     EXPECT_FALSE(soon(hasSame));
-    EXPECT_EQ(set.bucketOf(13)->size(), 2u);
-    EXPECT_TRUE(set.bucketOf(13)->isConsistent());
     EXPECT_TRUE(set.give(13));
     other.join();
     EXPECT_TRUE(hasSame);

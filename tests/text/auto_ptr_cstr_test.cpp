@@ -7,6 +7,13 @@
 #include <new>
 #include <type_traits>
 
+#if defined(__SANITIZE_ADDRESS__)
+// Memory that cannot be had is what is tested here.
+extern "C" [[gnu::weak, gnu::visibility("default")]] char const* __asan_default_options() {
+    return "allocator_may_return_null=1";
+}
+#endif
+
 static_assert(!std::is_copy_constructible_v<Auto_ptr_CStr> && !std::is_copy_assignable_v<Auto_ptr_CStr>);
 
 TEST(AutoPtrCStr, breathes) {

@@ -4,16 +4,18 @@
 
 #include <zor_basis/text/convert.h>
 
+#include "tests/support/child.h"
 #include "tests/support/table.h"
 #include "tests/text/reference_utf.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <string>
 #include <thread>
+#include <utility>
+#include <vector>
 
 using namespace ZOR_Basis;
 using reference::WideText;
@@ -176,15 +178,17 @@ TEST(ConvertLocalLinux, converts_on_several_threads_at_once) {
 
 namespace {
 
+using Environment = std::vector<std::pair<std::string, std::string>>;
+
 /// What `locale_child` prints under an environment: the UTF-8 form of its local text, or "invalid".
-std::string childUnder(std::string const& environment, std::string const& hexText) {
-    std::string const program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / "locale_child";
-    std::string const command = "env -u LC_ALL -u LC_CTYPE -u LANG " + environment + " " + program + " " + hexText;
-    std::FILE* const child = ::popen(command.c_str(), "r");
-    char line[256] = {};
-    std::size_t const length = std::fread(line, 1, sizeof line - 1, child);
-    EXPECT_EQ(::pclose(child), 0);
-    return {line, length};
+std::string childUnder(Environment const& environment, std::string const& hexText) {
+    Child child{"locale_child", {hexText}, {{"LC_ALL", ""}, {"LC_CTYPE", ""}, {"LANG", ""}}, ""};
+    // The C library never releases what it makes of LOCPATH.
+    child.environment.emplace_back("ASAN_OPTIONS", "detect_leaks=0");
+    child.environment.insert(child.environment.end(), environment.begin(), environment.end());
+    ChildResult const result = run(child);
+    EXPECT_EQ(result.exitCode, 0);
+    return result.output;
 }
 
 } // namespace
@@ -192,21 +196,21 @@ std::string childUnder(std::string const& environment, std::string const& hexTex
 TEST(ConvertLocalLinux, takes_the_character_set_from_the_environment) {
     struct Case {
         Row row;
-        char const* environment;
+        Environment environment;
         char const* hexText;
         char const* expected;
     };
     for (Case const& c : {
-             Case{{}, "LC_ALL=C.UTF-8", "c3a4", "c3a4"},
-             Case{{}, "LC_ALL=C.UTF-8", "e4", "invalid"},
-             Case{{}, "LC_ALL=C", "e4", "invalid"},
-             Case{{}, "", "41", "41"},
-             Case{{}, "LANG=C.UTF-8", "c3a4", "c3a4"},
-             Case{{}, "LC_ALL=C LANG=C.UTF-8", "c3a4", "invalid"},
+             Case{{}, {{"LC_ALL", "C.UTF-8"}}, "c3a4", "c3a4"},
+             Case{{}, {{"LC_ALL", "C.UTF-8"}}, "e4", "invalid"},
+             Case{{}, {{"LC_ALL", "C"}}, "e4", "invalid"},
+             Case{{}, {}, "41", "41"},
+             Case{{}, {{"LANG", "C.UTF-8"}}, "c3a4", "c3a4"},
+             Case{{}, {{"LC_ALL", "C"}, {"LANG", "C.UTF-8"}}, "c3a4", "invalid"},
              // Locales that are not installed tell their set by their name.
-             Case{{}, "LC_ALL=xx_XX.ISO-8859-15", "a4", "e282ac"},
-             Case{{}, "LC_CTYPE=xx_XX.KOI8-R@modifier LANG=C", "c1", "d0b0"},
-             Case{{}, "LANG=xx_XX", "e4", "invalid"},
+             Case{{}, {{"LC_ALL", "xx_XX.ISO-8859-15"}}, "a4", "e282ac"},
+             Case{{}, {{"LC_CTYPE", "xx_XX.KOI8-R@modifier"}, {"LANG", "C"}}, "c1", "d0b0"},
+             Case{{}, {{"LANG", "xx_XX"}}, "e4", "invalid"},
          }) {
         SCOPED_TRACE(c.row);
         EXPECT_EQ(childUnder(c.environment, c.hexText), c.expected);
@@ -219,6 +223,6 @@ TEST(ConvertLocalLinux, takes_the_character_set_of_an_installed_locale_whatever_
     fs::create_directories(folder);
     std::string const make = "localedef -f KOI8-R -i ru_RU " + (folder / "zb_test").string() + " 2>/dev/null";
     ASSERT_EQ(std::system(make.c_str()), 0) << "the package `locales` has the sources";
-    EXPECT_EQ(childUnder("LOCPATH=" + folder.string() + " LC_ALL=zb_test", "c1"), "d0b0");
+    EXPECT_EQ(childUnder({{"LOCPATH", folder.string()}, {"LC_ALL", "zb_test"}}, "c1"), "d0b0");
     fs::remove_all(folder);
 }

@@ -44,7 +44,7 @@ public:
     BufStr(char const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
     BufStr(Str const& text) noexcept { Text::make(*this, text.c_str(), text.size()); }
     BufStr(std::string const& text) noexcept { Text::makeOwned(*this, text.c_str(), text.size()); }
-    BufStr(BufStr const& other) noexcept : Str() { Text::makeOwned(*this, other.text_, other.size_); }
+    BufStr(BufStr const& other) noexcept : Str(other) { Text::makeOwned(*this, other.text_, other.size_); }
     ~BufStr() { Text::end(*this); }
 
     /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.

@@ -35,7 +35,7 @@ public:
     /// Copies of texts, each made as by assigning to an empty string.
     WBStr(WChar const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
     WBStr(WStr const& text) noexcept { Text::make(*this, text.wstr(), text.size()); }
-    WBStr(WBStr const& other) noexcept : WStr() { Text::makeOwned(*this, other.text_, other.size_); }
+    WBStr(WBStr const& other) noexcept : WStr(other) { Text::makeOwned(*this, other.text_, other.size_); }
     ~WBStr() { Text::end(*this); }
 
     /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.

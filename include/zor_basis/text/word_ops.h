@@ -13,6 +13,29 @@
 #include <cstdint>
 #include <cstring>
 
+// A sanitizer that checks addresses has to see every single byte that is read.
+#if defined(__SANITIZE_ADDRESS__)
+#define ZB_HIDDEN_TEXT 0
+#elif defined(__has_feature)
+#if __has_feature(address_sanitizer)
+#define ZB_HIDDEN_TEXT 0
+#endif
+#endif
+#if !defined(ZB_HIDDEN_TEXT)
+#if defined(__GNUC__)
+#define ZB_HIDDEN_TEXT 1
+#else
+#define ZB_HIDDEN_TEXT 0
+#endif
+#endif
+
+#if defined(__SSE2__) || defined(_M_X64)
+#define ZB_VECTORS 1
+#include <emmintrin.h>
+#else
+#define ZB_VECTORS 0
+#endif
+
 namespace ZOR_Basis::detail {
 
 /// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read; for the order
@@ -65,26 +88,72 @@ inline std::uint64_t loadEnds(char const* text, std::uint64_t length) noexcept {
 
 inline constexpr bool WordsBeginLow = std::endian::native == std::endian::little;
 
-inline void copyOwned(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length > 16) return copyOwnedText(target, source, length);
+#if ZB_VECTORS
+inline __m128i loadVector(char const* text) noexcept { return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); }
+inline void storeVector(char* target, __m128i bytes) noexcept {
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(target), bytes);
+}
+inline bool hasZero(__m128i bytes) noexcept {
+    return _mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())) != 0;
+}
+
+/// 17 to 64 bytes. \return false, with nothing written, where a zero is among them
+inline bool copyVectors(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const head = loadVector(source);
+    __m128i const tail = loadVector(source + length - 16);
+    if (length <= 32) {
+        if (hasZero(_mm_min_epu8(head, tail))) return false;
+    } else {
+        __m128i const second = loadVector(source + 16);
+        __m128i const third = loadVector(source + length - 32);
+        if (hasZero(_mm_min_epu8(_mm_min_epu8(head, second), _mm_min_epu8(third, tail)))) return false;
+        storeVector(target + 16, second);
+        storeVector(target + length - 32, third);
+    }
+    storeVector(target, head);
+    storeVector(target + length - 16, tail);
+    return true;
+}
+#else
+inline bool copyVectors(char*, char const*, std::uint64_t) noexcept { return false; }
+#endif
+
+/// Copies 4 to 64 bytes, all of which may be read. \return false, with nothing written, for other lengths and where a
+/// zero is among them
+inline bool copyWords(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length > 16) return length <= 64 && copyVectors(target, source, length);
     if (length >= 8) {
         auto const head = loadWord<std::uint64_t>(source);
         auto const tail = loadWord<std::uint64_t>(source + length - 8);
-        if ((zerosIn(head) | zerosIn(tail)) == 0) {
-            std::memcpy(target, &head, sizeof head);
-            std::memcpy(target + length - 8, &tail, sizeof tail);
-            return;
-        }
-    } else if (length >= 4) {
-        auto const head = loadWord<std::uint32_t>(source);
-        auto const tail = loadWord<std::uint32_t>(source + length - 4);
-        if (zerosIn(head | std::uint64_t{tail} << 32) == 0) {
-            std::memcpy(target, &head, sizeof head);
-            std::memcpy(target + length - 4, &tail, sizeof tail);
-            return;
-        }
+        if ((zerosIn(head) | zerosIn(tail)) != 0) return false;
+        std::memcpy(target, &head, sizeof head);
+        std::memcpy(target + length - 8, &tail, sizeof tail);
+        return true;
     }
-    copyOwnedText(target, source, length);
+    if (length < 4) return false;
+    auto const head = loadWord<std::uint32_t>(source);
+    auto const tail = loadWord<std::uint32_t>(source + length - 4);
+    if (zerosIn(head | std::uint64_t{tail} << 32) != 0) return false;
+    std::memcpy(target, &head, sizeof head);
+    std::memcpy(target + length - 4, &tail, sizeof tail);
+    return true;
+}
+
+inline void copyOwned(char* target, char const* source, std::uint64_t length) noexcept {
+    if (!copyWords(target, source, length)) copyOwnedText(target, source, length);
+}
+
+/// The same for a text that may end before its length, with nothing readable behind: what lies in the page of its first
+/// byte can be read all the same. The compiler must not know which text it is, as it would take that for a mistake.
+inline void copyGiven(char* target, char const* source, std::uint64_t length) noexcept {
+#if ZB_HIDDEN_TEXT
+    if (length <= 64 && (reinterpret_cast<std::uintptr_t>(source) & 4095U) <= 4096 - length) {
+        char const* hidden = source;
+        __asm__("" : "+r"(hidden));
+        if (copyWords(target, hidden, length)) return;
+    }
+#endif
+    copyText(target, source, length);
 }
 
 inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexcept {
@@ -103,17 +172,19 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
 
 /// -1, 0 or 1; both texts have a terminator at their size.
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
-    std::uint64_t const length = (aSize < bSize ? aSize : bSize) + 1;
+    std::uint64_t const length = aSize < bSize ? aSize : bSize;
     if (WordsBeginLow && length >= 4 && length <= 16) {
-        if (length < 8) {
-            WordPair const both(loadEnds(a, length), loadEnds(b, length));
-            if (both.decided != 0) return both.order();
-        } else {
-            WordPair const head(loadWord<std::uint64_t>(a), loadWord<std::uint64_t>(b));
-            if (head.decided != 0) return head.order();
+        bool const one = length < 8;
+        WordPair const head(one ? loadEnds(a, length) : loadWord<std::uint64_t>(a),
+                            one ? loadEnds(b, length) : loadWord<std::uint64_t>(b));
+        if (head.decided != 0) return head.order();
+        if (!one) {
             WordPair const tail(loadWord<std::uint64_t>(a + length - 8), loadWord<std::uint64_t>(b + length - 8));
             if (tail.decided != 0) return tail.order();
         }
+        auto const left = static_cast<unsigned char>(a[length]);
+        auto const right = static_cast<unsigned char>(b[length]);
+        if (left != right || left == 0) return (left > right) - (left < right);
     }
     int const order = compareOwnedTexts(a, aSize, b, bSize);
     return (order > 0) - (order < 0);

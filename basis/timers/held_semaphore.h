@@ -1,0 +1,28 @@
+/// \file
+/// A semaphore of the platform layer, held for a scope.
+
+#ifndef BASIS_TIMERS_HELD_SEMAPHORE_H
+#define BASIS_TIMERS_HELD_SEMAPHORE_H
+
+#include "basis/platform/xos_basics.h"
+
+namespace ZOR_Basis {
+
+/// The scope runs also where the semaphore cannot be taken; then it is not given back either.
+class HeldSemaphore {
+public:
+    explicit HeldSemaphore(xos_Sem semaphore) : semaphore_(semaphore), taken_(xos_SemTake(semaphore) == 0) {}
+    HeldSemaphore(HeldSemaphore const&) = delete;
+    HeldSemaphore& operator=(HeldSemaphore const&) = delete;
+    ~HeldSemaphore() {
+        if (taken_) xos_SemGive(semaphore_);
+    }
+
+private:
+    xos_Sem const semaphore_;
+    bool const taken_;
+};
+
+} // namespace ZOR_Basis
+
+#endif

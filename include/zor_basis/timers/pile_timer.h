@@ -1,0 +1,142 @@
+/// \file
+/// `PileTimer`: a named counter of the time that one piece of work takes. It is a measurement itself and piles up finished
+/// ones: how many, their sum, the longest and the shortest, and how long they were suspended.
+///
+/// Misuse of its own measurement is reported through `xos_Assert`, with the tag "zor_basis", where the timer's checks
+/// are on; the operation goes on afterwards:
+///
+/// | operation | condition | line | message |
+/// |---|---|---|---|
+/// | `start` | started already | 183 | "PileTimer::start() : already started" |
+/// | `stop` | not started | 190 | "PileTimer::start() : not started" |
+/// | `suspend` | suspended already | 197 | "PileTimer::suspend() : already suspended" |
+/// | `resume` | not suspended | 204 | "PileTimer::resume() : not suspended" |
+///
+/// \kept timers-04: the message of `stop` names `start()`, as those who search logs for it know it
+/// \thread  one thread at a time; a report may read and reset the statistics meanwhile. `PileTimerMT` tells what threads
+///     may share
+
+#ifndef ZOR_BASIS_TIMERS_PILE_TIMER_H
+#define ZOR_BASIS_TIMERS_PILE_TIMER_H
+
+#include "zor_basis/export.h"
+#include "zor_basis/text/buf_str.h"
+#include "zor_basis/text/heap_str.h"
+#include "zor_basis/timers/base_timer.h"
+
+#include <atomic>
+#include <cstdint>
+
+namespace ZOR_Basis {
+
+namespace detail {
+
+/// A number that one thread changes while others read or clear it. A change is no exchange: a clearing that falls between
+/// its reading and its writing is lost.
+template <class T>
+class Statistic {
+public:
+    Statistic() = default;
+    Statistic(Statistic const& other) : value_(other) {}
+    Statistic& operator=(Statistic const& other) { return *this = static_cast<T>(other); }
+    Statistic& operator=(T value) {
+        value_.store(value, std::memory_order_relaxed);
+        return *this;
+    }
+    operator T() const { return value_.load(std::memory_order_relaxed); }
+
+private:
+    std::atomic<T> value_{0};
+};
+
+} // namespace detail
+
+class ZB_API PileTimer : public BaseTimer {
+public:
+    /// \param name  copied; null is the empty name
+    /// \param checks  whether misuse is reported
+    PileTimer(char const* name, bool checks);
+    /// Copies everything: the measurement, the statistics, id, checks and name.
+    PileTimer(PileTimer const&) = default;
+    PileTimer& operator=(PileTimer const&) = default;
+    virtual ~PileTimer();
+
+    Str const& name() const { return name_; }
+    char const* cname() const { return name_.c_str(); }
+    /// The slot in the timer's manager; 0 until a manager gives one.
+    std::uint64_t id() const { return id_; }
+    void setId(std::uint64_t id) { id_ = id; }
+    /// Whether the names are equal; nothing else is compared.
+    bool eq(PileTimer const& other) const { return name() == other.name(); }
+
+    /// Starts the own measurement; one that runs keeps its start.
+    /// \param beginSuspended  then suspends, if that is not so already
+    /// \error the timer has started already: see above
+    void start(bool beginSuspended);
+    /// Opens a suspension, also before the start.
+    /// \error one is open: see above; it goes on
+    void suspend();
+    /// Ends the suspension.
+    /// \error none is open: see above
+    void resume();
+    /// Ends the own measurement and piles it.
+    /// \error the timer has not started: see above; nothing is piled
+    void stop();
+    /// Adds a finished measurement to the statistics and makes it idle. One that was not started is left as it is. Of
+    /// equal measurements the first keeps its place as the longest or the shortest.
+    /// \kept timers-05: a shortest time of 0 ticks counts as none yet, so the next measurement replaces it
+    /// \pre the measurement was stopped: else its elapsed time is negative
+    void addTotal(BaseTimer& finished);
+    /// Clears the own measurement and all statistics; id, checks and name stay.
+    void reset();
+
+    /// Formats one row of a report.
+    ///
+    /// | column | value | last digit at |
+    /// |---|---|---|
+    /// | 0 | name, from the left | |
+    /// | 40 | count | 48 |
+    /// | 50 | total | 63 |
+    /// | 65 | average: the converted total by the count | 78 |
+    /// | 80 | maximum | 93 |
+    /// | 95 | which measurement was the longest, from 1 | 108 |
+    /// | 110 | minimum | 123 |
+    /// | 125 | suspended in total | 138 |
+    /// | 140 | suspended at most, in one measurement | 153 |
+    /// | 155 | nothing | |
+    ///
+    /// Digits come in groups of three (`thousandsSeparator`). With a count of 0 only the name and the count are there.
+    /// \param line  becomes the row, always 156 bytes
+    /// \param unitsPerSecond  the unit of the durations: 1000000 for microseconds; fractions are cut off
+    /// \kept timers-06: a row with a count has a zero byte at column 154
+    /// \kept timers-07: a name of 40 bytes or more runs into the columns behind it, whose digits overwrite it
+    void print(BufStr<255>& line, int unitsPerSecond) const;
+
+    /// The same for a timer that may be null; then they do nothing.
+    static void start(PileTimer* timer, bool beginSuspended);
+    static void stop(PileTimer* timer);
+    static void suspend(PileTimer* timer);
+    static void resume(PileTimer* timer);
+    static void reset(PileTimer* timer);
+
+protected:
+    /// Around each piling. Here they do nothing.
+    virtual void lock();
+    virtual void unlock();
+
+    detail::Statistic<std::int64_t> total_;
+    detail::Statistic<std::int64_t> suspendTotal_;
+    detail::Statistic<std::int64_t> max_;
+    detail::Statistic<std::int64_t> min_; ///< 0: none yet
+    detail::Statistic<std::int64_t> suspendMax_;
+    detail::Statistic<std::uint64_t> count_;
+    std::uint64_t id_ = 0;
+    detail::Statistic<std::uint64_t> maxCount_; ///< the count when max_ was set
+    detail::Statistic<std::uint64_t> minCount_;
+    bool checks_;
+    HeapStr name_;
+};
+
+} // namespace ZOR_Basis
+
+#endif

@@ -1,0 +1,18 @@
+/// \file
+/// `zbTimerDat`: the record of one measurement. C-clean.
+
+#ifndef ZOR_BASIS_TIMERS_TIMER_DAT_H
+#define ZOR_BASIS_TIMERS_TIMER_DAT_H
+
+#include <stdint.h>
+
+/// Times are readings of the performance counter, in ticks. All zero: nothing is being measured, and so it is again after
+/// every end of a measurement.
+typedef struct zbTimerDat {
+    int64_t start;        ///< reading at the start; 0: not started
+    int64_t stop;         ///< reading at the stop
+    int64_t suspendStart; ///< reading where the present suspension began; 0: not suspended
+    int64_t suspended;    ///< ticks of the suspensions that are over
+} zbTimerDat;
+
+#endif

@@ -1,0 +1,136 @@
+/// \file
+/// `TimerMgr`: a named group of pile timers, which it owns, finds by id, switches on and off as a whole, and reports.
+///
+/// Managers are made by `New`, listed in one registry and live as long as the process, and so do their timers. A manager
+/// is inactive at first: nothing is measured through it until `setActive(true)`.
+///
+/// A report is a file in the folder "timer" of the root folder, named SECONDS_MANAGER_RIP.timer: the time in seconds since
+/// 1970 UTC as a signed 32-bit number, the manager's name, and the number that `setRip` gave. It is a head of two lines,
+/// the line of column titles, and a row (`PileTimer::print`, in microseconds) for every timer by rising id.
+///
+///     1700000000_render_0.timer
+///
+/// \kept timers-08: reports of one manager within one second go into one file, each with its own head
+/// \thread  thread-safe, except that lookups by id take no lock: while other threads look timers up, no timer is created
+///     at a new highest id
+
+#ifndef ZOR_BASIS_TIMERS_TIMER_MGR_H
+#define ZOR_BASIS_TIMERS_TIMER_MGR_H
+
+#include "zor_basis/export.h"
+#include "zor_basis/text/char_ops.h"
+
+#include <atomic>
+#include <cstdint>
+
+namespace ZOR_Basis {
+
+class PileTimer;
+class TimerMgrMgr;
+
+class ZB_API TimerMgr {
+public:
+    TimerMgr(TimerMgr const&) = delete;
+    TimerMgr& operator=(TimerMgr const&) = delete;
+
+    /// Makes a timer with its checks on, owned by the manager.
+    /// \param name  copied; null is the empty name
+    /// \param id  its slot; 0: the one behind the last, which in an empty manager is slot 0
+    /// \param forThreads  makes a `PileTimerMT`
+    /// \kept timers-09: a timer that stood in the slot stays alive, for those who use it still, but its manager knows it
+    ///     no longer
+    /// \pre id is not the highest 64-bit number
+    /// \error the slot was taken: assertion "TimerMgr::add() - already registered!" (line 356), then as above
+    virtual PileTimer* createTimer(char const* name, std::uint64_t id, bool forThreads) = 0;
+    /// The timer of a slot; null where there is none.
+    virtual PileTimer* getTimer(std::uint64_t id) = 0;
+    /// Resets all timers, as `PileTimer::reset` does.
+    /// \param print  writes a report first
+    /// \kept timers-10: the timers are reset also where the report cannot be written
+    virtual void resetTimers(bool print) = 0;
+
+    /// The registry of all managers, made at the first use of any manager together with the report folder.
+    static TimerMgrMgr* Mgr();
+    /// Makes a manager, which the registry keeps. Names need not differ.
+    /// \param maxId  unless 0, slots 0 to maxId are reserved: a timer without an id of its own comes behind them
+    /// \pre maxId is not the highest 64-bit number
+    static TimerMgr* New(char const* name, std::uint64_t maxId);
+    /// The first manager of that name; null if there is none, and for null.
+    static TimerMgr* Get(char const* name);
+    /// Sets the number in the names of report files, which is 0 at first.
+    /// \kept timers-11: the first number other than 0 stays for the life of the process
+    static void setRip(int rip);
+
+    /// `createTimer`, and null for null.
+    static PileTimer* create(TimerMgr* manager, char const* name, std::uint64_t id, bool forThreads);
+    /// `getTimer`, and null for null.
+    static PileTimer* get(TimerMgr* manager, std::uint64_t id);
+
+    void setActive(bool active) { active_.store(active, std::memory_order_relaxed); }
+    bool active() const { return active_.load(std::memory_order_relaxed); }
+
+    /// `PileTimer::start(false)`, `stop()`, `suspend()` and `resume()` of the timer in a slot. They do nothing while the
+    /// manager is inactive and where the slot is empty.
+    void start(std::uint64_t id) {
+        if (active()) startSlot(id);
+    }
+    void stop(std::uint64_t id) {
+        if (active()) stopSlot(id);
+    }
+    void suspend(std::uint64_t id) {
+        if (active()) suspendSlot(id);
+    }
+    void resume(std::uint64_t id) {
+        if (active()) resumeSlot(id);
+    }
+    void start(int id) { start(static_cast<std::uint64_t>(id)); }
+    void stop(int id) { stop(static_cast<std::uint64_t>(id)); }
+    void suspend(int id) { suspend(static_cast<std::uint64_t>(id)); }
+    void resume(int id) { resume(static_cast<std::uint64_t>(id)); }
+    template <detail::Index I>
+    void start(I id) {
+        start(static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    void stop(I id) {
+        stop(static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    void suspend(I id) {
+        suspend(static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    void resume(I id) {
+        resume(static_cast<std::uint64_t>(id));
+    }
+    /// The same of a timer given directly; null does nothing.
+    void start(PileTimer* timer);
+    void stop(PileTimer* timer);
+    void suspend(PileTimer* timer);
+    void resume(PileTimer* timer);
+    /// The same by id, for a manager that may be null.
+    static void start(TimerMgr* manager, std::uint64_t id);
+    static void stop(TimerMgr* manager, std::uint64_t id);
+    static void suspend(TimerMgr* manager, std::uint64_t id);
+    static void resume(TimerMgr* manager, std::uint64_t id);
+
+    /// `resetTimers`, unless the manager is inactive.
+    void reset(bool print);
+    static void reset(TimerMgr* manager, bool print);
+
+protected:
+    TimerMgr() = default;
+    virtual ~TimerMgr();
+
+private:
+    void startSlot(std::uint64_t id);
+    void stopSlot(std::uint64_t id);
+    void suspendSlot(std::uint64_t id);
+    void resumeSlot(std::uint64_t id);
+
+    std::atomic<bool> active_{false};
+};
+
+} // namespace ZOR_Basis
+
+#endif

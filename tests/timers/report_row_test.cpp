@@ -1,0 +1,89 @@
+#include "basis/timers/report_row.h"
+
+#include "tests/support/table.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <limits>
+#include <string>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+constexpr std::int64_t LOWEST = std::numeric_limits<std::int64_t>::min();
+constexpr std::int64_t HIGHEST = std::numeric_limits<std::int64_t>::max();
+
+} // namespace
+
+TEST(ReportRow, places_numbers_from_the_right) {
+    struct Case {
+        Row row;
+        std::int64_t value;
+        std::uint64_t end;
+        char separator;
+        bool terminating;
+        std::string line; // "." is a place that was not touched, "0" behind "|" stands for the zero byte
+    };
+    std::string const dots(20, '.');
+    auto const padded = [](std::string text) { return text + std::string(20 - text.size(), '.'); };
+    for (Case const& c : {
+             Case{{}, 0, 12, ',', false, padded("..........0")},
+             Case{{}, 7, 12, ',', false, padded("..........7")},
+             Case{{}, 999, 12, ',', false, padded("........999")},
+             Case{{}, 1000, 12, ',', false, padded("......1,000")},
+             Case{{}, 1234567, 12, ',', false, padded("..1,234,567")},
+             Case{{}, 1234567, 12, '\0', false, padded("....1234567")},
+             Case{{}, 1234567, 12, '\'', false, padded("..1'234'567")},
+             Case{{}, -5, 12, ',', false, padded(".........-5")},
+             Case{{}, -123, 12, ',', false, padded(".......-123")}, // no separator before the sign
+             Case{{}, -1234, 12, ',', false, padded(".....-1,234")},
+             Case{{}, 42, 12, ',', true, padded(std::string(".........42") + '\0')},
+             Case{{}, 12345678, 9, ',', false, padded(".345,678")}, // the first place is never reached
+             Case{{}, 12345678, 9, '\0', false, padded(".2345678")},
+             Case{{}, 1234, 5, ',', false, padded(".234")},
+             Case{{}, 5, 2, ',', false, dots},
+         }) {
+        SCOPED_TRACE(c.row);
+        std::string line = dots;
+        ReportRow::placeNumber(line.data(), c.value, c.end, c.separator, c.terminating);
+        EXPECT_EQ(line, c.line);
+    }
+}
+
+TEST(ReportRow, places_the_extremes) {
+    std::string line(40, '.');
+    ReportRow::placeNumber(line.data(), LOWEST, 40, ',', false);
+    EXPECT_EQ(line, std::string(13, '.') + "-9,223,372,036,854,775,808.");
+    line.assign(40, '.');
+    ReportRow::placeNumber(line.data(), HIGHEST, 40, '\0', false);
+    EXPECT_EQ(line, std::string(20, '.') + "9223372036854775807.");
+}
+
+TEST(ReportRow, converts_ticks_cutting_off_fractions) {
+    struct Case {
+        Row row;
+        std::int64_t ticks;
+        int units;
+        std::int64_t frequency, expected;
+    };
+    for (Case const& c : {
+             Case{{}, 0, 1'000'000, 1'000'000'000, 0},
+             Case{{}, 999, 1'000'000, 1'000'000'000, 0},
+             Case{{}, 1000, 1'000'000, 1'000'000'000, 1},
+             Case{{}, 1999, 1'000'000, 1'000'000'000, 1},
+             Case{{}, -1999, 1'000'000, 1'000'000'000, -1}, // towards zero
+             Case{{}, 123'456'789'012, 1'000'000, 10'000'000, 12'345'678'901},
+             Case{{}, 10, 1'000'000, 3, 3'333'333},
+             Case{{}, -10, 1'000'000, 3, -3'333'333},
+             Case{{}, HIGHEST, 1'000'000, 1'000'000'000, 9'223'372'036'854'775}, // without overflow on the way
+             Case{{}, LOWEST, 1'000'000, 1'000'000'000, -9'223'372'036'854'775},
+             Case{{}, HIGHEST, 1'000'000'000, 1'000'000'000, HIGHEST},
+             Case{{}, 5, -2, 1, -10},
+             Case{{}, 5, 0, 1, 0},
+         }) {
+        SCOPED_TRACE(c.row);
+        EXPECT_EQ(ReportRow::convert(c.ticks, c.units, c.frequency), c.expected);
+    }
+}

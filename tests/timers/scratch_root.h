@@ -1,0 +1,11 @@
+/// \file
+/// A root folder for the whole test program, empty at its start and gone at its end.
+
+#ifndef TESTS_TIMERS_SCRATCH_ROOT_H
+#define TESTS_TIMERS_SCRATCH_ROOT_H
+
+#include <filesystem>
+
+std::filesystem::path const& scratchRoot();
+
+#endif
