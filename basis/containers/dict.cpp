@@ -32,8 +32,9 @@ void load(IFile& file, SngList<DictEntry<Blob, Blob>>& list) {
         if (entry == nullptr) {
             // kept dict-03: the steps of storing a key put each before the others.
             list.insertFront(new Unit{nullptr, Entry(empty)});
-            entry = index.place() = &list.first()->value;
+            entry = &list.first()->value;
             entry->key.copy(key.size, key.place);
+            index.add(entry);
         }
         if (!isValue(entry->value, value)) entry->value.copy(value.size, value.place);
     }

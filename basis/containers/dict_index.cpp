@@ -5,7 +5,8 @@
 namespace ZOR_Basis {
 namespace {
 
-constexpr std::uint64_t FIRST_SLOTS = 64;
+constexpr std::uint64_t FIRST_SLOTS = 256;
+constexpr std::uint64_t GROWTH = 4;
 /// Odd, and half of its bits set, so that a product mixes all that is below into its upper bits.
 constexpr std::uint64_t MIXER = 0x9E3779B97F4A7C15;
 
@@ -14,7 +15,7 @@ std::uint64_t mix(std::uint64_t hash, std::uint64_t word) {
     return hash ^ hash >> 32;
 }
 
-std::uint64_t hashOf(RecordBytes key) {
+std::uint32_t hashOf(RecordBytes key) {
     std::uint64_t hash = key.size;
     std::uint64_t at = 0;
     std::uint64_t word = 0;
@@ -24,7 +25,7 @@ std::uint64_t hashOf(RecordBytes key) {
     }
     word = 0;
     std::memcpy(&word, key.place + at, key.size - at);
-    return mix(mix(hash, word), 0);
+    return static_cast<std::uint32_t>(mix(mix(hash, word), 0));
 }
 
 bool isKey(Blob const& blob, RecordBytes key) {
@@ -34,32 +35,34 @@ bool isKey(Blob const& blob, RecordBytes key) {
 } // namespace
 
 DictIndex::Entry* DictIndex::find(RecordBytes key) {
-    if (2 * used_ >= mask_) grow();
-    std::uint64_t const hash = hashOf(key);
-    std::uint64_t at = hash & mask_;
-    for (; slots_[at].entry != nullptr; at = (at + 1) & mask_) {
-        if (slots_[at].hash == hash && isKey(slots_[at].entry->key, key)) return slots_[at].entry;
+    if (slots_.empty()) grow();
+    hash_ = hashOf(key);
+    for (std::uint64_t at = hash_ & mask_; slots_[at].number != 0; at = (at + 1) & mask_) {
+        if (slots_[at].hash != hash_) continue;
+        Entry* const entry = entries_[slots_[at].number - 1];
+        if (isKey(entry->key, key)) return entry;
     }
-    slots_[at].hash = hash;
-    free_ = at;
-    ++used_;
     return nullptr;
 }
 
-std::uint64_t DictIndex::freeSlot(std::uint64_t hash) const {
+void DictIndex::add(Entry* entry) {
+    entries_.push_back(entry);
+    freeSlot(hash_) = {hash_, static_cast<std::uint32_t>(entries_.size())};
+    if (2 * entries_.size() > slots_.size()) grow();
+}
+
+DictIndex::Slot& DictIndex::freeSlot(std::uint32_t hash) {
     std::uint64_t at = hash & mask_;
-    while (slots_[at].entry != nullptr) at = (at + 1) & mask_;
-    return at;
+    while (slots_[at].number != 0) at = (at + 1) & mask_;
+    return slots_[at];
 }
 
 void DictIndex::grow() {
-    std::unique_ptr<Slot[]> const old = std::move(slots_);
-    std::uint64_t const oldCount = old != nullptr ? mask_ + 1 : 0;
-    std::uint64_t const count = old != nullptr ? 2 * oldCount : FIRST_SLOTS;
-    slots_ = std::make_unique<Slot[]>(count);
-    mask_ = count - 1;
-    for (std::uint64_t i = 0; i < oldCount; ++i) {
-        if (old[i].entry != nullptr) slots_[freeSlot(old[i].hash)] = old[i];
+    std::vector<Slot> old(slots_.empty() ? FIRST_SLOTS : GROWTH * slots_.size());
+    old.swap(slots_);
+    mask_ = slots_.size() - 1;
+    for (Slot const& slot : old) {
+        if (slot.number != 0) freeSlot(slot.hash) = slot;
     }
 }
 

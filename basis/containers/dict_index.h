@@ -5,10 +5,10 @@
 #define BASIS_CONTAINERS_DICT_INDEX_H
 
 #include "basis/containers/dict_records.h"
-#include "zor_basis/containers/dict.h"
+#include "zor_basis/containers/dict_entry.h"
 
 #include <cstdint>
-#include <memory>
+#include <vector>
 
 namespace ZOR_Basis {
 
@@ -16,24 +16,25 @@ class DictIndex {
 public:
     using Entry = DictEntry<Blob, Blob>;
 
-    /// The entry of a key, or null after making place for it; the caller then gives `place()` its entry.
+    /// The entry of a key; null if it has none yet, and then the caller makes it and calls `add`.
     Entry* find(RecordBytes key);
-    /// Where the entry of a key that was not found belongs. \pre `find` has just given null
-    Entry*& place() { return slots_[free_].entry; }
+    /// Takes the entry of the key that `find` has just not found.
+    void add(Entry* entry);
 
 private:
+    /// Small, as the table is what the processor's cache has to hold. There are fewer than 2^32 entries in any memory.
     struct Slot {
-        std::uint64_t hash;
-        Entry* entry;
+        std::uint32_t hash;
+        std::uint32_t number; // of the entry, from 1; 0: free
     };
 
     void grow();
-    std::uint64_t freeSlot(std::uint64_t hash) const;
+    Slot& freeSlot(std::uint32_t hash);
 
-    std::unique_ptr<Slot[]> slots_;
+    std::vector<Slot> slots_;
+    std::vector<Entry*> entries_;
     std::uint64_t mask_ = 0;
-    std::uint64_t used_ = 0;
-    std::uint64_t free_ = 0;
+    std::uint32_t hash_ = 0; // of the key that was asked for last
 };
 
 } // namespace ZOR_Basis

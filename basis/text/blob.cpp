@@ -23,6 +23,7 @@ int compareBytes(char const* a, char const* b, std::uint64_t n) { return n != 0 
 } // namespace
 
 void Blob::freeBuf() {
+    if (buffer_ == nullptr) return;
     std::free(buffer_);
     buffer_ = nullptr;
 }
@@ -42,7 +43,7 @@ char* Blob::makeBlock(std::uint64_t n, std::uint64_t kept) const {
 }
 
 void Blob::replaceBlock(char* block, std::uint64_t n) {
-    freeBuf();
+    if (buffer_ != nullptr) freeBuf();
     buffer_ = block;
     capacity_ = n;
 }

@@ -5,6 +5,7 @@
 #define ZOR_BASIS_CONTAINERS_H
 
 #include "zor_basis/containers/dict.h"
+#include "zor_basis/containers/dict_entry.h"
 #include "zor_basis/containers/hashed_str.h"
 #include "zor_basis/containers/hashing.h"
 #include "zor_basis/containers/ptr_array.h"

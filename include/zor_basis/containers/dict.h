@@ -1,5 +1,5 @@
 /// \file
-/// `Dict<Blob, Blob>`: a small dictionary of byte strings, kept in one file. `DictEntry`: one key with its value.
+/// `Dict<Blob, Blob>`: a small dictionary of byte strings, kept in one file.
 ///
 /// In memory it is a list of entries with different keys, the one that was added last at the front; every look-up goes
 /// through the list. The file is nothing but the entries, each a key and a value in the stored form of a `Blob`, so files
@@ -16,40 +16,13 @@
 #ifndef ZOR_BASIS_CONTAINERS_DICT_H
 #define ZOR_BASIS_CONTAINERS_DICT_H
 
+#include "zor_basis/containers/dict_entry.h"
 #include "zor_basis/containers/sng_list.h"
 #include "zor_basis/export.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text/blob.h"
 
-#include <cstdint>
-
 namespace ZOR_Basis {
-
-template <class K, class V>
-class DictEntry {
-public:
-    /// With an empty value.
-    DictEntry(K const& newKey) : key(newKey) {}
-    DictEntry(K const& newKey, V const& newValue) : key(newKey), value(newValue) {}
-    DictEntry(DictEntry const& other) = default;
-    DictEntry(DictEntry&& other) = default;
-    DictEntry& operator=(DictEntry const& other) = default;
-    DictEntry& operator=(DictEntry&& other) = default;
-
-    bool eq(K const& other) const { return key == other; }
-    /// Copies a value, unless it is the entry's own.
-    void set(V const& other) {
-        if (&other != &value) value = other;
-    }
-
-    /// Whether key or value differ.
-    bool operator!=(DictEntry const& other) const { return key != other.key || value != other.value; }
-    /// Orders by the keys alone.
-    bool operator<(DictEntry const& other) const { return key < other.key; }
-
-    K key;
-    V value;
-};
 
 template <class K, class V>
 class Dict : public SngList<DictEntry<K, V>> {
@@ -103,8 +76,6 @@ private:
 };
 
 ZB_EXTERN_TEMPLATE Dict<Blob, Blob>;
-
-static_assert(sizeof(DictEntry<Blob, Blob>) == 2 * sizeof(Blob));
 
 } // namespace ZOR_Basis
 
