@@ -27,8 +27,8 @@
 ///     links, devices, and what has gone meanwhile
 /// \kept walk-03: walks neither report nor enter an entry of the exact name "__MACOS"; the flat listing gives it
 /// \kept walk-04: sub-directories are entered whatever the wildcard and the condition say of them
-/// \kept walk-05: the result of a walk is that of its last `perform`, a deep walk's that of its last sub-directory: without
-///     `stopOnFalse` a later success hides a failure, and a last sub-directory without entries makes it true
+/// \kept walk-05: the result is that of the last `perform`, so that without `stopOnFalse` a later success hides a failure; a
+///     deep walk's is that of its last sub-directory, true without one: it is true unless `stopOnFalse` or `stop` ends it
 /// \kept walk-06: a directory that cannot be opened is empty: a walk of it is true, and calls the visitor never
 ///
 /// \thread  one thread at a time
