@@ -181,13 +181,14 @@ TEST_F(VisitorsTest, Kept_walk_10_linking_takes_the_source_first_and_what_is_the
     std::string const src = scratch / "src/a";
     std::string const dst = scratch / "dst/x";
     EXPECT_TRUE(zbLinkOrCopy(src.c_str(), dst.c_str(), false));
-    EXPECT_EQ(std::filesystem::hard_link_count(src), 2u);
+    put(dst, "via");
+    EXPECT_EQ(textOf(src), "via") << "one file of two names";
     put(scratch / "src/other", "other");
     EXPECT_TRUE(zbLinkOrCopy((scratch / "src/other").c_str(), dst.c_str(), false));
-    EXPECT_EQ(textOf(dst), "aa");
+    EXPECT_EQ(textOf(dst), "via");
     EXPECT_TRUE(zbLinkOrCopy((scratch / "src/other").c_str(), dst.c_str(), true));
     EXPECT_EQ(textOf(dst), "other");
-    EXPECT_EQ(textOf(src), "aa");
+    EXPECT_EQ(textOf(src), "via");
 }
 
 TEST_F(VisitorsTest, linking_copies_where_there_are_no_links) {
@@ -196,7 +197,8 @@ TEST_F(VisitorsTest, linking_copies_where_there_are_no_links) {
     ASSERT_EQ(xos_HostFail("xos_FileHardLink", 0, 1), 0);
     EXPECT_TRUE(zbLinkOrCopy(src.c_str(), dst.c_str(), true));
     EXPECT_EQ(textOf(dst), "aa");
-    EXPECT_EQ(std::filesystem::hard_link_count(src), 1u);
+    put(dst, "own");
+    EXPECT_EQ(textOf(src), "aa");
     ASSERT_EQ(xos_HostFail("xos_FileHardLink", 0, 1), 0);
     ASSERT_EQ(xos_HostFail("xos_FileCopy", 0, 1), 0);
     EXPECT_FALSE(zbLinkOrCopy(src.c_str(), (scratch / "dst/y").c_str(), true));
