@@ -1,0 +1,22 @@
+#include "zor_basis/walk/file_count_visitor.h"
+
+#include "zor_basis/walk/file_iterator.h"
+
+namespace ZOR_Basis {
+
+bool FileCountVisitor::perform(FileEntry* /*entry*/) {
+    ++count_;
+    return true;
+}
+
+bool FileCountVisitor::stop() {
+    // kept walk-08: the count has 32 bits and is what callers read, so a limit beyond it means nothing to them.
+    return limit_ != 0 && count_ >= static_cast<std::int32_t>(static_cast<std::uint32_t>(limit_));
+}
+
+int FileCountVisitor::Get(Str const& path, LookForType type, std::uint64_t limit) {
+    FileCountVisitor counter(limit);
+    return FileIterator(path, type, nullptr, nullptr).doIt(&counter, false, false) ? counter.total() : -1;
+}
+
+} // namespace ZOR_Basis

@@ -1,0 +1,25 @@
+/// \file
+/// What copying and moving an entry into a directory have in common.
+
+#ifndef BASIS_WALK_TRANSFER_H
+#define BASIS_WALK_TRANSFER_H
+
+#include "zor_basis/files/f_path.h"
+#include "zor_basis/files/file_entry.h"
+
+namespace ZOR_Basis {
+
+/// Both names of one transfer.
+struct Transfer {
+    Transfer(FileEntry const& entry, FPath const& target);
+
+    FPath source;
+    FPath destination;
+};
+
+/// Whether an entry lies in the target already, by the text of its directory.
+bool isAtTarget(FileEntry const& entry, FPath const& target);
+
+} // namespace ZOR_Basis
+
+#endif

@@ -1,0 +1,40 @@
+/// \file
+/// `FileCountVisitor`: counts the entries that a walk reports.
+
+#ifndef ZOR_BASIS_WALK_FILE_COUNT_VISITOR_H
+#define ZOR_BASIS_WALK_FILE_COUNT_VISITOR_H
+
+#include "zor_basis/export.h"
+#include "zor_basis/files/look_for_type.h"
+#include "zor_basis/text/str.h"
+#include "zor_basis/walk/file_visitor.h"
+
+#include <cstdint>
+
+namespace ZOR_Basis {
+
+/// \thread  the walking thread
+class ZB_API FileCountVisitor : public FileVisitor {
+public:
+    /// \param limit  ends the walk when so many are counted; 0: never
+    /// \kept walk-08: the low 32 bits of the limit are compared, with a sign, so that one of 2^31 or 2^32 ends the walk
+    ///     before its first entry
+    FileCountVisitor(std::uint64_t limit) : limit_(limit) {}
+
+    /// Counts. \return true
+    bool perform(FileEntry* entry) override;
+    bool stop() override;
+    int total() const { return count_; }
+
+    /// Counts one directory's own entries, of the kinds that a walk has for the type.
+    /// \return at most the limit; 0 for a directory that is missing; -1 when the walk fails
+    static int Get(Str const& path, LookForType type, std::uint64_t limit);
+
+private:
+    std::uint64_t limit_;
+    std::int32_t count_ = 0;
+};
+
+} // namespace ZOR_Basis
+
+#endif
