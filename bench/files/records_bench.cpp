@@ -4,11 +4,13 @@
 #include <zor_basis/files/i_file.h>
 #include <zor_basis/text/blob.h>
 
+#include "bench/files/tape.h"
+
 #include <benchmark/benchmark.h>
 
-#include <cstring>
 #include <filesystem>
 #include <fstream>
+#include <memory>
 #include <string>
 #include <unistd.h>
 #include <unordered_map>
@@ -127,31 +129,6 @@ BENCHMARK(loadStandard<1'000>)->Name("dict/load/1000-records/unordered_map");
 BENCHMARK(loadOurs<10'000>)->Name("dict/load/10000-records/ours");
 BENCHMARK(loadStandard<10'000>)->Name("dict/load/10000-records/unordered_map");
 
-/// A file in memory that gives and takes the same bytes again and again. Nobody gets its calls inlined.
-class Tape final : public IFile {
-public:
-    [[gnu::noinline]] std::uint64_t read(void* buffer, std::uint64_t n) override {
-        std::memcpy(buffer, bytes_.data() + at_, n);
-        at_ += n;
-        return n;
-    }
-    [[gnu::noinline]] std::uint64_t write(void const* buffer, std::uint64_t n) override {
-        std::memcpy(bytes_.data() + at_, buffer, n);
-        at_ += n;
-        return n;
-    }
-    bool flush() override { return true; }
-    std::int64_t seek(int, int) override {
-        at_ = 0;
-        return 0;
-    }
-    bool isOpen() override { return true; }
-
-private:
-    std::vector<char> bytes_ = std::vector<char>(1 << 20);
-    std::uint64_t at_ = 0;
-};
-
 std::string const text(16 * 1024, 'x');
 
 // What a program would write for itself: functions, as ours are.
@@ -193,8 +170,8 @@ void appendVector(benchmark::State& state) {
 
 template <std::size_t N>
 void writeOurs(benchmark::State& state) {
-    Tape tape;
-    IFile* file = &tape;
+    std::unique_ptr<IFile> const tape = makeTape();
+    IFile* file = tape.get();
     Blob const bytes(N, text.data());
     for (auto _ : state) {
         benchmark::DoNotOptimize(file);
@@ -206,8 +183,8 @@ void writeOurs(benchmark::State& state) {
 
 template <std::size_t N>
 void writeVector(benchmark::State& state) {
-    Tape tape;
-    IFile* file = &tape;
+    std::unique_ptr<IFile> const tape = makeTape();
+    IFile* file = tape.get();
     std::vector<char> const bytes(text.data(), text.data() + N);
     for (auto _ : state) {
         benchmark::DoNotOptimize(file);
@@ -219,8 +196,8 @@ void writeVector(benchmark::State& state) {
 
 template <std::size_t N>
 void readOurs(benchmark::State& state) {
-    Tape tape;
-    IFile* file = &tape;
+    std::unique_ptr<IFile> const tape = makeTape();
+    IFile* file = tape.get();
     Blob(N, text.data()).write(file);
     for (auto _ : state) {
         benchmark::DoNotOptimize(file);
@@ -234,8 +211,8 @@ void readOurs(benchmark::State& state) {
 
 template <std::size_t N>
 void readVector(benchmark::State& state) {
-    Tape tape;
-    IFile* file = &tape;
+    std::unique_ptr<IFile> const tape = makeTape();
+    IFile* file = tape.get();
     Blob(N, text.data()).write(file);
     for (auto _ : state) {
         benchmark::DoNotOptimize(file);

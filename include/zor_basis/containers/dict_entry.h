@@ -13,13 +13,13 @@ namespace ZOR_Basis {
 template <class K, class V>
 class DictEntry {
 public:
-    /// With an empty value.
+    /// With an empty value. A moved entry is copied, as blobs are.
     DictEntry(K const& newKey) : key(newKey) {}
     DictEntry(K const& newKey, V const& newValue) : key(newKey), value(newValue) {}
     DictEntry(DictEntry const& other) = default;
-    DictEntry(DictEntry&& other) = default;
+    DictEntry(DictEntry&& other) noexcept = default;
     DictEntry& operator=(DictEntry const& other) = default;
-    DictEntry& operator=(DictEntry&& other) = default;
+    DictEntry& operator=(DictEntry&& other) noexcept = default;
 
     bool eq(K const& other) const { return key == other; }
     /// Copies a value, unless it is the entry's own.
