@@ -21,8 +21,7 @@ inline std::uint64_t lengthOfLine(char const* text, std::uint64_t limit) {
     __m128i const carriageReturn = _mm_set1_epi8('\r');
     for (; limit - length >= sizeof(__m128i); length += sizeof(__m128i)) {
         __m128i const bytes = _mm_loadu_si128(reinterpret_cast<__m128i const*>(text + length));
-        __m128i const lineEnds =
-            _mm_or_si128(_mm_cmpeq_epi8(bytes, lineFeed), _mm_cmpeq_epi8(bytes, carriageReturn));
+        __m128i const lineEnds = _mm_or_si128(_mm_cmpeq_epi8(bytes, lineFeed), _mm_cmpeq_epi8(bytes, carriageReturn));
         __m128i const ends = _mm_or_si128(lineEnds, _mm_cmpeq_epi8(bytes, _mm_setzero_si128()));
         auto const found = static_cast<unsigned>(_mm_movemask_epi8(ends));
         if (found != 0) return length + static_cast<unsigned>(std::countr_zero(found));

@@ -26,8 +26,7 @@ int signalDescriptor(int process, int signal) {
 
 } // namespace
 
-ProcessCalls processCalls{posix_spawn, posix_spawnp,     waitid, openProcess,
-                          poll,        signalDescriptor, kill,   close};
+ProcessCalls processCalls{posix_spawn, posix_spawnp, waitid, openProcess, poll, signalDescriptor, kill, close};
 
 namespace {
 

@@ -108,7 +108,8 @@ void memchrLines(benchmark::State& state) {
         char const* at = all.data();
         char const* const end = at + all.size();
         while (at != end) {
-            auto const* const lineEnd = static_cast<char const*>(std::memchr(at, '\n', static_cast<std::size_t>(end - at)));
+            auto const* const lineEnd =
+                static_cast<char const*>(std::memchr(at, '\n', static_cast<std::size_t>(end - at)));
             if (lineEnd == nullptr) std::abort();
             auto const length = static_cast<std::size_t>(lineEnd - at);
             std::memcpy(line, at, length);

@@ -22,8 +22,12 @@ struct Function {
     int (*call)();
 };
 
-constexpr Function FUNCTIONS[] = {{"set", setVDPFlagsFromCFG}, {"loaded", isVDPFlagsSetFromCFG}, {"vdp", isVDPON},
-                                  {"vps", isVPSON},            {"qdb", isQDBON},                 {"vipp", isVIPPON},
+constexpr Function FUNCTIONS[] = {{"set", setVDPFlagsFromCFG},
+                                  {"loaded", isVDPFlagsSetFromCFG},
+                                  {"vdp", isVDPON},
+                                  {"vps", isVPSON},
+                                  {"qdb", isQDBON},
+                                  {"vipp", isVIPPON},
                                   {"ppml", isPPMLON}};
 
 bool callFunction(char const* step) {

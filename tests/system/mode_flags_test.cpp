@@ -95,8 +95,7 @@ TEST_F(ModeFlags, are_read_anew_when_that_is_asked_for) {
 }
 
 TEST_F(ModeFlags, are_asked_of_the_platform_so) {
-    EXPECT_EQ(after({"set", "last"}, configured("a", "")),
-              "0\nload \"vdp\", 0, 0, 0\nreading \"qdb\", 0\nrelease 0\n");
+    EXPECT_EQ(after({"set", "last"}, configured("a", "")), "0\nload \"vdp\", 0, 0, 0\nreading \"qdb\", 0\nrelease 0\n");
 }
 
 TEST_F(ModeFlags, are_on_where_the_group_cannot_be_loaded) {

@@ -64,7 +64,8 @@ TEST(ParseAtThePagesEnd, reads_no_byte_outside_of_the_text) {
                 lines.skipBlanks();
                 ASSERT_TRUE(lines.isDataEnd());
                 ASSERT_FALSE(parse().checkLine("y"));
-                ASSERT_EQ(parse().checkLine(std::string(size, 'x').c_str()), size <= 256 && (*end != ' ' || size == 256));
+                ASSERT_EQ(parse().checkLine(std::string(size, 'x').c_str()),
+                          size <= 256 && (*end != ' ' || size == 256));
                 FPath path;
                 ASSERT_FALSE(parse().getCleanFileName(path, false, true));
                 ASSERT_EQ(path.size(), std::min<std::size_t>(255, size + (*end == ' ' ? 1 : 0)));

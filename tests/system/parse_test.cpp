@@ -25,8 +25,8 @@ constexpr char UNTOUCHED = '\x7F';
 class Scanner {
 public:
     explicit Scanner(std::string_view text)
-        : text_(new char[text.size()]), parse_((std::copy(text.begin(), text.end(), text_.get()), text_.get()),
-                                               static_cast<int>(text.size())) {}
+        : text_(new char[text.size()]),
+          parse_((std::copy(text.begin(), text.end(), text_.get()), text_.get()), static_cast<int>(text.size())) {}
     ZB_Parse* operator->() { return &parse_; }
 
     struct Line {
@@ -136,7 +136,8 @@ TEST(ParseGetLine, finds_an_end_wherever_it_stands) {
             for (std::size_t behind : {0U, 1U, 40U}) {
                 std::string const line(before, 'x');
                 Scanner scanner(line + end + std::string(behind, 'y'));
-                ASSERT_EQ(scanner.getLine(200), (Line{end != '\0', line})) << before << ' ' << int(end) << ' ' << behind;
+                ASSERT_EQ(scanner.getLine(200), (Line{end != '\0', line}))
+                    << before << ' ' << int(end) << ' ' << behind;
             }
         }
     }

@@ -155,8 +155,8 @@ TEST_F(ProcessWinCalls, wait) {
 
 TEST_F(ProcessWinCalls, terminate) {
     EXPECT_TRUE(Process::Terminate(77));
-    EXPECT_EQ(calls, (Calls{"open " + std::to_string(PROCESS_TERMINATE) + " 0 77", "terminate process 0",
-                            "close process"}));
+    EXPECT_EQ(calls,
+              (Calls{"open " + std::to_string(PROCESS_TERMINATE) + " 0 77", "terminate process 0", "close process"}));
     calls.clear();
     works = false;
     EXPECT_FALSE(Process::Terminate(77));

@@ -28,8 +28,8 @@ struct UrlGet : testing::Test {
     std::string page() const { return server.url("/page"); }
     static std::string quoted(std::string const& text) { return '"' + text + '"'; }
 
-    HttpServer const server{{{"/page", always(answer("200 OK", "the page"))},
-                             {"/gone", always(answer("404 Not Found", "no page"))}}};
+    HttpServer const server{
+        {{"/page", always(answer("200 OK", "the page"))}, {"/gone", always(answer("404 Not Found", "no page"))}}};
     Scratch scratch;
 };
 

@@ -28,7 +28,8 @@ struct TempDirs : testing::Test {
             run({"temp_dir_child", steps, {{"XOS_ROOT", root.path()}, {"XOS_FAULTS", faults}}, root.path()});
         EXPECT_EQ(result.exitCode, 0);
         std::string text = result.output;
-        for (std::size_t i; (i = text.find(root.path())) != std::string::npos;) text.replace(i, root.path().size(), "ROOT");
+        for (std::size_t i; (i = text.find(root.path())) != std::string::npos;)
+            text.replace(i, root.path().size(), "ROOT");
         return text;
     }
     void makeShared(std::string const& path) const { makeFolder(root / ("tmp/vdp_tmp/" + path)); }
@@ -93,7 +94,8 @@ TEST_F(TempDirs, Kept_temp_01_keep_the_first_positive_number) {
              Case{{}, {"init=0", "init=0", "init=-1", "init=4", "init=5", "make"}, "ROOT/tmp/vdp_tmp/1.r4\n"},
              Case{{}, {"make", "init=0", "make"}, "ROOT/tmp/1.r\nROOT/tmp/2.r\n"},
              // The numbers go on.
-             Case{{}, {"make", "init=4", "make", "init=0", "make"},
+             Case{{},
+                  {"make", "init=4", "make", "init=0", "make"},
                   "ROOT/tmp/1.r\nROOT/tmp/vdp_tmp/2.r4\nROOT/tmp/vdp_tmp/3.r4\n"},
          }) {
         SCOPED_TRACE(c.row);
@@ -192,8 +194,7 @@ TEST_F(TempDirs, are_made_without_semaphores_too) {
                               "xos_FileStatByNameEx:0:9"}) {
         SCOPED_TRACE(fault);
         EXPECT_EQ(after({"make", "make"}, fault), "ROOT/tmp/1.r\nROOT/tmp/2.r\n");
-        EXPECT_EQ(after({"init=2", "init=3", "make", "make"}, fault),
-                  "ROOT/tmp/vdp_tmp/1.r2\nROOT/tmp/vdp_tmp/2.r2\n");
+        EXPECT_EQ(after({"init=2", "init=3", "make", "make"}, fault), "ROOT/tmp/vdp_tmp/1.r2\nROOT/tmp/vdp_tmp/2.r2\n");
     }
 }
 
@@ -209,8 +210,7 @@ TEST_F(TempDirs, stay_where_they_cannot_be_removed) {
 
 TEST_F(TempDirs, begin_in_what_is_there_where_the_first_instance_cannot_clear_it) {
     makeShared("1.r1/old");
-    EXPECT_EQ(after({"init=1", "make", "make"}, "xos_DirRemove:0:1"),
-              "ROOT/tmp/vdp_tmp/1.r1\nROOT/tmp/vdp_tmp/2.r1\n");
+    EXPECT_EQ(after({"init=1", "make", "make"}, "xos_DirRemove:0:1"), "ROOT/tmp/vdp_tmp/1.r1\nROOT/tmp/vdp_tmp/2.r1\n");
 }
 
 TEST_F(TempDirs, ask_the_platform_for_one_mutex_of_all_processes) {
