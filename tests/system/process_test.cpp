@@ -184,6 +184,7 @@ TEST_F(ProcessTest, finds_a_function_that_works) {
 TEST_F(ProcessTest, loads_no_library_that_is_not_there) {
     EXPECT_EQ(Process::loadLib("zb_no_such_library"), nullptr);
     EXPECT_EQ(Process::loadLib(""), nullptr);
+    EXPECT_EQ(Process::loadLib(nullptr), nullptr);
     xos_HostFail("xos_LibraryLoad", 0, 1);
     EXPECT_EQ(Process::loadLib(LIBRARY), nullptr);
 }

@@ -12,10 +12,10 @@ class ZB_API Url {
 public:
     Url() = default;
     Url(Url const&) = default;
-    Url(Url&&) = default;
+    Url(Url&&) noexcept = default;
     /// There is nothing to assign.
     Url& operator=(Url const&) { return *this; }
-    Url& operator=(Url&&) { return *this; }
+    Url& operator=(Url&&) noexcept { return *this; }
 
     /// Fetches into a file, through the platform layer, which decides which URLs it can fetch.
     /// \param target  the file's path
