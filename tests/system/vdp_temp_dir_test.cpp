@@ -221,6 +221,24 @@ TEST_F(TempDirs, ask_the_platform_for_one_mutex_of_all_processes) {
               "ROOT/tmp/vdp_tmp/1.r2\nROOT/tmp/vdp_tmp/2.r2\n1\n1\n\"ROOT/tmp/vdp_tmp/2.r2\", 0\n");
 }
 
+TEST_F(TempDirs, ask_nobody_where_a_folder_has_been_chosen) {
+    EXPECT_EQ(after({"make", "init=0", "calls=xos_SemNamedMutexCreate"}), "ROOT/tmp/1.r\n1\n");
+    EXPECT_EQ(after({"init=0", "init=0", "calls=xos_SemNamedMutexCreate"}), "1\n");
+    // Without a semaphore it takes a look at what has been chosen, and leaves it at that.
+    EXPECT_EQ(
+        after({"init=0", "init=0", "calls=xos_SemNamedMutexCreate", "calls=xos_SemMCreate"}, "xos_SemMCreate:0:9"),
+        "2\n1\n");
+}
+
+TEST_F(TempDirs, are_made_by_one_thread_at_a_time) {
+    Steps const calls = {"calls=xos_SemTake", "calls=xos_SemGive"};
+    Steps steps = {"make"};
+    steps.insert(steps.end(), calls.begin(), calls.end());
+    steps.push_back("make");
+    steps.insert(steps.end(), calls.begin(), calls.end());
+    EXPECT_EQ(after(steps), "ROOT/tmp/1.r\n2\n2\nROOT/tmp/2.r\n3\n3\n");
+}
+
 TEST_F(TempDirs, Kept_temp_03_try_until_a_folder_can_be_made) {
     put(root / "tmp", "a file where the folder would be");
     std::string const made = after({"unblock=" + (root / "tmp"), "make"});
