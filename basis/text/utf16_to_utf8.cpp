@@ -51,9 +51,7 @@ ZB_SHUFFLE_TARGET inline unsigned storeMixedBlock(__m128i block, char* out) {
 }
 
 struct WithShuffle {
-    ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) {
-        return storeMixedBlock(block, out);
-    }
+    ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
 };
 struct WithoutShuffle {
     ZB_IN_CALLER static unsigned storeMixed(__m128i, char*) { return 0; }

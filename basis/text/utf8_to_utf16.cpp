@@ -71,9 +71,7 @@ ZB_SHUFFLE_TARGET inline Taken takeMixedBlock(__m128i block, WChar* out) {
 }
 
 struct WithShuffle {
-    ZB_SHUFFLE_TARGET static Taken takeMixed(__m128i block, WChar* out) {
-        return takeMixedBlock(block, out);
-    }
+    ZB_SHUFFLE_TARGET static Taken takeMixed(__m128i block, WChar* out) { return takeMixedBlock(block, out); }
 };
 struct WithoutShuffle {
     ZB_IN_CALLER static Taken takeMixed(__m128i, WChar*) { return {0, 0}; }

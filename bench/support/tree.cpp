@@ -25,8 +25,8 @@ std::string makeTree(std::string const& path) {
     }
     std::string const content(LARGEST, 'x');
     for (int i = 0; i < SOURCE_FILES; ++i) {
-        std::ofstream{folders[static_cast<std::size_t>(i % SOURCE_FOLDERS)] + "/document-" + std::to_string(i) + ".txt"}.write(
-            content.data(), static_cast<std::streamsize>(random() % (LARGEST + 1)));
+        std::ofstream{folders[static_cast<std::size_t>(i % SOURCE_FOLDERS)] + "/document-" + std::to_string(i) + ".txt"}
+            .write(content.data(), static_cast<std::streamsize>(random() % (LARGEST + 1)));
     }
     return path;
 }

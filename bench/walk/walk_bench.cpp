@@ -166,7 +166,8 @@ void jobVerifyOurs(benchmark::State& state) {
     copyOurs(workplace() / "copy", sourceTree());
     for (auto _ : state) {
         Verifier verifier;
-        expect(state, FileIterator::doIt(Str(sourceTree()), LOOK_FILES, &verifier, nullptr, nullptr, true, true, false));
+        expect(state,
+               FileIterator::doIt(Str(sourceTree()), LOOK_FILES, &verifier, nullptr, nullptr, true, true, false));
     }
     fs::remove_all(workplace() / "copy");
 }

@@ -36,7 +36,8 @@ bool writePages(FPath const& folder) {
 bool writeBinary(FPath const& path, std::uint64_t size, std::mt19937& source) {
     BufStr<255> bytes;
     bytes.extendBuf(size);
-    for (std::uint64_t i = 0; i < size; ++i) bytes.getBuf()[i] = static_cast<char>(source() | 1); // no zero ends the text
+    for (std::uint64_t i = 0; i < size; ++i)
+        bytes.getBuf()[i] = static_cast<char>(source() | 1); // no zero ends the text
     bytes.resize(size);
     return write(path, bytes);
 }

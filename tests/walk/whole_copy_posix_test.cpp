@@ -19,7 +19,9 @@ TEST(WholeCopyOnLinux, differs_in_nothing_that_diff_sees) {
     makeFolder(source);
     makeFolder(copy);
     fillRandomly(source, 3, random);
-    put(source + "/Gr\xC3\xBC\xC3\x9F" "e", "x");
+    put(source + "/Gr\xC3\xBC\xC3\x9F"
+                 "e",
+        "x");
     put(source + "/not \xFF UTF-8", "x");
     put(source + "/" + std::string(255, 'n'), "x");
     put(source + "/read only", "x");

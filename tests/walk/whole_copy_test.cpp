@@ -56,7 +56,6 @@ TEST_F(WholeCopy, replaces_an_older_one_whole) {
 TEST_F(WholeCopy, leaves_nothing_when_it_is_removed) {
     EXPECT_TRUE(copy(false));
     FileDeleteVisitor remover;
-    EXPECT_TRUE(
-        FileIterator((scratch / "copy").c_str(), LOOK_BOTH, nullptr, nullptr).doIt(&remover, false, true));
+    EXPECT_TRUE(FileIterator((scratch / "copy").c_str(), LOOK_BOTH, nullptr, nullptr).doIt(&remover, false, true));
     EXPECT_EQ(scratch.content("copy"), Names{});
 }
