@@ -1,6 +1,6 @@
 #include "zor_basis/crypto/cr_hash.h"
 
-#include "basis/crypto/crypt_impl.h"
+#include "basis/crypto/cr_hash_impl.h"
 #include "zor_basis/text/blob.h"
 
 #include <algorithm>

@@ -1,6 +1,6 @@
 #include "zor_basis/crypto/cr_key.h"
 
-#include "basis/crypto/crypt_impl.h"
+#include "basis/crypto/cr_key_impl.h"
 #include "zor_basis/text/blob.h"
 
 #include <algorithm>

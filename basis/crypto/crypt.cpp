@@ -1,5 +1,7 @@
 #include "zor_basis/crypto/crypt.h"
 
+#include "basis/crypto/cr_hash_impl.h"
+#include "basis/crypto/cr_key_impl.h"
 #include "basis/crypto/crypt_impl.h"
 #include "zor_basis/text/buf_str.h"
 

@@ -66,8 +66,7 @@ bool exportKey(Handle key, char* blob, std::uint32_t& n) {
 }
 
 bool encrypt(Handle key, char* data, std::uint32_t& n, std::uint32_t room) {
-    return storeLength(n,
-                       [=](DWORD* length) { return CryptEncrypt(key, 0, TRUE, 0, bytes(data), length, room); });
+    return storeLength(n, [=](DWORD* length) { return CryptEncrypt(key, 0, TRUE, 0, bytes(data), length, room); });
 }
 
 bool decrypt(Handle key, char* data, std::uint32_t& n) {

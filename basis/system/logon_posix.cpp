@@ -85,9 +85,8 @@ public:
     /// The account's name, which modules may have changed.
     char const* user() const {
         void const* name = nullptr;
-        return pam_get_item(handle_, PAM_USER, &name) == PAM_SUCCESS && name != nullptr
-                   ? static_cast<char const*>(name)
-                   : "";
+        return pam_get_item(handle_, PAM_USER, &name) == PAM_SUCCESS && name != nullptr ? static_cast<char const*>(name)
+                                                                                        : "";
     }
 
 private:

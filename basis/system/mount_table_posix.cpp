@@ -19,9 +19,9 @@ namespace {
 constexpr std::size_t LINE_ROOM = 8192;
 
 constexpr char const* LOCAL_KINDS[] = {
-    "bcachefs", "btrfs", "cramfs", "erofs",   "exfat",    "ext2",  "ext3",  "ext4",    "f2fs", "fuseblk", "hfs",
-    "hfsplus",  "iso9660", "jfs",  "minix",   "msdos",    "nilfs2", "ntfs", "ntfs3",   "overlay", "ramfs", "reiserfs",
-    "rootfs",   "squashfs", "tmpfs", "ubifs", "udf",      "ufs",   "vfat",  "xfs",     "zfs",
+    "bcachefs", "btrfs",    "cramfs", "erofs", "exfat", "ext2",   "ext3", "ext4",  "f2fs",    "fuseblk", "hfs",
+    "hfsplus",  "iso9660",  "jfs",    "minix", "msdos", "nilfs2", "ntfs", "ntfs3", "overlay", "ramfs",   "reiserfs",
+    "rootfs",   "squashfs", "tmpfs",  "ubifs", "udf",   "ufs",    "vfat", "xfs",   "zfs",
 };
 
 constexpr char const* WINDOWS_SHARES[] = {"cifs", "smb3", "smbfs"};

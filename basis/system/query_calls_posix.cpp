@@ -34,8 +34,8 @@ bool resolverDomain(BufStr<15>& domain) {
 
 } // namespace
 
-QueryCalls queryCalls{getuid,    geteuid,           getegid,          getpwuid_r, getpwnam_r,     getgrouplist,
-                      getgroups, setGroups,         setEffectiveGroup, setEffectiveUser, pam_start, resolverDomain,
-                      "/proc/self/mounts", _PATH_UTMP};
+QueryCalls queryCalls{
+    getuid,    geteuid,           getegid,          getpwuid_r, getpwnam_r,     getgrouplist,        getgroups,
+    setGroups, setEffectiveGroup, setEffectiveUser, pam_start,  resolverDomain, "/proc/self/mounts", _PATH_UTMP};
 
 } // namespace ZOR_Basis

@@ -4,9 +4,8 @@
 
 namespace ZOR_Basis {
 
-QueryCalls queryCalls{RegOpenKeyExA,      RegCloseKey,        RegQueryValueExA,        RegEnumKeyExA, RegEnumValueA,
-                      GetUserNameA,       GetComputerNameExA, LogonUserA,              ImpersonateLoggedOnUser,
-                      RevertToSelf,       CloseHandle,        GetVolumePathNameA,      GetDriveTypeA,
-                      WNetGetConnectionA};
+QueryCalls queryCalls{RegOpenKeyExA, RegCloseKey,        RegQueryValueExA, RegEnumKeyExA,           RegEnumValueA,
+                      GetUserNameA,  GetComputerNameExA, LogonUserA,       ImpersonateLoggedOnUser, RevertToSelf,
+                      CloseHandle,   GetVolumePathNameA, GetDriveTypeA,    WNetGetConnectionA};
 
 } // namespace ZOR_Basis

@@ -1,4 +1,4 @@
-// What is in a user specification and in the name of a domain.
+// What is in a qualified user name and in the name of a domain.
 
 #include "zor_basis/system/sys.h"
 

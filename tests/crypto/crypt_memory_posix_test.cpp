@@ -71,7 +71,8 @@ TEST(CryptMemory, is_wiped_before_it_is_released) {
         Watched const watched;
         {
             CrHashPtr hash(user.crypt.get());
-            hash->hashData("a secret of more bytes than the one block that the hash takes at a time, and then some", 86);
+            hash->hashData("a secret of more bytes than the one block that the hash takes at a time, and then some",
+                           86);
             SecretBlob exported;
             exported.copy(5, "small");
             ASSERT_TRUE(hash->exportKey(exported));

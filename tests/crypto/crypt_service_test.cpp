@@ -2,7 +2,6 @@
 
 #include "tests/crypto/crypt_user.h"
 
-#include "basis/crypto/crypt_impl.h"
 #include "basis/crypto/crypt_service.h"
 #include "tests/support/table.h"
 
@@ -282,9 +281,7 @@ TEST_F(CryptServiceTest, never_leaves_anything_behind_whichever_call_fails) {
                 std::unique_ptr<CrKey> const key = user.key("secret");
                 Blob blob = blobOf("message");
                 if (key->encrypt(blob, blob)) {
-                    if (key->decrypt(blob, blob)) {
-                        EXPECT_EQ(blob.size(), 7u);
-                    }
+                    if (key->decrypt(blob, blob)) { EXPECT_EQ(blob.size(), 7u); }
                 } else {
                     EXPECT_EQ(bytesOf(blob), "message");
                 }

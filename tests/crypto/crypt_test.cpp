@@ -196,9 +196,7 @@ TEST_F(CrHashTest, exports_into_the_present_block_where_it_has_room) {
         ASSERT_TRUE(user.hash("secret")->exportKey(blob));
         EXPECT_EQ(blob.size(), 28u);
         EXPECT_EQ(blob.sizeBuf(), c.roomAfter);
-        if (c.room >= 28) {
-            EXPECT_EQ(blob.val(), block);
-        }
+        if (c.room >= 28) { EXPECT_EQ(blob.val(), block); }
         EXPECT_EQ(blob, expected);
     }
 }
@@ -256,9 +254,7 @@ TEST_F(CrKeyTest, works_in_place) {
             ASSERT_TRUE(key->encrypt(blob, blob)) << room << " " << n;
             EXPECT_EQ(bytesOf(blob), encrypted(*key, std::string(n, 'p'))) << room << " " << n;
             EXPECT_EQ(blob.sizeBuf(), std::max<std::uint64_t>(capacity, paddedSize(n)));
-            if (capacity >= paddedSize(n)) {
-                EXPECT_EQ(blob.val(), block);
-            }
+            if (capacity >= paddedSize(n)) { EXPECT_EQ(blob.val(), block); }
             char const* const encryptedBlock = blob.val();
             ASSERT_TRUE(key->decrypt(blob, blob));
             EXPECT_EQ(bytesOf(blob), std::string(n, 'p'));
@@ -275,9 +271,7 @@ TEST_F(CrKeyTest, uses_the_targets_block_where_it_has_room) {
         ASSERT_TRUE(key->encrypt(plain, out));
         EXPECT_EQ(out.size(), 16u);
         EXPECT_EQ(out.sizeBuf(), std::max<std::uint64_t>(room, 16));
-        if (room >= 16) {
-            EXPECT_EQ(out.val(), block);
-        }
+        if (room >= 16) { EXPECT_EQ(out.val(), block); }
 
         Blob back(room, std::string(room, 'x').data());
         ASSERT_TRUE(key->decrypt(out, back));
@@ -357,9 +351,7 @@ TEST_F(CrKeyTest, gives_random_messages_back) {
         Blob& out = inPlace ? blob : separate;
         ASSERT_TRUE(one->encrypt(blob, out));
         ASSERT_EQ(out.size(), paddedSize(plain.size()));
-        if (!inPlace) {
-            ASSERT_EQ(bytesOf(blob), plain);
-        }
+        if (!inPlace) { ASSERT_EQ(bytesOf(blob), plain); }
         ASSERT_NE(bytesOf(out).substr(0, plain.size()), plain.empty() ? "-" : plain);
         Blob back = blobOf(randomBytes(random, random() % 200));
         Blob& end = random() % 2 == 0 ? back : out;

@@ -324,7 +324,8 @@ TEST_F(MappedDrives, and_all_other_queries_close_what_they_open_whichever_call_f
             };
         },
         [] {
-            queryCalls.queryValue = [](HKEY key, char const* value, DWORD* reserved, DWORD* type, BYTE* data, DWORD* n) {
+            queryCalls.queryValue = [](HKEY key, char const* value, DWORD* reserved, DWORD* type, BYTE* data,
+                                       DWORD* n) {
                 return failsNow() ? LSTATUS{ERROR_ACCESS_DENIED}
                                   : realCalls.queryValue(key, value, reserved, type, data, n);
             };

@@ -339,9 +339,7 @@ TEST_F(LogonLinux, leaves_nothing_behind_after_10000_times) {
     std::vector<gid_t> after(100);
     after.resize(static_cast<std::size_t>(getgroups(100, after.data())));
     EXPECT_EQ(after, groups);
-    auto const open = [] {
-        return std::distance(fs::directory_iterator("/proc/self/fd"), fs::directory_iterator());
-    };
+    auto const open = [] { return std::distance(fs::directory_iterator("/proc/self/fd"), fs::directory_iterator()); };
     auto const before = open();
     for (int i = 0; i < 200; ++i) Handle(Sys::loginUser("nobody", "secret", true));
     EXPECT_EQ(open(), before);

@@ -27,8 +27,8 @@ std::string number(HANDLE handle) { return std::to_string(reinterpret_cast<std::
 
 BOOL WINAPI logonUser(char const* user, char const* domain, char const* password, DWORD kind, DWORD provider,
                       HANDLE* token) {
-    steps.push_back(std::string("logon <") + user + "> " + (domain != nullptr ? domain : "null") + " " + password + " " +
-                    std::to_string(kind) + " " + std::to_string(provider));
+    steps.push_back(std::string("logon <") + user + "> " + (domain != nullptr ? domain : "null") + " " + password +
+                    " " + std::to_string(kind) + " " + std::to_string(provider));
     *token = nextToken;
     return admits;
 }
@@ -64,7 +64,8 @@ struct LogonWindows : testing::Test {
 HANDLE ownToken() {
     HANDLE process = nullptr, token = nullptr;
     EXPECT_TRUE(OpenProcessToken(GetCurrentProcess(), TOKEN_DUPLICATE | TOKEN_QUERY, &process));
-    EXPECT_TRUE(DuplicateTokenEx(process, TOKEN_ALL_ACCESS, nullptr, SecurityImpersonation, TokenImpersonation, &token));
+    EXPECT_TRUE(
+        DuplicateTokenEx(process, TOKEN_ALL_ACCESS, nullptr, SecurityImpersonation, TokenImpersonation, &token));
     CloseHandle(process);
     return token;
 }
@@ -78,7 +79,7 @@ bool threadActs() {
 
 } // namespace
 
-TEST_F(LogonWindows, asks_for_the_user_of_the_specification) {
+TEST_F(LogonWindows, asks_for_the_user_that_is_named) {
     struct Case {
         Row row;
         char const* user;

@@ -184,9 +184,7 @@ TEST_F(MountsLinux, of_this_machine_can_be_asked) {
 }
 
 TEST_F(MountsLinux, leave_no_file_open) {
-    auto const open = [] {
-        return std::distance(fs::directory_iterator("/proc/self/fd"), fs::directory_iterator());
-    };
+    auto const open = [] { return std::distance(fs::directory_iterator("/proc/self/fd"), fs::directory_iterator()); };
     auto const before = open();
     for (int i = 0; i < 10'000; ++i) {
         FPath unc;

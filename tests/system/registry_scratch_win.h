@@ -24,7 +24,8 @@ inline long keysClosed = 0;
 inline ZOR_Basis::QueryCalls const realCalls = ZOR_Basis::queryCalls;
 
 inline LSTATUS WINAPI openCounted(HKEY parent, char const* path, DWORD options, REGSAM access, HKEY* key) {
-    EXPECT_EQ(access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY | KEY_CREATE_LINK), 0u) << "keys are opened for queries only";
+    EXPECT_EQ(access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY | KEY_CREATE_LINK), 0u)
+        << "keys are opened for queries only";
     LSTATUS const result = realCalls.openKey(parent, path, options, access, key);
     keysOpened += result == ERROR_SUCCESS ? 1 : 0;
     return result;

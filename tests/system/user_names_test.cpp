@@ -1,4 +1,4 @@
-// User specifications and names of domains, and what holds of users on every machine.
+// Qualified user names and names of domains, and what holds of users on every machine.
 
 #include <zor_basis/system.h>
 
@@ -11,7 +11,7 @@
 
 using namespace ZOR_Basis;
 
-TEST(ParseUser, takes_specifications_apart) {
+TEST(ParseUser, takes_qualified_names_apart) {
     struct Case {
         Row row;
         char const *full, *user, *domain;
@@ -38,8 +38,11 @@ TEST(ParseUser, takes_specifications_apart) {
              Case{{}, "/jdoe", "jdoe", "", true},
              Case{{}, "SALES/", "", "SALES", true},
              Case{{}, " ", " ", "before", false},
-             Case{{}, "a user of more than 15 bytes@a domain of more than 15 bytes", "a user of more than 15 bytes",
-                  "a domain of more than 15 bytes", true},
+             Case{{},
+                  "a user of more than 15 bytes@a domain of more than 15 bytes",
+                  "a user of more than 15 bytes",
+                  "a domain of more than 15 bytes",
+                  true},
          }) {
         SCOPED_TRACE(c.row);
         BufStr<15> user("someone"), domain("before");

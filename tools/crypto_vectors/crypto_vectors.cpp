@@ -92,8 +92,8 @@ void printRow(HCRYPTPROV provider, Bytes const& secret, Bytes const& plain) {
 
 /// Texts as people choose them, then every way to fill the blocks of the hash.
 std::vector<Bytes> makeSecrets(Source& source) {
-    std::vector<Bytes> secrets{"secret", "a", "correct horse battery staple", "gr\xC3\xBC\xC3\x9F dich", Bytes(16, '\0'),
-                               Bytes(64, '\xFF')};
+    std::vector<Bytes> secrets{
+        "secret", "a", "correct horse battery staple", "gr\xC3\xBC\xC3\x9F dich", Bytes(16, '\0'), Bytes(64, '\xFF')};
     for (std::size_t n : {0, 1, 2, 7, 8, 15, 16, 17, 31, 33, 54, 55, 56, 57, 63, 64, 65, 119, 120, 128, 129, 1000})
         secrets.push_back(source.bytes(n));
     return secrets;
@@ -101,8 +101,13 @@ std::vector<Bytes> makeSecrets(Source& source) {
 
 /// What looks like padding, then every way to fill the blocks of the key.
 std::vector<Bytes> makeMessages(Source& source) {
-    std::vector<Bytes> messages{Bytes(8, '\0'), Bytes(7, '\1'), Bytes(8, '\1'), Bytes(8, '\x08'), Bytes(16, '\x08'),
-                                Bytes(15, '\xFF'), "The quick brown fox jumps over the lazy dog"};
+    std::vector<Bytes> messages{Bytes(8, '\0'),
+                                Bytes(7, '\1'),
+                                Bytes(8, '\1'),
+                                Bytes(8, '\x08'),
+                                Bytes(16, '\x08'),
+                                Bytes(15, '\xFF'),
+                                "The quick brown fox jumps over the lazy dog"};
     for (std::size_t n = 0; n <= 33; ++n) messages.push_back(source.bytes(n));
     for (std::size_t n : {39, 40, 41, 63, 64, 65, 127, 128, 129, 255, 256, 257, 504, 511, 512, 513, 520, 1000})
         messages.push_back(source.bytes(n));
@@ -114,8 +119,7 @@ std::vector<Bytes> makeMessages(Source& source) {
 int main() {
     _setmode(_fileno(stdout), _O_BINARY);
     HCRYPTPROV provider = 0;
-    need(CryptAcquireContextA(&provider, nullptr, nullptr, PROV_RSA_FULL, CRYPT_VERIFYCONTEXT),
-         "CryptAcquireContext");
+    need(CryptAcquireContextA(&provider, nullptr, nullptr, PROV_RSA_FULL, CRYPT_VERIFYCONTEXT), "CryptAcquireContext");
     Source source;
     std::vector<Bytes> const secrets = makeSecrets(source);
     std::vector<Bytes> const messages = makeMessages(source);

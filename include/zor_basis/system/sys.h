@@ -74,10 +74,10 @@ public:
     /// \return whether there is a user name; on Linux false
     static bool DefaultLogin(BufStr<15>& login);
 
-    /// Takes a user specification apart: "user@domain" at its first "@"; else "domain\user", or else "domain/user", at its
-    /// first separator. Either half may be empty. The empty specification is the thread's user and the computer's domain.
+    /// Takes a qualified user name apart: "user@domain" at its first "@"; else "domain\user", or else "domain/user", at its
+    /// first separator. Either half may be empty. The empty name is the thread's user and the computer's domain.
     /// \kept sys-03: without a domain in it the whole text is the user, `domain` stays as it was, and the result is false
-    /// \return true where it has been taken apart; for the empty specification, what `CurrentUser` returned
+    /// \return true where it has been taken apart; for the empty name, what `CurrentUser` returned
     static bool ParseUser(Str const& full, BufStr<15>& user, BufStr<15>& domain);
 
     /// Whether a domain's name contains a full stop and so is a DNS name rather than a short one.
@@ -134,7 +134,7 @@ public:
     /// The forms look in this order; the first that finds the drive decides:
     /// - `UnMap(path, unc)`: the mappings of the current user, HKEY_CURRENT_USER\Network\LETTER\RemotePath.
     /// - with a user: those in the user's profile under HKEY_USERS. A profile is the user's if its logon name is (in any
-    ///   case) and its domain too, where both the specification and the profile name one (the profile by "USERDNSDOMAIN" or
+    ///   case) and its domain too, where both the qualified name and the profile have one (the profile by "USERDNSDOMAIN" or
     ///   "USERDOMAIN", or else by the user's distinguished name in the state of the group policy). An empty user is the
     ///   current one.
     /// - with a password: the user's profile as before; else the user is logged on and the calling thread acts as that
