@@ -134,8 +134,9 @@ TEST_F(LogonLinux, fails_where_pam_refuses) {
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr);
     admitWith("auth required pam_permit.so\naccount required pam_deny.so\n");
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr);
+    put(scratch / "other", "auth required pam_deny.so\naccount required pam_deny.so\n");
     fs::remove(scratch / "zor_basis");
-    EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "there is no such service";
+    EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "a machine that does not know the service";
     queryCalls.pamStart = failToStart;
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr);
 }
