@@ -314,6 +314,39 @@ TEST_F(CrKeyTest, refuses_a_padding_in_which_one_bit_has_changed) {
     EXPECT_TRUE(key->decrypt(blobOf(message), out)) << "the key is as good as before";
 }
 
+TEST_F(CrKeyTest, takes_only_1_to_8_equal_bytes_for_a_padding) {
+    struct Case {
+        Row row;
+        std::string end; // of the last block
+        int taken;       // bytes of padding; -1: none
+    };
+    for (Case const& c : {
+             Case{{}, std::string(1, '\x01'), 1},
+             Case{{}, std::string(2, '\x02'), 2},
+             Case{{}, std::string(7, '\x07'), 7},
+             Case{{}, std::string(8, '\x08'), 8},
+             Case{{}, std::string(3, '\x02'), 2},
+             Case{{}, std::string(8, '\x01'), 1},
+             Case{{}, std::string(1, '\x02'), -1},
+             Case{{}, std::string(7, '\x08'), -1},
+             Case{{}, std::string("\x02\x03\x03", 3), -1},
+             Case{{}, std::string("\x03\x02\x03", 3), -1},
+             Case{{}, std::string(9, '\x09'), -1},
+             Case{{}, std::string(16, '\x10'), -1},
+             Case{{}, std::string(8, '\0'), -1},
+             Case{{}, std::string(1, '\xFF'), -1},
+         }) {
+        SCOPED_TRACE(c.row);
+        // Without the block of its own padding, the message ends in what the row says.
+        std::string const plain = std::string(16 - c.end.size(), 'm') + c.end;
+        Blob out;
+        bool const done = key->decrypt(blobOf(encrypted(*key, plain).substr(0, 16)), out);
+        EXPECT_EQ(done, c.taken >= 0);
+        EXPECT_EQ(out.size(), done ? 16u - static_cast<unsigned>(c.taken) : 16u);
+        if (done) { EXPECT_EQ(bytesOf(out), plain.substr(0, out.size())); }
+    }
+}
+
 TEST_F(CrKeyTest, never_gives_the_message_back_when_a_byte_has_changed) {
     std::string const plain = "a message of some blocks, and then some more";
     std::string const message = encrypted(*key, plain);
