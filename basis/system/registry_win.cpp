@@ -43,8 +43,7 @@ bool RegistryKey::read(char const* value, Blob& buffer, Growth growth) const {
     LSTATUS result = ask();
     if (result == ERROR_MORE_DATA && growth == ONCE && growBuffer(buffer, n)) result = ask();
     if (result != ERROR_SUCCESS || !isText(type)) return false;
-    // Nothing says that a text in the registry is terminated.
-    buffer.setSize(n != 0 ? detail::textLengthUpTo(buffer.val(), n) : 0);
+    buffer.setSize(n);
     return true;
 }
 

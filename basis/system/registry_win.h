@@ -35,7 +35,8 @@ public:
 
     bool has(char const* value) const;
     enum Growth { FIXED, ONCE };
-    /// Reads a text. The size of the buffer becomes that of the text.
+    /// Reads a text. The size of the buffer becomes that of the value, in which the text may end earlier or lack its
+    /// terminator.
     /// \param growth  whether a text longer than the buffer is asked for again
     bool read(char const* value, Blob& buffer, Growth growth) const;
     /// The same with a buffer of its own. \return false, with `out` as it was, where there is no such text

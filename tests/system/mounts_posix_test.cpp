@@ -152,6 +152,14 @@ TEST_F(MountsLinux, are_found_through_links_and_from_the_current_folder) {
     fs::current_path(before);
 }
 
+TEST_F(MountsLinux, are_found_through_links_to_the_root) {
+    fs::create_directory_symlink("/", scratch / "top");
+    FPath unc;
+    EXPECT_TRUE(Sys::UnMap((scratch / "top/zb/jobs/x").c_str(), unc));
+    EXPECT_STREQ(unc.c_str(), "//srv/jobs/x");
+    EXPECT_TRUE(Sys::isLocalDisk((scratch / "top").c_str()));
+}
+
 TEST_F(MountsLinux, may_be_unknown) {
     FPath unc("before");
     queryCalls.mountTable = "/no/such/table";
