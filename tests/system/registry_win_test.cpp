@@ -231,6 +231,10 @@ TEST_F(DomainCache, may_hold_what_is_no_text) {
 
 TEST_F(RegistryDomains, are_not_translated_without_a_cache) {
     BufStr<255> domain("before");
+    queryCalls.openKey = [](HKEY, char const* path, DWORD, REGSAM, HKEY*) -> LSTATUS {
+        EXPECT_STREQ(path, DOMAIN_CACHE);
+        return ERROR_FILE_NOT_FOUND;
+    };
     EXPECT_FALSE(Sys::FullDomain("SALES", domain));
     EXPECT_FALSE(Sys::ShortDomain("sales.example.com", domain));
     EXPECT_STREQ(domain.c_str(), "before");
