@@ -113,6 +113,7 @@ SysHdl* Sys::loginUser(Str const& user, Str const& password, bool) {
 bool Sys::impersonate(SysHdl* handle) {
     if (!revertToSelf()) return false;
     if (handle == nullptr) return true;
+    if (!handle->isValid()) return false;
     std::unique_ptr<Identity> own(new (std::nothrow) Identity);
     if (own == nullptr || !own->readOwn()) return false;
     if (!static_cast<PosixHdl*>(handle)->identity().take(*own)) return false;

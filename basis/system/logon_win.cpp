@@ -55,7 +55,7 @@ SysHdl* Sys::loginUser(Str const& user, Str const& password, bool interactive) {
 bool Sys::impersonate(SysHdl* handle) {
     queryCalls.revertToSelf();
     if (handle == nullptr) return true;
-    return queryCalls.impersonate(static_cast<WinHdl*>(handle)->token()) != FALSE;
+    return handle->isValid() && queryCalls.impersonate(static_cast<WinHdl*>(handle)->token()) != FALSE;
 }
 
 bool Sys::revertToSelf() { return queryCalls.revertToSelf() != FALSE; }

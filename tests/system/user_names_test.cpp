@@ -143,6 +143,8 @@ TEST(SysHdl, is_nobody_by_itself) {
     static_assert(std::has_virtual_destructor_v<SysHdl>);
     std::unique_ptr<SysHdl> const handle(new SysHdl);
     EXPECT_FALSE(handle->isValid());
+    EXPECT_FALSE(Sys::impersonate(handle.get())) << "nobody to act as";
+    EXPECT_TRUE(Sys::revertToSelf());
 }
 
 TEST(SysDrives, do_not_know_paths_that_are_none) {

@@ -112,7 +112,9 @@ public:
 
     /// Has the calling thread act as the user, and no longer as one before. Null ends that, as `revertToSelf` does, and is
     /// true.
-    /// \error false where the system refuses; the thread is itself then. On Linux that takes the privilege to change ids
+    /// \pre a handle that is valid comes from `loginUser`
+    /// \error false for an invalid handle and where the system refuses; the thread is itself then. On Linux it takes the
+    ///     privilege to change ids
     static bool impersonate(SysHdl* handle);
     /// Has the calling thread be itself again. True also where it was.
     static bool revertToSelf();
