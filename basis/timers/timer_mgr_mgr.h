@@ -4,7 +4,7 @@
 #ifndef BASIS_TIMERS_TIMER_MGR_MGR_H
 #define BASIS_TIMERS_TIMER_MGR_MGR_H
 
-#include "basis/timers/held_semaphore.h"
+#include "basis/sync/held_semaphore.h"
 #include "zor_basis/containers/ptr_array.h"
 #include "zor_basis/files/f_path.h"
 

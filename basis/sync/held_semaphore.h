@@ -1,8 +1,8 @@
 /// \file
 /// A semaphore of the platform layer, held for a scope.
 
-#ifndef BASIS_TIMERS_HELD_SEMAPHORE_H
-#define BASIS_TIMERS_HELD_SEMAPHORE_H
+#ifndef BASIS_SYNC_HELD_SEMAPHORE_H
+#define BASIS_SYNC_HELD_SEMAPHORE_H
 
 #include "basis/platform/xos_basics.h"
 
