@@ -24,7 +24,7 @@ MTQ_Impl::MTQ_Impl(ErrPolicy policy, int limit)
 
 MTQ_Impl::~MTQ_Impl() {
     // Who waits for the jobs may come here before the last of them has given its signal.
-    while (ending_.load(std::memory_order_acquire) != 0) std::this_thread::yield();
+    while (ending() != 0) std::this_thread::yield();
     xos_SemDestroy(completion_);
     xos_SemDestroy(mutex_);
     while (JobEntry* const job = jobs_.first()) drop(job);

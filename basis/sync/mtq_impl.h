@@ -34,6 +34,8 @@ public:
     void run(JobEntry& job);
 
     std::int32_t running() const { return running_.load(std::memory_order_acquire); }
+    /// Jobs whose function has returned and that still report it.
+    std::uint32_t ending() const { return ending_.load(std::memory_order_acquire); }
 
 private:
     bool mayProceed() { return policy_ == Continue || !failed(); }
@@ -53,7 +55,6 @@ private:
     std::atomic<bool> failed_{false};
     /// No job before this one waits to be started; null: none at all.
     JobEntry* firstWaiting_ = nullptr;
-    /// Jobs that are finished and still report it.
     std::atomic<std::uint32_t> ending_{0};
 };
 

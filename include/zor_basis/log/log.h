@@ -24,13 +24,13 @@
 
 #include "zor_basis/export.h"
 
-/// Has the compiler check arguments against a format; the numbers count `this`.
+/// Has the compiler check arguments against a format text; the numbers count `this`.
 #if defined(__clang__)
-#define ZB_PRINTF_CHECK(format, first) __attribute__((format(printf, format, first)))
+#define ZB_PRINTF_CHECK(text, first) __attribute__((format(printf, text, first)))
 #elif defined(__GNUC__)
-#define ZB_PRINTF_CHECK(format, first) __attribute__((format(gnu_printf, format, first)))
+#define ZB_PRINTF_CHECK(text, first) __attribute__((format(gnu_printf, text, first)))
 #else
-#define ZB_PRINTF_CHECK(format, first)
+#define ZB_PRINTF_CHECK(text, first)
 #endif
 
 namespace ZOR_Basis {
