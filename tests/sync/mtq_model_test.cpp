@@ -187,9 +187,9 @@ private:
 
     /// All jobs come to their end, with results such that their order does not matter.
     void wait() {
-        if (model_.running != static_cast<int>(withTask().size())) return; // it would never end
         // One ends, so that the others are started, and one runs until they are, so that there is something to wait for.
         if (model_.running == 1 && model_.mayProceed()) add(true);
+        if (model_.running != static_cast<int>(withTask().size())) return; // it would never end
         bool const result = stops_ || random_() % 4 != 0;
         std::vector<MTQ_Dat*> const waiting = model_.running > 0 && model_.mayProceed() ? recordsThatWait() : Records();
         std::vector<GatedJob*> left;

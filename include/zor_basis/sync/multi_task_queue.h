@@ -2,14 +2,15 @@
 /// `MultiTaskQueue`: runs jobs, each in a task of its own, and lists them with their results.
 ///
 ///     std::unique_ptr<MultiTaskQueue> queue(MultiTaskQueue::New(MultiTaskQueue::StopOnError, 4));
-///     for (Page& page : pages) queue->add(renderPage, &page, false, false, false);
+///     for (Page& page : pages) queue->add(renderPage, &page, false, true, false);
 ///     queue->wait();
 ///     if (queue->failed()) ...
 ///
 /// A job waits in the queue until a task is asked for; it runs then, at the same time as everything else, and finishes
 /// when its function returns. The limit says how many jobs `add` starts at once; it is no limit of what runs: jobs that are
-/// forced start whatever it says, and `wait` starts all that are left. The first failure marks the queue for good; what
-/// follows from it is the policy's.
+/// forced start whatever it says, and `wait` starts all that are left, provided that a job runs when it is called: a job
+/// that waits in a queue where none runs is started by nobody. The first failure marks the queue for good; what follows
+/// from it is the policy's.
 ///
 /// \thread  one thread adds, waits and walks while jobs run in their tasks; jobs may add to their queue, too. One walk at a
 ///     time. A queue whose mutex the platform layer could not make is not guarded.
@@ -54,7 +55,7 @@ public:
     virtual bool add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow,
                      bool removeWhenDone) = 0;
 
-    /// Returns when no started job runs, at once if none does.
+    /// Returns when no started job runs; at once, with nothing started, if none does.
     /// \kept queue-02: when a job finishes meanwhile, or has since the last `wait`, all jobs that wait are started at once,
     ///     whatever the limit
     /// \kept queue-01: a task that could not be made counts as running for ever, so that this never returns
