@@ -4,10 +4,10 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <atomic>
 #include <chrono>
 #include <cstdint>
-#include <functional>
 #include <future>
 #include <latch>
 #include <memory>
@@ -129,25 +129,25 @@ void byWait() {
     queue->wait();
 }
 
-template <class Job>
-void run(benchmark::State& state, std::function<void()> const& all) {
+template <class Job, void (*ALL)()>
+void run(benchmark::State& state) {
     for (auto _ : state) {
         done = 0;
-        all();
+        ALL();
         if (done != Job::JOBS) state.SkipWithError("jobs were lost");
     }
 }
 
-BENCHMARK_CAPTURE(run<Trivial>, ours, byQueue<Trivial>)->Name("trivial-10000/ours")->UseRealTime();
-BENCHMARK_CAPTURE(run<Trivial>, thread, byThread<Trivial>)->Name("trivial-10000/thread")->UseRealTime();
-BENCHMARK_CAPTURE(run<Trivial>, async, byAsync<Trivial>)->Name("trivial-10000/async")->UseRealTime();
-BENCHMARK_CAPTURE(run<Trivial>, wait, byWait<Trivial>)->Name("trivial-10000-by-wait/ours")->UseRealTime();
-BENCHMARK_CAPTURE(run<OneMs>, ours, byQueue<OneMs>)->Name("work-200/ours")->UseRealTime();
-BENCHMARK_CAPTURE(run<OneMs>, thread, byThread<OneMs>)->Name("work-200/thread")->UseRealTime();
-BENCHMARK_CAPTURE(run<OneMs>, async, byAsync<OneMs>)->Name("work-200/async")->UseRealTime();
+BENCHMARK(run<Trivial, byQueue<Trivial>>)->Name("trivial-10000/ours")->UseRealTime();
+BENCHMARK(run<Trivial, byThread<Trivial>>)->Name("trivial-10000/thread")->UseRealTime();
+BENCHMARK(run<Trivial, byAsync<Trivial>>)->Name("trivial-10000/async")->UseRealTime();
+BENCHMARK(run<Trivial, byWait<Trivial>>)->Name("trivial-10000-by-wait/ours")->UseRealTime();
+BENCHMARK(run<OneMs, byQueue<OneMs>>)->Name("work-200/ours")->UseRealTime();
+BENCHMARK(run<OneMs, byThread<OneMs>>)->Name("work-200/thread")->UseRealTime();
+BENCHMARK(run<OneMs, byAsync<OneMs>>)->Name("work-200/async")->UseRealTime();
 #ifdef BENCH_HAS_TBB
-BENCHMARK_CAPTURE(run<Trivial>, tbb, byTbb<Trivial>)->Name("trivial-10000/tbb")->UseRealTime();
-BENCHMARK_CAPTURE(run<OneMs>, tbb, byTbb<OneMs>)->Name("work-200/tbb")->UseRealTime();
+BENCHMARK(run<Trivial, byTbb<Trivial>>)->Name("trivial-10000/tbb")->UseRealTime();
+BENCHMARK(run<OneMs, byTbb<OneMs>>)->Name("work-200/tbb")->UseRealTime();
 #endif
 
 } // namespace

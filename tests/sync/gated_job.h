@@ -8,6 +8,8 @@
 
 #include <atomic>
 #include <chrono>
+#include <condition_variable>
+#include <mutex>
 #include <thread>
 
 /// Tries something again and again, at most some seconds.
@@ -41,16 +43,18 @@ public:
     GatedJob& operator=(GatedJob const&) = delete;
 
     void open(bool result = true) {
+        std::lock_guard const held(mutex_);
         result_ = result;
         isOpen_ = true;
-        isOpen_.notify_all();
+        opened_.notify_all();
     }
     bool runs() const { return runs_; }
 
     static bool run(void* argument) {
         auto& job = *static_cast<GatedJob*>(static_cast<MTQ_Arg*>(argument));
         job.runs_ = true;
-        job.isOpen_.wait(false);
+        std::unique_lock held(job.mutex_);
+        job.opened_.wait(held, [&] { return job.isOpen_; });
         return job.result_;
     }
     /// As an argument of a queue.
@@ -59,8 +63,10 @@ public:
 private:
     std::atomic<int>* const deletions_;
     std::atomic<bool> runs_{false};
-    std::atomic<bool> isOpen_{false};
-    std::atomic<bool> result_{false};
+    std::mutex mutex_;
+    std::condition_variable opened_;
+    bool isOpen_ = false;
+    bool result_ = false;
 };
 
 #endif
