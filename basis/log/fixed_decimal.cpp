@@ -1,5 +1,7 @@
 #include "basis/log/fixed_decimal.h"
 
+#include "basis/log/decimal_digits.h"
+
 #include <bit>
 
 namespace ZOR_Basis {
@@ -12,29 +14,6 @@ constexpr int EXPONENTS = 0x7FF;
 constexpr int EXPONENT_BIAS = 1023 + FRACTION_BITS;
 constexpr int WORD = 64;
 constexpr int MOST_WHOLE_BITS = 63;
-
-constexpr std::uint64_t POWERS_OF_TEN[MOST_DECIMALS + 1] = {
-    1ull,
-    10ull,
-    100ull,
-    1'000ull,
-    10'000ull,
-    100'000ull,
-    1'000'000ull,
-    10'000'000ull,
-    100'000'000ull,
-    1'000'000'000ull,
-    10'000'000'000ull,
-    100'000'000'000ull,
-    1'000'000'000'000ull,
-    10'000'000'000'000ull,
-    100'000'000'000'000ull,
-    1'000'000'000'000'000ull,
-    10'000'000'000'000'000ull,
-    100'000'000'000'000'000ull,
-    1'000'000'000'000'000'000ull,
-    10'000'000'000'000'000'000ull,
-};
 
 /// 128 bits.
 struct Wide {

@@ -1,17 +1,16 @@
 #include "basis/log/line_text.h"
 
 #include "basis/log/conversion.h"
+#include "basis/log/decimal_digits.h"
 #include "basis/log/decimal_point.h"
 #include "basis/log/fixed_decimal.h"
 
-#include <algorithm>
 #include <cfenv>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
-#include <iterator>
 
 namespace ZOR_Basis {
 namespace {
@@ -19,19 +18,17 @@ namespace {
 constexpr int USUAL_DECIMALS = 6;
 /// Digits of a 64-bit number to the base 8, the smallest that there is.
 constexpr int MOST_DIGITS = 22;
+constexpr std::size_t LONGEST_NUMBER = MOST_DIGITS + 1 + MOST_DECIMALS;
 
 /// Writes a line by the short way. Each step is false where the way ends: at a conversion that is not its business, or
 /// where the room does.
 class QuickLine {
 public:
-    QuickLine(char* line, std::size_t room, std::va_list arguments) : at_(line), end_(line + room - 1) {
-        va_copy(arguments_, arguments);
-    }
-    QuickLine(QuickLine const&) = delete;
-    QuickLine& operator=(QuickLine const&) = delete;
-    ~QuickLine() { va_end(arguments_); }
+    QuickLine(char* line, std::size_t room, LineArguments& arguments)
+        : at_(line), end_(line + room - 1), arguments_(arguments) {}
 
     bool write(char const* format);
+    char* end() const { return at_; }
 
 private:
     std::size_t room() const { return static_cast<std::size_t>(end_ - at_); }
@@ -40,26 +37,29 @@ private:
         at_ += size;
     }
     void fill(char with, std::size_t count) {
-        std::memset(at_, with, count);
+        if (count != 0) std::memset(at_, with, count);
         at_ += count;
     }
 
-    bool writeConversion(Conversion const& how);
+    bool writeConversion(char const*& format);
+    bool writeParsed(Conversion const& how);
     bool writePadded(char const* text, std::size_t size, Conversion const& how);
     bool writeText(Conversion const& how);
     bool writeCharacter(Conversion const& how);
     bool writeSigned(Conversion const& how);
-    bool writeUnsigned(Conversion const& how, int base);
-    bool writeNumber(std::uint64_t number, int base, char sign, Conversion const& how);
+    template <int BASE>
+    bool writeUnsigned(Conversion const& how);
     bool writeFixed(Conversion const& how);
-    bool writeSignedDigits(char const* digits, std::size_t size, char sign, Conversion const& how);
+    template <class Write>
+    bool writeNumber(char sign, Conversion const& how, Write const& writeDigits);
+    bool padNumber(char* number, std::size_t signSize, Conversion const& how);
 
     std::int64_t nextSigned(Conversion::Length length);
     std::uint64_t nextUnsigned(Conversion::Length length);
 
     char* at_;
     char* const end_;
-    std::va_list arguments_;
+    LineArguments& arguments_;
 };
 
 bool QuickLine::write(char const* format) {
@@ -70,15 +70,30 @@ bool QuickLine::write(char const* format) {
             format += c == '%' ? 1 : 0;
             continue;
         }
-        Conversion how;
-        format = how.read(format);
-        if (!writeConversion(how)) return false;
+        if (!writeConversion(format)) return false;
     }
     *at_ = '\0';
     return true;
 }
 
-bool QuickLine::writeConversion(Conversion const& how) {
+bool QuickLine::writeConversion(char const*& format) {
+    // The most frequent ones, which say no more than that.
+    constexpr Conversion PLAIN;
+    switch (*format) {
+    case 's':
+        ++format;
+        return writeText(PLAIN);
+    case 'd':
+        ++format;
+        return writeSigned(PLAIN);
+    default:
+        Conversion how;
+        format = how.read(format);
+        return writeParsed(how);
+    }
+}
+
+bool QuickLine::writeParsed(Conversion const& how) {
     switch (how.kind) {
     case 's':
         return writeText(how);
@@ -86,11 +101,11 @@ bool QuickLine::writeConversion(Conversion const& how) {
     case 'i':
         return writeSigned(how);
     case 'u':
-        return writeUnsigned(how, 10);
+        return writeUnsigned<10>(how);
     case 'x':
-        return writeUnsigned(how, 16);
+        return writeUnsigned<16>(how);
     case 'o':
-        return writeUnsigned(how, 8);
+        return writeUnsigned<8>(how);
     case 'c':
         return writeCharacter(how);
     case 'f':
@@ -111,7 +126,7 @@ bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const
 
 bool QuickLine::writeText(Conversion const& how) {
     if (how.length != Conversion::NONE || how.hasZeros || how.hasSignFlag()) return false;
-    char const* const text = va_arg(arguments_, char const*);
+    char const* const text = va_arg(arguments_.list, char const*);
     if (text == nullptr) return false;
     std::size_t const size =
         how.precision < 0 ? std::strlen(text) : strnlen(text, static_cast<std::size_t>(how.precision));
@@ -120,47 +135,47 @@ bool QuickLine::writeText(Conversion const& how) {
 
 bool QuickLine::writeCharacter(Conversion const& how) {
     if (how.length != Conversion::NONE || how.precision >= 0 || how.hasZeros || how.hasSignFlag()) return false;
-    char const c = static_cast<char>(va_arg(arguments_, int));
-    return writePadded(&c, 1, how);
+    char const c = static_cast<char>(va_arg(arguments_.list, int));
+    return c != '\0' && writePadded(&c, 1, how);
 }
 
 std::int64_t QuickLine::nextSigned(Conversion::Length length) {
     switch (length) {
     case Conversion::CHAR:
-        return static_cast<signed char>(va_arg(arguments_, int));
+        return static_cast<signed char>(va_arg(arguments_.list, int));
     case Conversion::SHORT:
-        return static_cast<short>(va_arg(arguments_, int));
+        return static_cast<short>(va_arg(arguments_.list, int));
     case Conversion::LONG:
-        return va_arg(arguments_, long);
+        return va_arg(arguments_.list, long);
     case Conversion::LONG_LONG:
-        return va_arg(arguments_, long long);
+        return va_arg(arguments_.list, long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_, std::ptrdiff_t);
+        return va_arg(arguments_.list, std::ptrdiff_t);
     case Conversion::MAXIMUM:
-        return va_arg(arguments_, std::intmax_t);
+        return va_arg(arguments_.list, std::intmax_t);
     default:
-        return va_arg(arguments_, int);
+        return va_arg(arguments_.list, int);
     }
 }
 
 std::uint64_t QuickLine::nextUnsigned(Conversion::Length length) {
     switch (length) {
     case Conversion::CHAR:
-        return static_cast<unsigned char>(va_arg(arguments_, unsigned));
+        return static_cast<unsigned char>(va_arg(arguments_.list, unsigned));
     case Conversion::SHORT:
-        return static_cast<unsigned short>(va_arg(arguments_, unsigned));
+        return static_cast<unsigned short>(va_arg(arguments_.list, unsigned));
     case Conversion::LONG:
-        return va_arg(arguments_, unsigned long);
+        return va_arg(arguments_.list, unsigned long);
     case Conversion::LONG_LONG:
-        return va_arg(arguments_, unsigned long long);
+        return va_arg(arguments_.list, unsigned long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_, std::size_t);
+        return va_arg(arguments_.list, std::size_t);
     case Conversion::MAXIMUM:
-        return va_arg(arguments_, std::uintmax_t);
+        return va_arg(arguments_.list, std::uintmax_t);
     default:
-        return va_arg(arguments_, unsigned);
+        return va_arg(arguments_.list, unsigned);
     }
 }
 
@@ -173,33 +188,20 @@ char signOf(bool isNegative, Conversion const& how) {
 bool QuickLine::writeSigned(Conversion const& how) {
     if (how.precision >= 0) return false;
     std::int64_t const number = nextSigned(how.length);
-    auto const magnitude = static_cast<std::uint64_t>(number);
-    return writeNumber(number < 0 ? 0 - magnitude : magnitude, 10, signOf(number < 0, how), how);
+    auto const bits = static_cast<std::uint64_t>(number);
+    std::uint64_t const magnitude = number < 0 ? 0 - bits : bits;
+    return writeNumber(signOf(number < 0, how), how,
+                       [magnitude](char* to) { return writeDecimal(to, magnitude); });
 }
 
-bool QuickLine::writeUnsigned(Conversion const& how, int base) {
+template <int BASE>
+bool QuickLine::writeUnsigned(Conversion const& how) {
     if (how.precision >= 0 || how.hasSignFlag()) return false;
-    return writeNumber(nextUnsigned(how.length), base, '\0', how);
-}
-
-bool QuickLine::writeNumber(std::uint64_t number, int base, char sign, Conversion const& how) {
-    char digits[MOST_DIGITS];
-    char const* const end = std::to_chars(std::begin(digits), std::end(digits), number, base).ptr;
-    return writeSignedDigits(digits, static_cast<std::size_t>(end - digits), sign, how);
-}
-
-bool QuickLine::writeSignedDigits(char const* digits, std::size_t size, char sign, Conversion const& how) {
-    std::size_t const signSize = sign != '\0' ? 1 : 0;
-    std::size_t const all = size + signSize;
-    std::size_t const padding = how.width > all ? how.width - all : 0;
-    if (all + padding > room()) return false;
-    bool const hasZeros = how.hasZeros && !how.isLeft;
-    if (!how.isLeft && !hasZeros) fill(' ', padding);
-    put(&sign, signSize);
-    if (hasZeros) fill('0', padding);
-    put(digits, size);
-    if (how.isLeft) fill(' ', padding);
-    return true;
+    std::uint64_t const number = nextUnsigned(how.length);
+    return writeNumber('\0', how, [number](char* to) {
+        if constexpr (BASE == 10) return writeDecimal(to, number);
+        return std::to_chars(to, to + MOST_DIGITS, number, BASE).ptr;
+    });
 }
 
 /// Numbers too large or none at all, rounding of another kind and decimal points of several bytes go the long way.
@@ -207,35 +209,60 @@ bool QuickLine::writeFixed(Conversion const& how) {
     int const decimals = how.precision < 0 ? USUAL_DECIMALS : how.precision;
     bool const isDouble = how.length == Conversion::NONE || how.length == Conversion::LONG;
     char const* const point = decimalPoint();
-    if (!isDouble || decimals > MOST_DECIMALS || std::strlen(point) != 1 || std::fegetround() != FE_TONEAREST) {
-        return false;
-    }
-    double const number = va_arg(arguments_, double);
+    bool const isPointShort = point[0] != '\0' && point[1] == '\0';
+    if (!isDouble || decimals > MOST_DECIMALS || !isPointShort || std::fegetround() != FE_TONEAREST) return false;
+    double const number = va_arg(arguments_.list, double);
     FixedDecimal parts;
     if (!takeApart(number, decimals, parts)) return false;
-    char text[MOST_DIGITS + 1 + MOST_DECIMALS];
-    char* end = std::to_chars(std::begin(text), std::end(text), parts.whole).ptr;
-    if (decimals > 0) {
-        *end++ = *point;
-        end += decimals;
-        char* digit = end;
-        for (int i = 0; i < decimals; ++i, parts.decimals /= 10) *--digit = static_cast<char>('0' + parts.decimals % 10);
+    return writeNumber(signOf(std::signbit(number), how), how, [parts, decimals, point = *point](char* to) {
+        to = writeDecimal(to, parts.whole);
+        if (decimals == 0) return to;
+        *to = point;
+        return writeDigits(to + 1, parts.decimals, decimals);
+    });
+}
+
+/// \param writeDigits  writes at most `LONGEST_NUMBER` characters. \return their end
+template <class Write>
+bool QuickLine::writeNumber(char sign, Conversion const& how, Write const& writeDigits) {
+    if (room() < LONGEST_NUMBER + 1) return false;
+    char* const number = at_;
+    std::size_t const signSize = sign != '\0' ? 1 : 0;
+    *number = sign;
+    at_ = writeDigits(number + signSize);
+    return how.width == 0 || padNumber(number, signSize, how);
+}
+
+/// Widens the number that has just been written.
+bool QuickLine::padNumber(char* number, std::size_t signSize, Conversion const& how) {
+    auto const size = static_cast<std::size_t>(at_ - number);
+    if (size >= how.width) return true;
+    std::size_t const padding = how.width - size;
+    if (padding > room()) return false;
+    if (how.isLeft) {
+        fill(' ', padding);
+        return true;
     }
-    return writeSignedDigits(text, static_cast<std::size_t>(end - text), signOf(std::signbit(number), how), how);
+    char* const moved = number + (how.hasZeros ? signSize : 0);
+    std::memmove(moved + padding, moved, static_cast<std::size_t>(at_ - moved));
+    std::memset(moved, how.hasZeros ? '0' : ' ', padding);
+    at_ += padding;
+    return true;
 }
 
 } // namespace
 
-bool writeLineTextQuickly(char* line, std::size_t room, char const* format, std::va_list arguments) {
-    return QuickLine(line, room, arguments).write(format);
+char* writeLineText(char* line, std::size_t room, char const* format, LineArguments& arguments) {
+    QuickLine text(line, room, arguments);
+    return text.write(format) ? text.end() : nullptr;
 }
 
-void writeLineText(char* line, std::size_t room, char const* format, std::va_list arguments) {
-    if (writeLineTextQuickly(line, room, format, arguments)) return;
+char* writeAnyLineText(char* line, std::size_t room, char const* format, LineArguments& arguments) {
     // Where the runtime refuses the format, what it has written so far is the text.
     line[0] = '\0';
-    std::vsnprintf(line, room, format, arguments);
+    std::vsnprintf(line, room, format, arguments.list);
     line[room - 1] = '\0';
+    return line + std::strlen(line);
 }
 
 } // namespace ZOR_Basis

@@ -3,7 +3,6 @@
 #include "basis/log/line_text.h"
 #include "basis/log/logger_impl.h"
 
-#include <cstdarg>
 #include <cstddef>
 
 namespace ZOR_Basis {
@@ -27,11 +26,17 @@ void Log::init(char const* name) {
 void Log::out(char const* format, ...) const {
     if (logger_ == nullptr || format == nullptr) return;
     char line[LINE_ROOM];
-    std::va_list arguments;
-    va_start(arguments, format);
-    writeLineText(line, LINE_ROOM - RESERVED, format, arguments);
-    va_end(arguments);
-    logger_->out(line);
+    LineArguments arguments;
+    va_start(arguments.list, format);
+    char* end = writeLineText(line, LINE_ROOM - RESERVED, format, arguments);
+    va_end(arguments.list);
+    if (end == nullptr) {
+        va_start(arguments.list, format);
+        end = writeAnyLineText(line, LINE_ROOM - RESERVED, format, arguments);
+        va_end(arguments.list);
+    }
+    // A log's logger is of this kind; its `out` would measure the line first.
+    static_cast<LoggerImpl*>(logger_)->out(line, end);
 }
 
 void Log::newSession() {

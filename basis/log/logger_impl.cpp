@@ -52,14 +52,15 @@ void LoggerImpl::newSession() {
     newBuffer();
 }
 
-void LoggerImpl::out(char* line) {
-    std::size_t size = std::strlen(line);
-    line[size++] = '\n';
-    line[size] = '\0';
+void LoggerImpl::out(char* line) { out(line, line + std::strlen(line)); }
+
+void LoggerImpl::out(char* line, char* end) {
+    *end++ = '\n';
+    *end = '\0';
     std::lock_guard const held(lock_);
     if (current_ == nullptr) newBuffer();
     if (current_ == nullptr) return;
-    append(line, size);
+    append(line, static_cast<std::uint64_t>(end - line));
     lastWrite_ = xos_MsCount();
 }
 

@@ -28,6 +28,8 @@ public:
 
     void newSession() override;
     void out(char* line) override;
+    /// The same of a line whose terminator is known.
+    void out(char* line, char* end);
     void close() override;
     /// What has not been written is lost.
     ~LoggerImpl() override;

@@ -6,6 +6,8 @@
 
 #include "basis/log/line_text.h"
 
+#include <gtest/gtest.h>
+
 #include <array>
 #include <cstdarg>
 #include <cstddef>
@@ -16,9 +18,6 @@ inline constexpr std::size_t ROOM = 1023;
 
 using Line = std::array<char, ROOM>;
 
-inline std::string whole(Line const& line, std::size_t room) { return {line.data(), room}; }
-
-/// Both ways write into lines of X, so that all bytes can be compared that count.
 struct Written {
     std::string ours;
     bool quickly = false;
@@ -27,14 +26,20 @@ struct Written {
 inline Written writtenWith(std::size_t room, char const* format, ...) {
     Line line;
     line.fill('X');
-    std::va_list arguments;
-    va_start(arguments, format);
+    ZOR_Basis::LineArguments arguments;
+    va_start(arguments.list, format);
     Written written;
-    written.quickly = ZOR_Basis::writeLineTextQuickly(line.data(), room, format, arguments);
-    line.fill('X');
-    ZOR_Basis::writeLineText(line.data(), room, format, arguments);
-    va_end(arguments);
+    char const* end = ZOR_Basis::writeLineText(line.data(), room, format, arguments);
+    written.quickly = end != nullptr;
+    va_end(arguments.list);
+    if (!written.quickly) {
+        line.fill('X');
+        va_start(arguments.list, format);
+        end = ZOR_Basis::writeAnyLineText(line.data(), room, format, arguments);
+        va_end(arguments.list);
+    }
     written.ours = line.data();
+    EXPECT_EQ(end, line.data() + written.ours.size());
     return written;
 }
 
