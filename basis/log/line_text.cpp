@@ -41,6 +41,7 @@ private:
         at_ += count;
     }
 
+    bool putPlain(char const*& format);
     bool writeConversion(char const*& format);
     bool writeParsed(Conversion const& how);
     bool writePadded(char const* text, std::size_t size, Conversion const& how);
@@ -63,17 +64,21 @@ private:
 };
 
 bool QuickLine::write(char const* format) {
-    while (char const c = *format++) {
-        if (c != '%' || *format == '%') {
-            if (at_ == end_) return false;
-            *at_++ = c;
-            format += c == '%' ? 1 : 0;
-            continue;
-        }
-        if (!writeConversion(format)) return false;
+    while (putPlain(format) && *format != '\0') {
+        if (!writeConversion(++format)) return false;
     }
     *at_ = '\0';
-    return true;
+    return *format == '\0';
+}
+
+/// Goes on to the next conversion, or to the end.
+[[gnu::always_inline]] inline bool QuickLine::putPlain(char const*& format) {
+    char* at = at_;
+    char const* from = format;
+    while (*from != '%' && *from != '\0' && at != end_) *at++ = *from++;
+    at_ = at;
+    format = from;
+    return *from == '%' || *from == '\0';
 }
 
 bool QuickLine::writeConversion(char const*& format) {
@@ -86,6 +91,9 @@ bool QuickLine::writeConversion(char const*& format) {
     case 'd':
         ++format;
         return writeSigned(PLAIN);
+    case '%':
+        ++format;
+        return writePadded("%", 1, PLAIN);
     default:
         Conversion how;
         format = how.read(format);
@@ -115,7 +123,7 @@ bool QuickLine::writeParsed(Conversion const& how) {
     }
 }
 
-bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
+[[gnu::always_inline]] inline bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
     std::size_t const blanks = how.width > size ? how.width - size : 0;
     if (size + blanks > room()) return false;
     if (!how.isLeft) fill(' ', blanks);
@@ -124,7 +132,7 @@ bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const
     return true;
 }
 
-bool QuickLine::writeText(Conversion const& how) {
+[[gnu::always_inline]] inline bool QuickLine::writeText(Conversion const& how) {
     if (how.length != Conversion::NONE || how.hasZeros || how.hasSignFlag()) return false;
     char const* const text = va_arg(arguments_.list, char const*);
     if (text == nullptr) return false;
@@ -185,7 +193,7 @@ char signOf(bool isNegative, Conversion const& how) {
     return how.hasBlank ? ' ' : '\0';
 }
 
-bool QuickLine::writeSigned(Conversion const& how) {
+[[gnu::always_inline]] inline bool QuickLine::writeSigned(Conversion const& how) {
     if (how.precision >= 0) return false;
     std::int64_t const number = nextSigned(how.length);
     auto const bits = static_cast<std::uint64_t>(number);
