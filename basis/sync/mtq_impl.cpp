@@ -95,15 +95,43 @@ void MTQ_Impl::run(JobEntry& job) {
     ending_.fetch_sub(1, std::memory_order_release);
 }
 
+/// A job that finds the end of another waiting to be looked at leaves its own to that one's task: tasks that queued up at
+/// the mutex, which is held while others are created, would be slower than the jobs.
 void MTQ_Impl::done(MTQ_Dat& job) {
+    auto& entry = static_cast<JobEntry&>(job);
+    JobEntry* before = reports_.load(std::memory_order_relaxed);
+    do { entry.nextReported = before; } while (
+        !reports_.compare_exchange_weak(before, &entry, std::memory_order_acq_rel, std::memory_order_relaxed));
+    if (before != nullptr) return; // the job may be gone already
+    std::uint32_t ended = 0;
     {
         HeldSemaphore const held(mutex_);
-        running_.fetch_sub(1, std::memory_order_release);
-        auto& entry = static_cast<JobEntry&>(job);
-        if (!entry.result()) failed_.store(true, std::memory_order_release);
-        if (entry.removesWhenDone()) drop(&entry);
+        for (JobEntry* next = takeReports(); next != nullptr; ++ended) {
+            JobEntry& one = *next;
+            next = one.nextReported;
+            end(one);
+        }
     }
-    xos_SemGive(completion_);
+    for (; ended != 0; --ended) xos_SemGive(completion_);
+}
+
+/// \return the jobs in the order of their ends
+JobEntry* MTQ_Impl::takeReports() {
+    JobEntry* inOrder = nullptr;
+    for (JobEntry* job = reports_.exchange(nullptr, std::memory_order_acq_rel); job != nullptr;) {
+        JobEntry* const earlier = job->nextReported;
+        job->nextReported = inOrder;
+        inOrder = job;
+        job = earlier;
+    }
+    return inOrder;
+}
+
+/// \pre the mutex is held
+void MTQ_Impl::end(JobEntry& job) {
+    running_.fetch_sub(1, std::memory_order_release);
+    if (!job.result()) failed_.store(true, std::memory_order_release);
+    if (job.removesWhenDone()) drop(&job);
 }
 
 /// \pre the mutex is held

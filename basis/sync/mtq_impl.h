@@ -42,6 +42,8 @@ private:
     bool start(JobEntry& job);
     void startAllThatWait();
     void awaitCompletion();
+    JobEntry* takeReports();
+    void end(JobEntry& job);
     void drop(JobEntry* job);
 
     ErrPolicy const policy_;
@@ -56,6 +58,8 @@ private:
     /// No job before this one waits to be started; null: none at all.
     JobEntry* firstWaiting_ = nullptr;
     std::atomic<std::uint32_t> ending_{0};
+    /// Finished jobs, the last one first, that somebody is about to look at.
+    std::atomic<JobEntry*> reports_{nullptr};
 };
 
 } // namespace ZOR_Basis
