@@ -1,8 +1,6 @@
 #include "basis/sync/sem_syn_list.h"
 
-#include "zor_basis/memory/mem_mgr.h"
-
-#include <new>
+#include "basis/memory/node_memory.h"
 
 namespace ZOR_Basis {
 
@@ -13,11 +11,11 @@ SemSynList::~SemSynList() {
     while (Entry* const entry = load(first_)) {
         unlink(entry);
         xos_SemDestroy(entry->mutex);
-        freeEntry(entry);
+        deleteNode(entryMemory_, entry);
     }
     while (Entry* const entry = spare_) {
         spare_ = load(entry->next);
-        freeEntry(entry);
+        deleteNode(entryMemory_, entry);
     }
 }
 
@@ -90,21 +88,11 @@ SemSynList::Entry* SemSynList::makeEntry() {
     if (entry != nullptr) {
         spare_ = load(entry->next);
     } else {
-        void* const memory =
-            entryMemory_ != nullptr ? entryMemory_->alloc() : ::operator new(sizeof(Entry), std::nothrow);
-        if (memory == nullptr) return nullptr;
-        entry = new (memory) Entry{};
+        entry = makeNode<Entry>(entryMemory_);
+        if (entry == nullptr) return nullptr;
     }
     entry->mutex = xos_SemMCreate();
     return entry;
-}
-
-void SemSynList::freeEntry(Entry* entry) {
-    if (entryMemory_ != nullptr) {
-        entryMemory_->free(entry);
-    } else {
-        ::operator delete(entry);
-    }
 }
 
 void SemSynList::linkFront(Entry* entry) {

@@ -47,7 +47,6 @@ private:
     Entry* search(std::uint64_t key) const;
     Entry* enter(std::uint64_t key);
     Entry* makeEntry();
-    void freeEntry(Entry* entry);
     void linkFront(Entry* entry);
     void unlink(Entry* entry);
 

@@ -124,7 +124,7 @@ TEST_P(Conversion, A_damaged_byte_anywhere) {
 
 TEST_P(Conversion, Surrogates_without_their_others) {
     for (std::uint64_t step = randomSteps(50'000); step > 0 && !HasFailure(); --step) {
-        reference::WideText wide = reference::utf16(randomText(source)) + u'x';
+        reference::WideText wide = reference::utf16(randomText(source)) + static_cast<WChar>('x');
         for (std::uint64_t count = upTo(source, 4); count > 0; --count)
             wide[upTo(source, wide.size() - 1)] = static_cast<WChar>(0xD800 + upTo(source, 0x7FF));
         wideToNarrow(wide, someRoom(source, 3 * wide.size()));

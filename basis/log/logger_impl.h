@@ -1,0 +1,73 @@
+/// \file
+/// The one kind of `Logger`: lines in memory, files on the alert's thread.
+
+#ifndef BASIS_LOG_LOGGER_IMPL_H
+#define BASIS_LOG_LOGGER_IMPL_H
+
+#include "basis/containers/linked_list.h"
+#include "basis/platform/hq_basis.h"
+#include "zor_basis/log/logger.h"
+#include "zor_basis/sync/lock.h"
+#include "zor_basis/text/heap_str.h"
+
+#include <cstdint>
+
+namespace ZOR_Basis {
+
+class MemMgr;
+
+class LoggerImpl final : public Logger {
+public:
+    static constexpr std::size_t BLOCK_SIZE = 4096;
+    /// Milliseconds between looks at what there is to write, and of silence before a block is written that is not full.
+    static constexpr std::uint32_t PERIOD_MS = 8192;
+
+    /// Starts a logger with its alert and its folders.
+    /// \return it ends itself, some time after `close`; null where memory is short or no alert is to be had
+    static LoggerImpl* start(char const* name);
+
+    void newSession() override;
+    void out(char* line) override;
+    /// The same of a line whose terminator is known.
+    void out(char* line, char* end);
+    void close() override;
+    /// What has not been written is lost.
+    ~LoggerImpl() override;
+
+    std::uint32_t alertId() const { return alertId_; }
+
+private:
+    struct Buffer {
+        Buffer* previous;
+        Buffer* next;
+        std::uint64_t session;
+        std::uint64_t used;
+        std::uint64_t flushed;
+        char* data;
+    };
+
+    explicit LoggerImpl(char const* name);
+
+    static std::uint32_t tick(HQ_Basis::AlertTimer::Alert const& alert);
+    bool flush();
+    bool mustWait(Buffer const* buffer) const;
+    void writeOut(Buffer& buffer);
+    void append(char const* text, std::uint64_t size);
+    void newBuffer();
+    Buffer* makeBuffer();
+    void drop(Buffer* buffer);
+
+    LinkedList<Buffer> buffers_;
+    MemMgr* nodeMgr_ = nullptr;
+    Buffer* current_ = nullptr;
+    std::uint64_t session_ = 0;
+    HeapStr name_;
+    Lock lock_{Lock::Mutex, false};
+    bool closing_ = false;
+    std::uint32_t alertId_ = 0;
+    std::uint32_t lastWrite_ = 0;
+};
+
+} // namespace ZOR_Basis
+
+#endif

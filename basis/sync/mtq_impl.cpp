@@ -1,0 +1,145 @@
+#include "basis/sync/mtq_impl.h"
+
+#include "basis/memory/node_memory.h"
+#include "basis/sync/held_semaphore.h"
+#include "basis/sync/mtq_task.h"
+
+#include <thread>
+
+namespace ZOR_Basis {
+namespace {
+
+/// Between looks at the running jobs, where their signal cannot be waited for.
+constexpr std::uint32_t LOOK_AGAIN_MS = 1;
+
+} // namespace
+
+void runQueuedJob(void* job) {
+    auto& entry = static_cast<JobEntry&>(*static_cast<MTQ_Dat*>(job));
+    static_cast<MTQ_Impl*>(entry.queue())->run(entry);
+}
+
+MTQ_Impl::MTQ_Impl(ErrPolicy policy, int limit)
+    : policy_(policy), limit_(limit), mutex_(xos_SemMCreate()), completion_(xos_SemBCreate(0)) {}
+
+MTQ_Impl::~MTQ_Impl() {
+    // Who waits for the jobs may come here before the last of them has given its signal.
+    while (ending() != 0) std::this_thread::yield();
+    xos_SemDestroy(completion_);
+    xos_SemDestroy(mutex_);
+    while (JobEntry* const job = jobs_.first()) drop(job);
+}
+
+bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow,
+                   bool removeWhenDone) {
+    HeldSemaphore const held(mutex_);
+    if (!mayProceed()) return false;
+    auto* const job = makeNode<JobEntry>(jobMemory_, this, function, argument, ownsArgument, removeWhenDone);
+    if (job == nullptr) return false;
+    jobs_.append(job);
+    if (startNow || running() < limit_) return start(*job);
+    if (firstWaiting_ == nullptr) firstWaiting_ = job;
+    return true;
+}
+
+/// \pre the mutex is held
+bool MTQ_Impl::start(JobEntry& job) {
+    HeldSemaphore const held(mutex_);
+    running_.fetch_add(1, std::memory_order_relaxed);
+    bool const made = job.start();
+    // kept queue-01: the job without a task never reports its end, and still counts as running.
+    if (!made) failed_.store(true, std::memory_order_release);
+    return made;
+}
+
+void MTQ_Impl::wait() {
+    while (running() > 0) {
+        awaitCompletion();
+        startAllThatWait();
+    }
+}
+
+void MTQ_Impl::awaitCompletion() {
+    if (xos_SemTake(completion_) != 0) xos_TaskSleep(LOOK_AGAIN_MS);
+}
+
+// kept queue-02: the limit counts where jobs are added, not here.
+void MTQ_Impl::startAllThatWait() {
+    HeldSemaphore const held(mutex_);
+    JobEntry* job = firstWaiting_;
+    for (; job != nullptr && (job->started() || mayProceed()); job = job->next) {
+        if (!job->started()) start(*job);
+    }
+    firstWaiting_ = job;
+}
+
+MTQ_Dat* MTQ_Impl::first() {
+    HeldSemaphore const held(mutex_);
+    cursor_.moveTo(jobs_.first());
+    return current();
+}
+
+MTQ_Dat* MTQ_Impl::next() {
+    if (cursor_.isNowhere()) return nullptr;
+    HeldSemaphore const held(mutex_);
+    // The rest of the list may have been dropped meanwhile.
+    if (!cursor_.isNowhere()) cursor_.advance();
+    return current();
+}
+
+void MTQ_Impl::run(JobEntry& job) {
+    bool const result = job.callFunction();
+    ending_.fetch_add(1, std::memory_order_relaxed);
+    job.finish(result);
+    done(job);
+    ending_.fetch_sub(1, std::memory_order_release);
+}
+
+/// A job that finds the end of another waiting to be looked at leaves its own to that one's task: tasks that queued up at
+/// the mutex, which is held while others are created, would be slower than the jobs.
+void MTQ_Impl::done(MTQ_Dat& job) {
+    auto& entry = static_cast<JobEntry&>(job);
+    JobEntry* before = reports_.load(std::memory_order_relaxed);
+    do { entry.nextReported = before; } while (
+        !reports_.compare_exchange_weak(before, &entry, std::memory_order_acq_rel, std::memory_order_relaxed));
+    if (before != nullptr) return; // the job may be gone already
+    std::uint32_t ended = 0;
+    {
+        HeldSemaphore const held(mutex_);
+        for (JobEntry* next = takeReports(); next != nullptr; ++ended) {
+            JobEntry& one = *next;
+            next = one.nextReported;
+            end(one);
+        }
+    }
+    for (; ended != 0; --ended) xos_SemGive(completion_);
+}
+
+/// \return the jobs in the order of their ends
+JobEntry* MTQ_Impl::takeReports() {
+    JobEntry* inOrder = nullptr;
+    for (JobEntry* job = reports_.exchange(nullptr, std::memory_order_acq_rel); job != nullptr;) {
+        JobEntry* const earlier = job->nextReported;
+        job->nextReported = inOrder;
+        inOrder = job;
+        job = earlier;
+    }
+    return inOrder;
+}
+
+/// \pre the mutex is held
+void MTQ_Impl::end(JobEntry& job) {
+    running_.fetch_sub(1, std::memory_order_release);
+    if (!job.result()) failed_.store(true, std::memory_order_release);
+    if (job.removesWhenDone()) drop(&job);
+}
+
+/// \pre the mutex is held
+void MTQ_Impl::drop(JobEntry* job) {
+    cursor_.leave(job);
+    if (firstWaiting_ == job) firstWaiting_ = job->next;
+    jobs_.unlink(job);
+    deleteNode(jobMemory_, job);
+}
+
+} // namespace ZOR_Basis

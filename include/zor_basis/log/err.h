@@ -1,0 +1,22 @@
+/// \file
+/// `Err`: the entry points of an error log that is switched off.
+
+#ifndef ZOR_BASIS_LOG_ERR_H
+#define ZOR_BASIS_LOG_ERR_H
+
+#include "zor_basis/export.h"
+
+namespace ZOR_Basis {
+
+/// Callers may keep their calls: nothing is looked at and nothing happens.
+///
+/// \thread  thread-safe
+class ZB_API Err {
+public:
+    static void err(char const* text);
+    static void trace(char const* text);
+};
+
+} // namespace ZOR_Basis
+
+#endif

@@ -1,0 +1,88 @@
+/// \file
+/// Loggers whose alert, clock and files a test has in its hand.
+
+#ifndef TESTS_LOG_DRIVEN_LOGGER_H
+#define TESTS_LOG_DRIVEN_LOGGER_H
+
+#include "basis/files/system_calls.h"
+#include "basis/log/logger_impl.h"
+#include "tests/log/hand_clock.h"
+#include "tests/support/scratch.h"
+#include "tests/timers/scratch_root.h"
+
+#include <xos_host.h>
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <string>
+#include <vector>
+
+/// Each test has a log of its own name. Loggers are never closed here, as a closed one keeps its thread for ever.
+class DrivenLoggers : public testing::Test {
+protected:
+    static constexpr std::uint32_t PERIOD = ZOR_Basis::LoggerImpl::PERIOD_MS;
+
+    DrivenLoggers() {
+        handClock = 1'000'000;
+        self = this;
+        ZOR_Basis::systemCalls.openStream = open;
+    }
+    ~DrivenLoggers() override {
+        xos_HostFailClear();
+        ZOR_Basis::systemCalls.openStream = realOpen_;
+        self = nullptr;
+        for (ZOR_Basis::LoggerImpl* logger : loggers_) {
+            HQ_Basis::AlertTimer::Delete(logger->alertId());
+            delete logger;
+        }
+    }
+
+    static std::string name() { return testing::UnitTest::GetInstance()->current_test_info()->name(); }
+    static std::string folder() { return (scratchRoot() / "tmp/zb_log").generic_string(); }
+    static std::string file(int session) { return folder() + "/" + name() + "/" + std::to_string(session) + ".log"; }
+    /// What a file holds, with "\n" as line end.
+    static std::string content(int session) {
+        std::string lines;
+        for (char c : textOf(file(session))) {
+            if (c != '\r') lines += c;
+        }
+        return lines;
+    }
+
+    ZOR_Basis::LoggerImpl& start(std::string const& of) {
+        loggers_.push_back(ZOR_Basis::LoggerImpl::start(of.c_str()));
+        return *loggers_.back();
+    }
+    ZOR_Basis::LoggerImpl& start() { return start(name()); }
+
+    static void write(ZOR_Basis::Logger& logger, std::string line) {
+        line.append(2, '\0');
+        logger.out(line.data());
+    }
+    /// One look of the alert at what there is to write.
+    static void tick(ZOR_Basis::LoggerImpl const& logger) { ASSERT_EQ(xos_HostAlertFire(logger.alertId()), 0); }
+    static void tickAfter(std::uint32_t ms, ZOR_Basis::LoggerImpl const& logger) {
+        handClock += ms;
+        tick(logger);
+    }
+
+    /// Opened since the start of the test, with their modes.
+    std::vector<std::string> opened;
+    /// Called at each opening, while the logger is not locked.
+    std::function<void()> whileOpening;
+    bool failsToOpen = false;
+
+private:
+    static std::FILE* open(char const* path, char const* mode) {
+        self->opened.push_back(std::string(mode) + " " + path);
+        if (self->whileOpening) self->whileOpening();
+        return self->failsToOpen ? nullptr : self->realOpen_(path, mode);
+    }
+
+    static inline DrivenLoggers* self = nullptr;
+    decltype(ZOR_Basis::systemCalls.openStream) const realOpen_ = ZOR_Basis::systemCalls.openStream;
+    std::vector<ZOR_Basis::LoggerImpl*> loggers_;
+};
+
+#endif

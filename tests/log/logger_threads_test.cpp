@@ -1,0 +1,57 @@
+#include "tests/log/driven_logger.h"
+#include "tests/support/random_steps.h"
+
+#include <atomic>
+#include <map>
+#include <sstream>
+#include <thread>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+using LoggerThreads = DrivenLoggers;
+
+constexpr int WRITERS = 8;
+
+/// Every line of every writer once, whole, and each writer's in their order.
+void expectAllLines(std::string const& text, std::uint64_t lines) {
+    std::map<int, std::uint64_t> next;
+    std::istringstream all(text);
+    std::uint64_t count = 0;
+    for (std::string line; std::getline(all, line); ++count) {
+        int writer = -1;
+        unsigned long long number = 0;
+        char end[8] = "";
+        ASSERT_EQ(std::sscanf(line.c_str(), "writer %d line %llu %7s", &writer, &number, end), 3) << line;
+        ASSERT_STREQ(end, "ends");
+        ASSERT_EQ(number, next[writer]++) << "of writer " << writer;
+    }
+    EXPECT_EQ(count, WRITERS * lines);
+}
+
+} // namespace
+
+TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
+    LoggerImpl& logger = start();
+    std::uint64_t const lines = randomSteps(2000);
+    std::atomic<int> writing{WRITERS};
+    std::vector<std::thread> threads;
+    for (int writer = 0; writer < WRITERS; ++writer) {
+        threads.emplace_back([&, writer] {
+            std::string const who = "writer " + std::to_string(writer) + " line ";
+            for (std::uint64_t i = 0; i < lines; ++i) {
+                write(logger, who + std::to_string(i) + " ends");
+                if (i % 500 == 77) logger.newSession();
+            }
+            --writing;
+        });
+    }
+    while (writing != 0) tickAfter(PERIOD, logger);
+    for (std::thread& thread : threads) thread.join();
+    tickAfter(PERIOD, logger);
+    tickAfter(PERIOD, logger);
+    std::string all;
+    for (int session = 0; exists(file(session)) || exists(file(session + 1)); ++session) all += content(session);
+    expectAllLines(all, lines);
+}

@@ -1,0 +1,327 @@
+#include <zor_basis/sync.h>
+
+#include "tests/support/table.h"
+#include "tests/sync/gated_job.h"
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <memory>
+#include <string>
+#include <vector>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+using Queue = std::unique_ptr<MultiTaskQueue>;
+
+Queue make(MultiTaskQueue::ErrPolicy policy, int limit) { return Queue(MultiTaskQueue::New(policy, limit)); }
+
+/// Adds a job whose argument stays the test's.
+bool add(Queue const& queue, GatedJob& job, bool startNow = false, bool removeWhenDone = false) {
+    return queue->add(GatedJob::run, job.argument(), false, startNow, removeWhenDone);
+}
+
+std::vector<MTQ_Dat*> records(Queue const& queue) {
+    std::vector<MTQ_Dat*> all;
+    for (MTQ_Dat* record = queue->first(); record != nullptr; record = queue->next()) all.push_back(record);
+    return all;
+}
+
+std::string startedOnes(Queue const& queue) {
+    std::string text;
+    for (MTQ_Dat const* record : records(queue)) text += record->started() ? 's' : '-';
+    return text;
+}
+
+bool succeed(void*) { return true; }
+bool fail(void*) { return false; }
+
+} // namespace
+
+TEST(MultiTaskQueue, breathes) {
+    Queue const queue = make(MultiTaskQueue::Continue, 2);
+    std::atomic<int> ran{0};
+    for (int i = 0; i < 10; ++i) {
+        EXPECT_TRUE(queue->add([](void* count) { return ++*static_cast<std::atomic<int>*>(count) > 0; }, &ran, false,
+                               true, false));
+    }
+    queue->wait();
+    EXPECT_EQ(ran, 10);
+    EXPECT_FALSE(queue->failed());
+    EXPECT_EQ(records(queue).size(), 10u);
+    for (MTQ_Dat const* record : records(queue)) {
+        EXPECT_TRUE(record->started() && record->finished() && record->result());
+        EXPECT_EQ(record->argument(), &ran);
+    }
+}
+
+TEST(MultiTaskQueue, that_is_empty_waits_for_nothing) {
+    Queue const queue = make(MultiTaskQueue::StopOnError, 3);
+    queue->wait();
+    EXPECT_FALSE(queue->failed());
+    EXPECT_EQ(queue->first(), nullptr);
+    EXPECT_EQ(queue->next(), nullptr);
+    EXPECT_EQ(queue->current(), nullptr);
+}
+
+TEST(MultiTaskQueue, starts_as_many_as_the_limit_says_and_all_that_are_forced) {
+    struct Case {
+        Row row;
+        int limit;
+        /// For each job: f forced, q not.
+        char const* jobs;
+        char const* started;
+    };
+    for (Case const& c : {
+             Case{{}, 2, "qqqqq", "ss---"}, Case{{}, 0, "qqq", "---"}, Case{{}, -5, "qfq", "-s-"},
+             Case{{}, 1, "fq", "s-"}, Case{{}, 1, "qff", "sss"}, Case{{}, 3, "fqqqq", "sss--"},
+             Case{{}, 2, "ffqfq", "ss-s-"}, Case{{}, 2147483647, "qqqq", "ssss"}, Case{{}, -2147483647 - 1, "q", "-"},
+         }) {
+        SCOPED_TRACE(c.row);
+        std::vector<GatedJob> jobs(std::strlen(c.jobs));
+        {
+            Queue const queue = make(MultiTaskQueue::Continue, c.limit);
+            for (std::size_t i = 0; i < jobs.size(); ++i) EXPECT_TRUE(add(queue, jobs[i], c.jobs[i] == 'f'));
+            EXPECT_EQ(startedOnes(queue), c.started);
+            for (GatedJob& job : jobs) job.open();
+            queue->wait();
+        }
+    }
+}
+
+TEST(MultiTaskQueue, counts_finished_jobs_no_longer_to_the_limit) {
+    Queue const queue = make(MultiTaskQueue::Continue, 1);
+    GatedJob first, second;
+    EXPECT_TRUE(add(queue, first));
+    EXPECT_TRUE(add(queue, second));
+    EXPECT_EQ(startedOnes(queue), "s-");
+    first.open();
+    // The job counts until it has reported its end.
+    GatedJob* last = nullptr;
+    EXPECT_TRUE(soon([&] {
+        last = new GatedJob;
+        queue->add(GatedJob::run, last->argument(), true, false, false);
+        return records(queue).back()->started();
+    }));
+    EXPECT_FALSE(second.runs()) << "what was queued before stays there until somebody waits";
+    std::thread opener([&] {
+        EXPECT_TRUE(soon([&] { return second.runs(); }));
+        for (MTQ_Dat* record : records(queue)) {
+            static_cast<GatedJob*>(static_cast<MTQ_Arg*>(record->argument()))->open();
+        }
+    });
+    queue->wait();
+    opener.join();
+}
+
+TEST(MultiTaskQueue, Kept_queue_02_waiting_starts_all_that_are_left_when_a_job_finishes) {
+    Queue const queue = make(MultiTaskQueue::Continue, 2);
+    std::vector<GatedJob> jobs(5);
+    for (GatedJob& job : jobs) EXPECT_TRUE(add(queue, job));
+    std::atomic<bool> hasWaited{false};
+    std::thread waiter([&] {
+        queue->wait();
+        hasWaited = true;
+    });
+    EXPECT_TRUE(notInAMoment([&] { return jobs[2].runs() || hasWaited; }));
+    jobs[1].open();
+    EXPECT_TRUE(soon([&] { return jobs[2].runs() && jobs[3].runs() && jobs[4].runs(); })) << "together";
+    EXPECT_FALSE(hasWaited);
+    for (GatedJob& job : jobs) job.open();
+    waiter.join();
+    EXPECT_EQ(startedOnes(queue), "sssss");
+}
+
+TEST(MultiTaskQueue, remembers_failures_and_results) {
+    Queue const queue = make(MultiTaskQueue::Continue, 100);
+    EXPECT_TRUE(queue->add(succeed, nullptr, false, false, false));
+    EXPECT_TRUE(queue->add(fail, nullptr, false, false, false));
+    queue->wait();
+    EXPECT_TRUE(queue->failed());
+    EXPECT_TRUE(queue->add(succeed, nullptr, false, false, false)) << "goes on";
+    queue->wait();
+    EXPECT_TRUE(queue->failed()) << "for good";
+    std::vector<MTQ_Dat*> const all = records(queue);
+    EXPECT_TRUE(all[0]->result() && !all[1]->result() && all[2]->result());
+}
+
+TEST(MultiTaskQueue, stops_on_error_where_it_is_told_to) {
+    for (std::uint32_t policy : {1u, 2u, 0xFFFF'FFFFu}) {
+        SCOPED_TRACE(policy);
+        std::atomic<int> deletions{0};
+        GatedJob* const refused = new GatedJob(&deletions);
+        GatedJob first, second, queued, late;
+        {
+            Queue const queue = make(static_cast<MultiTaskQueue::ErrPolicy>(policy), 2);
+            EXPECT_TRUE(add(queue, first));
+            EXPECT_TRUE(add(queue, second));
+            EXPECT_TRUE(add(queue, queued));
+            first.open(false);
+            EXPECT_TRUE(soon([&] { return queue->failed(); }));
+            EXPECT_FALSE(add(queue, late));
+            EXPECT_FALSE(add(queue, late, true)) << "forced or not";
+            EXPECT_FALSE(queue->add(GatedJob::run, refused->argument(), true, true, false));
+            EXPECT_EQ(startedOnes(queue), "ss-") << "what was refused is not listed";
+            second.open();
+            queue->wait();
+            EXPECT_EQ(startedOnes(queue), "ss-");
+            EXPECT_TRUE(records(queue)[1]->result()) << "what ran goes on to its end";
+            EXPECT_FALSE(records(queue)[2]->finished());
+        }
+        EXPECT_EQ(deletions, 0) << "a refused argument stays the caller's";
+        delete refused;
+        EXPECT_FALSE(late.runs() || queued.runs());
+    }
+}
+
+TEST(MultiTaskQueue, deletes_owned_arguments_once_when_it_drops_their_jobs) {
+    std::atomic<int> deletions{0};
+    GatedJob borrowed(&deletions);
+    {
+        Queue const queue = make(MultiTaskQueue::Continue, 10);
+        std::vector<GatedJob*> owned;
+        for (int i = 0; i < 3; ++i) {
+            owned.push_back(new GatedJob(&deletions));
+            EXPECT_TRUE(queue->add(GatedJob::run, owned.back()->argument(), true, false, i == 1));
+        }
+        EXPECT_TRUE(queue->add(GatedJob::run, (new GatedJob(&deletions))->argument(), true, false, true));
+        EXPECT_TRUE(add(queue, borrowed));
+        auto* const last = static_cast<GatedJob*>(static_cast<MTQ_Arg*>(records(queue)[3]->argument()));
+        for (GatedJob* job : owned) job->open();
+        last->open(false);
+        borrowed.open();
+        queue->wait();
+        EXPECT_EQ(deletions, 2) << "those that go when they are done";
+        EXPECT_EQ(records(queue).size(), 3u);
+        EXPECT_TRUE(queue->failed());
+        EXPECT_TRUE(queue->add(succeed, nullptr, true, false, false)) << "null is nothing to delete";
+        queue->wait();
+    }
+    EXPECT_EQ(deletions, 4);
+}
+
+TEST(MultiTaskQueue, deletes_arguments_of_jobs_that_never_started) {
+    std::atomic<int> deletions{0};
+    {
+        Queue const queue = make(MultiTaskQueue::Continue, 0);
+        for (int i = 0; i < 5; ++i) {
+            EXPECT_TRUE(queue->add(GatedJob::run, (new GatedJob(&deletions))->argument(), true, false, i % 2 == 0));
+        }
+    }
+    EXPECT_EQ(deletions, 5);
+}
+
+TEST(MultiTaskQueue, drops_a_job_that_is_told_so_while_it_runs) {
+    Queue const queue = make(MultiTaskQueue::Continue, 10);
+    GatedJob first, second;
+    EXPECT_TRUE(add(queue, first));
+    EXPECT_TRUE(add(queue, second));
+    queue->first()->setRemoveWhenDone();
+    first.open();
+    second.open();
+    queue->wait();
+    ASSERT_EQ(records(queue).size(), 1u);
+    EXPECT_EQ(records(queue)[0]->argument(), second.argument());
+    records(queue)[0]->setRemoveWhenDone();
+    EXPECT_EQ(records(queue).size(), 1u) << "too late";
+}
+
+TEST(MultiTaskQueue, lists_jobs_in_the_order_of_adding) {
+    Queue const queue = make(MultiTaskQueue::Continue, 0);
+    int numbers[4] = {};
+    for (int& number : numbers) queue->add(succeed, &number, false, false, false);
+    EXPECT_EQ(queue->current(), nullptr);
+    EXPECT_EQ(queue->next(), nullptr) << "no walk yet";
+    MTQ_Dat* record = queue->first();
+    for (int& number : numbers) {
+        ASSERT_NE(record, nullptr);
+        EXPECT_EQ(record, queue->current());
+        EXPECT_EQ(record->argument(), &number);
+        record = queue->next();
+    }
+    EXPECT_EQ(record, nullptr);
+    EXPECT_EQ(queue->current(), nullptr);
+    EXPECT_EQ(queue->next(), nullptr);
+    EXPECT_EQ(queue->first()->argument(), &numbers[0]);
+}
+
+TEST(MultiTaskQueue, goes_on_behind_a_record_that_was_dropped_under_the_walk) {
+    for (std::size_t dropped : {0u, 1u, 2u}) {
+        SCOPED_TRACE(dropped);
+        Queue const queue = make(MultiTaskQueue::Continue, 10);
+        std::vector<GatedJob> jobs(3);
+        for (GatedJob& job : jobs) add(queue, job, true, true);
+        queue->first();
+        for (std::size_t i = 0; i < dropped; ++i) queue->next();
+        ASSERT_NE(queue->current(), nullptr);
+        jobs[dropped].open();
+        EXPECT_TRUE(soon([&] { return queue->current() == nullptr; }));
+        if (dropped < 2) {
+            MTQ_Dat const* const following = queue->next();
+            ASSERT_NE(following, nullptr);
+            EXPECT_EQ(following->argument(), jobs[dropped + 1].argument());
+            EXPECT_EQ(queue->current(), following);
+        } else {
+            EXPECT_EQ(queue->next(), nullptr);
+        }
+        for (GatedJob& job : jobs) job.open();
+        queue->wait();
+    }
+}
+
+TEST(MultiTaskQueue, runs_jobs_that_jobs_add) {
+    struct Family {
+        Queue queue = make(MultiTaskQueue::Continue, 1);
+        std::atomic<int> left{50};
+        static bool child(void* family) {
+            auto& self = *static_cast<Family*>(family);
+            return --self.left < 0 || self.queue->add(child, family, false, true, true);
+        }
+    } family;
+    family.queue->add(Family::child, &family, false, true, true);
+    family.queue->wait();
+    EXPECT_LT(family.left, 0);
+    EXPECT_FALSE(family.queue->failed());
+    EXPECT_EQ(family.queue->first(), nullptr);
+}
+
+TEST(MultiTaskQueue, may_be_deleted_as_soon_as_waiting_ends) {
+    for (int i = 0; i < 2000; ++i) {
+        Queue const queue = make(MultiTaskQueue::Continue, 4);
+        for (int job = 0; job < 3; ++job) queue->add(succeed, nullptr, false, false, job == 1);
+        queue->wait();
+    }
+}
+
+TEST(MultiTaskQueue, Kept_queue_03_counts_only_the_end_of_a_job_that_is_started_by_its_record) {
+    Queue const queue = make(MultiTaskQueue::StopOnError, 0);
+    GatedJob direct, first, second;
+    EXPECT_TRUE(add(queue, direct));
+    EXPECT_TRUE(queue->first()->start());
+    EXPECT_TRUE(queue->first()->started());
+    EXPECT_TRUE(soon([&] { return direct.runs(); }));
+    queue->wait(); // nothing that it knows of runs
+    EXPECT_FALSE(queue->first()->finished());
+    EXPECT_TRUE(add(queue, first, true)); // running: 1
+    direct.open(false);
+    EXPECT_TRUE(soon([&] { return queue->failed(); })) << "its end is reported all the same";
+    queue->wait(); // the other's end counted for the one that still runs
+    EXPECT_FALSE(records(queue)[1]->finished());
+    first.open();
+    EXPECT_TRUE(soon([&] { return records(queue)[1]->finished(); }));
+}
+
+TEST(MultiTaskQueue, drops_a_job_that_was_started_by_its_record) {
+    for (int i = 0; i < 500; ++i) {
+        std::atomic<int> deletions{0};
+        Queue queue = make(MultiTaskQueue::Continue, 0);
+        auto* const job = new GatedJob(&deletions);
+        job->open();
+        queue->add(GatedJob::run, job->argument(), true, false, true);
+        EXPECT_TRUE(queue->first()->start());
+        EXPECT_TRUE(soon([&] { return deletions == 1; }));
+        queue.reset();
+    }
+}
