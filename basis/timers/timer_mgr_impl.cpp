@@ -1,7 +1,7 @@
 #include "basis/timers/timer_mgr_impl.h"
 
-#include "basis/timers/complaint.h"
 #include "basis/sync/held_semaphore.h"
+#include "basis/timers/complaint.h"
 #include "basis/timers/report_file.h"
 #include "basis/timers/timer_mgr_mgr.h"
 #include "zor_basis/timers/pile_timer.h"
