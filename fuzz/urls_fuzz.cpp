@@ -1,6 +1,7 @@
 // Any text without zeros as a URL and as text with percent escapes.
 
 #include <zor_basis/files/f_path.h>
+#include <zor_basis/flat.h>
 
 #include <algorithm>
 #include <cstdlib>
@@ -43,6 +44,26 @@ std::string decoded(std::string const& text) {
     return out + text.substr(literal);
 }
 
+/// The plain function, which takes the two characters behind every "%", so that there have to be two.
+void requireEscapes(std::string text) {
+    std::string expected;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (text[i] != '%') {
+            expected += text[i];
+            continue;
+        }
+        text.resize(std::max(text.size(), i + 3), '4');
+        expected += static_cast<char>(std::max(0, digit(text[i + 1])) * 16 + std::max(0, digit(text[i + 2])));
+        i += 2;
+    }
+    std::string out(text.size() + 1, '#');
+    ZB_resolveURIEscapes(text.c_str(), out.data());
+    require(out.compare(0, expected.size() + 1, expected.c_str(), expected.size() + 1) == 0);
+    // In place; the terminator is then part of the text or the text's own.
+    ZB_resolveURIEscapes(text.data(), text.data());
+    require(text.compare(0, expected.size(), expected) == 0 && text.c_str()[expected.size()] == '\0');
+}
+
 void requireParts(std::string const& url) {
     BufStr<255> scheme("-");
     BufStr<255> user("-");
@@ -80,6 +101,7 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     path.addDecodedUrl(Str(text));
     require("dir" + decoded(text) == path.c_str());
     requireParts(text);
+    requireEscapes(text);
     FPath share("before");
     if (FPath(text).isURL() && share.ConvertFileURLtoUNC(text.c_str())) {
         require(share.size() >= 2 && std::strncmp(share.c_str(), "//", 2) == 0);

@@ -17,7 +17,7 @@ bool isStray(std::uint32_t unit) { return unit >= FIRST_STRAY && unit <= LAST_ST
 std::uint64_t characterLength(char const* text, std::uint64_t left) {
     WChar units[2];
     for (std::uint64_t bytes = 1; bytes <= LONGEST_CHARACTER && bytes <= left; ++bytes) {
-        if (Utf::toUtf16(text, bytes, units) != Utf::INVALID) return bytes;
+        if (Utf::toUtf16(text, bytes, units, 2) != Utf::INVALID) return bytes;
     }
     return 0;
 }
@@ -25,8 +25,9 @@ std::uint64_t characterLength(char const* text, std::uint64_t left) {
 void addWide(WBStr& out, char const* text, std::uint64_t length) {
     if (length == 0) return;
     std::uint64_t const start = out.size();
-    out.extendBuf(start + Utf::utf16Length(text, length));
-    out.setSize(start + Utf::toUtf16(text, length, out.getBuf() + start));
+    std::uint64_t const units = Utf::utf16Length(text, length);
+    out.extendBuf(start + units);
+    out.setSize(start + Utf::toUtf16(text, length, out.getBuf() + start, units));
 }
 
 } // namespace
@@ -59,7 +60,7 @@ void narrowName(WChar const* name, BufStr<255>& out) {
         std::uint64_t const start = out.size();
         std::uint64_t const bytes = Utf::utf8Length(name, units);
         out.extendBuf(start + bytes + 1);
-        Utf::toUtf8(name, units, out.getBuf() + start);
+        Utf::toUtf8(name, units, out.getBuf() + start, bytes);
         std::uint64_t const end = start + bytes;
         out.getBuf()[end] = static_cast<char>(*run != 0 ? *run - 0xDC00 : 0);
         out.resize(end + (*run != 0 ? 1 : 0));

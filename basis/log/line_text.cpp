@@ -154,6 +154,8 @@ bool QuickLine::writeCharacter(Conversion const& how) {
     return c != '\0' && writePadded(&c, 1, how);
 }
 
+static_assert(sizeof(std::size_t) == sizeof(std::intmax_t) && sizeof(std::ptrdiff_t) == sizeof(std::intmax_t));
+
 std::int64_t QuickLine::nextSigned(Conversion::Length length) {
     switch (length) {
     case Conversion::CHAR:
@@ -166,7 +168,6 @@ std::int64_t QuickLine::nextSigned(Conversion::Length length) {
         return va_arg(arguments_.list, long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_.list, std::ptrdiff_t);
     case Conversion::MAXIMUM:
         return va_arg(arguments_.list, std::intmax_t);
     default:
@@ -186,7 +187,6 @@ std::uint64_t QuickLine::nextUnsigned(Conversion::Length length) {
         return va_arg(arguments_.list, unsigned long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_.list, std::size_t);
     case Conversion::MAXIMUM:
         return va_arg(arguments_.list, std::uintmax_t);
     default:

@@ -27,7 +27,7 @@ MTQ_Impl::~MTQ_Impl() {
     while (ending() != 0) std::this_thread::yield();
     xos_SemDestroy(completion_);
     xos_SemDestroy(mutex_);
-    while (JobEntry* const job = jobs_.first()) drop(job);
+    while (JobEntry* const job = jobs_.takeFirst()) deleteNode(jobMemory_, job);
 }
 
 bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow, bool removeWhenDone) {

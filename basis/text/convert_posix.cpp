@@ -8,22 +8,27 @@
 namespace ZOR_Basis::ConvertImpl {
 namespace {
 
-constexpr std::uint64_t MOST_BYTES_A_UNIT = 3;
-
 bool isUtf8(Convert::Encoding encoding) { return encoding == Convert::ENC_UTF8 || Charset::isUtf8(Charset::local()); }
 
 bool utf8ToWide(char const* text, std::uint64_t size, WBStr& out) {
-    // UTF-16 never has more units than UTF-8 has bytes: where that many fit, nothing needs counting.
-    if (size >= out.sizeBuf()) out.extendBuf(Utf::utf16Length(text, size) + 1);
-    std::uint64_t const written = Utf::toUtf16(text, size, out.getBuf());
+    // Most results fit into what is there, and nothing is counted; one unit of the capacity stays free.
+    std::uint64_t written = Utf::toUtf16(text, size, out.getBuf(), out.sizeBuf() - 1);
+    if (written == Utf::NO_ROOM) {
+        out.extendBuf(Utf::utf16Length(text, size) + 1);
+        written = Utf::toUtf16(text, size, out.getBuf(), out.sizeBuf());
+    }
     out.setSize(written != Utf::INVALID ? written : 0);
     return written != Utf::INVALID;
 }
 
 bool wideToUtf8(WChar const* text, std::uint64_t size, BufStr<255>& out) {
-    if (size * MOST_BYTES_A_UNIT >= out.sizeBuf()) out.extendBuf(Utf::utf8Length(text, size) + 1);
+    std::uint64_t written = Utf::toUtf8(text, size, out.getBuf(), out.sizeBuf() - 1);
+    if (written == Utf::NO_ROOM) {
+        out.extendBuf(Utf::utf8Length(text, size) + 1);
+        written = Utf::toUtf8(text, size, out.getBuf(), out.sizeBuf());
+    }
     // kept convert-01: `resize` measures up to the first zero, so that the size is that of the text as C sees it.
-    out.resize(Utf::toUtf8(text, size, out.getBuf()));
+    out.resize(written);
     return true;
 }
 

@@ -10,7 +10,9 @@
 
 namespace ZOR_Basis::Utf {
 
+/// What a conversion gives instead of a length: the text is not UTF-8, or its converted form exceeds the room.
 inline constexpr std::uint64_t INVALID = ~std::uint64_t{0};
+inline constexpr std::uint64_t NO_ROOM = INVALID - 1;
 
 /// The code units of the UTF-16 form of `size` bytes of valid UTF-8. Of other text: a number that `toUtf16` does not
 /// exceed before it finds the fault.
@@ -18,17 +20,23 @@ std::uint64_t utf16Length(char const* text, std::uint64_t size);
 
 /// Writes the UTF-16 form of `size` bytes of UTF-8. Overlong forms, surrogates, values above U+10FFFF, stray and missing
 /// continuation bytes are invalid.
-/// \param out  room for `utf16Length` units; no terminator is written
-/// \return the units written; INVALID if the text is, with some units written
-std::uint64_t toUtf16(char const* text, std::uint64_t size, WChar* out);
+/// \param out  `room` units, none of which keeps its value; no terminator is written
+/// \return the units of the whole text; INVALID or NO_ROOM, whichever is met first
+std::uint64_t toUtf16(char const* text, std::uint64_t size, WChar* out, std::uint64_t room);
+
+/// The same on processors without SSSE3.
+std::uint64_t toUtf16WithoutShuffle(char const* text, std::uint64_t size, WChar* out, std::uint64_t room);
 
 /// The bytes of the UTF-8 form of `size` units of UTF-16, an unpaired surrogate counting as U+FFFD.
 std::uint64_t utf8Length(WChar const* text, std::uint64_t size);
 
 /// Writes the UTF-8 form of `size` units of UTF-16, U+FFFD for each unpaired surrogate.
-/// \param out  room for `utf8Length` bytes; no terminator is written
-/// \return the bytes written
-std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out);
+/// \param out  `room` bytes, none of which keeps its value; no terminator is written
+/// \return the bytes of the whole text; NO_ROOM
+std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
+
+/// The same on processors without SSSE3.
+std::uint64_t toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
 
 inline constexpr bool isSurrogate(std::uint32_t unit) { return (unit & 0xF800) == 0xD800; }
 inline constexpr bool isHighSurrogate(std::uint32_t unit) { return (unit & 0xFC00) == 0xD800; }

@@ -1,5 +1,6 @@
-// Status and open files beside the bare system calls. Everything lies in memory where there is /dev/shm, so that no disk
-// is measured.
+// Status and open files beside the bare system calls.
+
+#include "bench/support/tree.h"
 
 #include <zor_basis/files/f_stat.h>
 #include <zor_basis/files/file.h>
@@ -25,26 +26,8 @@ constexpr std::size_t PIECE = 4096;
 constexpr std::size_t PIECES = 64 * 1024 * 1024 / PIECE;
 constexpr int LINES = 1'000'000;
 
-class Workplace {
-public:
-    Workplace() {
-        fs::path const base = fs::exists("/dev/shm") ? fs::path{"/dev/shm"} : fs::temp_directory_path();
-        path_ = (base / ("bench-files-" + std::to_string(::getpid()))).string();
-        fs::create_directory(path_);
-    }
-    ~Workplace() { fs::remove_all(path_); }
-    Workplace(Workplace const&) = delete;
-    Workplace& operator=(Workplace const&) = delete;
-    std::string operator/(std::string const& name) const { return path_ + "/" + name; }
-
-private:
-    std::string path_;
-};
-
-Workplace const workplace;
-
 std::string existing() {
-    std::string const path = workplace / "existing";
+    std::string const path = workplace() / "existing";
     std::ofstream(path) << "text";
     return path;
 }
@@ -70,12 +53,12 @@ void statusSystem(benchmark::State& state, std::string const& path, int calls) {
 
 BENCHMARK_CAPTURE(statusOurs, e, existing())->Name("status/existing/ours");
 BENCHMARK_CAPTURE(statusSystem, e, existing(), 1)->Name("status/existing/system");
-BENCHMARK_CAPTURE(statusOurs, m, workplace / "missing")->Name("status/missing/ours");
-BENCHMARK_CAPTURE(statusSystem, m, workplace / "missing", 2)->Name("status/missing/system");
+BENCHMARK_CAPTURE(statusOurs, m, workplace() / "missing")->Name("status/missing/ours");
+BENCHMARK_CAPTURE(statusSystem, m, workplace() / "missing", 2)->Name("status/missing/system");
 
 /// 64 MiB, whichever row comes first.
 std::string stream() {
-    std::string const path = workplace / "stream";
+    std::string const path = workplace() / "stream";
     if (!fs::exists(path)) std::ofstream(path) << "";
     if (fs::file_size(path) != PIECES * PIECE) fs::resize_file(path, PIECES * PIECE);
     return path;
@@ -133,7 +116,7 @@ BENCHMARK(readOurs)->Name("stream/read/ours")->Unit(benchmark::kMillisecond);
 BENCHMARK(readSystem)->Name("stream/read/descriptor")->Unit(benchmark::kMillisecond);
 
 std::string lines() {
-    std::string const path = workplace / "lines";
+    std::string const path = workplace() / "lines";
     if (fs::exists(path)) return path;
     std::ofstream file(path);
     for (int i = 0; i < LINES; ++i) file << "line " << i << std::string(static_cast<std::size_t>(i % 60), '.') << '\n';

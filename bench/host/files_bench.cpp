@@ -1,103 +1,24 @@
 // Files and trees of the stand-alone platform layer beside raw system calls, the standard library and the system's own
-// programs. Everything lies in memory (/dev/shm, where there is one), so that no disk is measured.
+// programs.
 
 #include "basis/platform/xos_basics.h"
+#include "bench/support/tree.h"
 
 #include <benchmark/benchmark.h>
 
-#include <chrono>
 #include <cstdio>
 #include <dirent.h>
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
-#include <initializer_list>
 #include <memory>
 #include <random>
-#include <spawn.h>
 #include <string>
-#include <sys/wait.h>
 #include <unistd.h>
-#include <vector>
-
-extern char** environ;
 
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr int FOLDERS = 1'000;
-constexpr int FILES = 20'000;
-constexpr std::size_t LARGEST = 16 * 1024;
-
-/// The folder of this run, removed at its end.
-class Workplace {
-public:
-    Workplace() {
-        fs::path const base = fs::exists("/dev/shm") ? fs::path{"/dev/shm"} : fs::temp_directory_path();
-        path_ = (base / ("bench-host-" + std::to_string(::getpid()))).string();
-        fs::create_directory(path_);
-    }
-    ~Workplace() { fs::remove_all(path_); }
-    Workplace(Workplace const&) = delete;
-    Workplace& operator=(Workplace const&) = delete;
-
-    std::string operator/(std::string const& name) const { return path_ + "/" + name; }
-
-private:
-    std::string path_;
-};
-
-Workplace const& workplace() {
-    static Workplace const place;
-    return place;
-}
-
-/// 20,000 files of 0 to 16 KiB in 1,000 folders, eight to a folder.
-std::string const& sourceTree() {
-    static std::string const top = [] {
-        std::string path = workplace() / "tree";
-        std::mt19937 random{7};
-        std::vector<std::string> folders{path};
-        fs::create_directory(path);
-        for (int i = 1; i < FOLDERS; ++i) {
-            folders.push_back(folders[static_cast<std::size_t>((i - 1) / 8)] + "/folder-" + std::to_string(i));
-            fs::create_directory(folders.back());
-        }
-        std::string const content(LARGEST, 'x');
-        for (int i = 0; i < FILES; ++i) {
-            std::ofstream{folders[static_cast<std::size_t>(i % FOLDERS)] + "/document-" + std::to_string(i) + ".txt"}
-                .write(content.data(), static_cast<std::streamsize>(random() % (LARGEST + 1)));
-        }
-        return path;
-    }();
-    return top;
-}
-
-bool run(std::initializer_list<char const*> command) {
-    std::vector<char*> arguments;
-    for (char const* word : command) { arguments.push_back(const_cast<char*>(word)); }
-    arguments.push_back(nullptr);
-    pid_t child = 0;
-    int status = -1;
-    return ::posix_spawnp(&child, arguments[0], nullptr, nullptr, arguments.data(), environ) == 0 &&
-           ::waitpid(child, &status, 0) == child && status == 0;
-}
-
-/// Times `work` alone, between `before` and `after`.
-template <class Before, class Work, class After>
-void timed(benchmark::State& state, Before before, Work work, After after) {
-    for (auto _ : state) {
-        before();
-        auto const begin = std::chrono::steady_clock::now();
-        bool const good = work();
-        state.SetIterationTime(std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count());
-        if (!good) { state.SkipWithError("failed"); }
-        after();
-    }
-}
-
-constexpr auto NOTHING = [] {};
 
 // Trees
 
@@ -176,13 +97,13 @@ int directoriesBySystemCalls(int at, char const* name) {
 void listByHost(benchmark::State& state) {
     std::string const& top = sourceTree();
     for (auto _ : state) {
-        if (directoriesByHost(top) != FOLDERS) { state.SkipWithError("failed"); }
+        if (directoriesByHost(top) != SOURCE_FOLDERS) { state.SkipWithError("failed"); }
     }
 }
 void listBySystemCalls(benchmark::State& state) {
     std::string const& top = sourceTree();
     for (auto _ : state) {
-        if (directoriesBySystemCalls(AT_FDCWD, top.c_str()) != FOLDERS) { state.SkipWithError("failed"); }
+        if (directoriesBySystemCalls(AT_FDCWD, top.c_str()) != SOURCE_FOLDERS) { state.SkipWithError("failed"); }
     }
 }
 

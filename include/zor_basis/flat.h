@@ -7,6 +7,7 @@
 #include "zor_basis/export.h"
 #include "zor_basis/timers/timer_dat.h"
 
+#include <stdbool.h>
 #include <stdint.h>
 
 /// A copy of a zero-terminated text in a block of its own.
@@ -38,6 +39,34 @@ ZB_EXTERN_C ZB_API void ZB_replaceBackSlashes2(char const* source, char* target)
 /// \return 0, without a meaning
 /// \thread any
 ZB_EXTERN_C ZB_API int ZB_resolveURIEscapes(char const* in, char* out);
+
+/// Runs a command in the system's command interpreter, in a directory: `cd DIRECTORY& COMMAND`. Where the interpreter cannot
+/// be started it is tried again, five times in all with 500 ms after each.
+/// \param command    taken as it stands, with all that is special to the interpreter; null and empty run nothing
+/// \param directory  taken as it stands, up to the first "& " in it
+/// \param noResult   true: the platform layer is asked for no exit code; stand-alone this does not wait for the command
+/// \kept flat-03: a null or empty directory leaves a "cd" without an argument: "cd & COMMAND"
+/// \return whether the interpreter was started, whatever became of the command
+/// \thread any; the calling one waits
+ZB_EXTERN_C ZB_API bool ZB_runCommand(char const* command, char const* directory, bool noResult);
+
+/* The kinds of variable-data input: VPS, QDB, VIPP and PPML, as the configuration group "vdp" switches them on by its keys
+   "vps", "qdb", "vipp" and "ppml". All results are 1 or 0. Any thread may ask at any time. */
+
+/// Reads the configuration, anew if it has been read before.
+/// \kept flat-05: without the group every kind is on, while a key that the group lacks switches its kind off
+/// \return 0, without a meaning
+ZB_EXTERN_C ZB_API int setVDPFlagsFromCFG(void);
+/// Whether the configuration has been read, or looked for at least.
+ZB_EXTERN_C ZB_API int isVDPFlagsSetFromCFG(void);
+/// Whether one kind is on; reads the configuration if that has not been done yet.
+ZB_EXTERN_C ZB_API int isVPSON(void);
+ZB_EXTERN_C ZB_API int isQDBON(void);
+ZB_EXTERN_C ZB_API int isVIPPON(void);
+ZB_EXTERN_C ZB_API int isPPMLON(void);
+/// Whether any kind is on.
+/// \kept flat-04: does not read the configuration: 0 until one of the others has
+ZB_EXTERN_C ZB_API int isVDPON(void);
 
 /* Timers. Null arguments do nothing, and give null where there is a result. Flags: 0 is false, all else true. */
 

@@ -57,3 +57,18 @@ TEST(LinkedList, unlinks_the_first_the_last_one_between_and_the_only_one) {
     list.append(&nodes[3]);
     EXPECT_EQ(numbers(list), (Numbers{4}));
 }
+
+TEST(LinkedList, gives_the_first_away) {
+    LinkedList<Node> list;
+    EXPECT_EQ(list.takeFirst(), nullptr);
+    Node nodes[] = {{1}, {2}, {3}};
+    for (Node& node : nodes) list.append(&node);
+    EXPECT_EQ(list.takeFirst(), &nodes[0]);
+    EXPECT_EQ(numbers(list), (Numbers{2, 3}));
+    EXPECT_EQ(list.takeFirst(), &nodes[1]);
+    EXPECT_EQ(list.takeFirst(), &nodes[2]);
+    EXPECT_EQ(list.takeFirst(), nullptr);
+    EXPECT_EQ(list.size(), 0u);
+    list.append(&nodes[2]);
+    EXPECT_EQ(numbers(list), (Numbers{3}));
+}

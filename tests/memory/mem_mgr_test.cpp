@@ -66,16 +66,16 @@ TEST(MemMgrSmallBlock, sets_up_element_and_chunk_sizes) {
         std::vector<std::uint64_t> chunks;
     };
     for (Case const& c : {
-             Case{{}, 24, 100, 0, 8, 24, {4096, 8192, 16384, 16384}},
-             Case{{}, 10, 0, 0, 4, 12, {256, 512, 1024, 1024}},
-             Case{{}, 3, 16, 0, 1, 4, {128, 256, 512, 512}},
-             Case{{}, 8, 16, 0, 100, 8, {256, 512, 1024, 1024}},
+             Case{{}, 24, 100, 0, 8, 24, {4096, 8192, 16384, 16384}}, Case{{}, 10, 0, 0, 4, 12, {256, 512, 1024, 1024}},
+             Case{{}, 3, 16, 0, 1, 4, {128, 256, 512, 512}}, Case{{}, 8, 16, 0, 100, 8, {256, 512, 1024, 1024}},
              Case{{}, 9, 16, 0, 7, 12, {256, 512, 1024}},
              Case{{}, 16, 16, 64, 8, 16, {512, 1024, 2048, 2048}},   // four times as many: the hint counts
              Case{{}, 16, 16, 1000, 8, 16, {512, 1024, 2048, 4096}}, //
              Case{{}, 16, 16, 63, 8, 16, {512, 1024, 2048, 2048}},   // one less: it does not
              Case{{}, 1024, 100'000, 0, 8, 1024, {1 << 20, 2 << 20, 4 << 20, 4 << 20}}, // the first has 1 MiB at most
              Case{{}, 1024, 16, 1'000'000, 8, 1024, {32768, 65536, 131072}},
+             Case{{}, 124, 0, 0, 4, 124, {2048, 4096, 8192, 8192}}, // 17 elements would take more
+             Case{{}, 1024, 1'000, 1'000'000, 8, 1024, {1 << 20, 2 << 20, 4 << 20, 4 << 20}}, // 4 MiB at most
          }) {
         SCOPED_TRACE(c.row);
         SmBlMemMgr manager(c.elemSize, c.count, c.maxCount, c.align);
@@ -100,6 +100,16 @@ TEST(MemMgrSmallBlock, carves_downwards_and_takes_the_last_element_back) {
     EXPECT_EQ(manager->alloc(), b);
     manager->free(b);
     manager->free(a); // b went back to the chunk, so a is its last element now
+    EXPECT_EQ(manager->alloc(), a);
+    EXPECT_EQ(manager->alloc(), b);
+}
+
+TEST(MemMgrSmallBlock, takes_the_last_element_back_into_the_chunk_beside_those_that_were_freed) {
+    Manager const manager(MemMgr::makeSmlBlk(24, 100, 0, 8));
+    char* const a = bytes(manager->alloc());
+    char* const b = bytes(manager->alloc());
+    manager->free(a); // to those that were freed
+    manager->free(b); // back to the chunk
     EXPECT_EQ(manager->alloc(), a);
     EXPECT_EQ(manager->alloc(), b);
 }

@@ -28,4 +28,8 @@ struct ChildResult {
 
 ChildResult run(Child const& child);
 
+/// The path of a program beside the running one.
+/// \param name  without suffix
+std::string programBeside(std::string const& name);
+
 #endif

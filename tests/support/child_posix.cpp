@@ -28,8 +28,12 @@ namespace {
 
 } // namespace
 
+std::string programBeside(std::string const& name) {
+    return std::filesystem::read_symlink("/proc/self/exe").parent_path() / name;
+}
+
 ChildResult run(Child const& child) {
-    std::string const program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / child.program;
+    std::string const program = programBeside(child.program);
     int ends[2];
     if (::pipe(ends) != 0) return {};
     pid_t const process = ::fork();

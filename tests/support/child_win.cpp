@@ -8,13 +8,6 @@
 
 namespace {
 
-std::string folderOfThisProgram() {
-    char path[MAX_PATH] = {};
-    GetModuleFileNameA(nullptr, path, MAX_PATH);
-    std::string const program = path;
-    return program.substr(0, program.find_last_of("\\/") + 1);
-}
-
 std::string quoted(std::string const& argument) {
     std::string text = "\"";
     std::size_t backslashes = 0;
@@ -61,8 +54,15 @@ std::string readAll(HANDLE pipe) {
 
 } // namespace
 
+std::string programBeside(std::string const& name) {
+    char path[MAX_PATH] = {};
+    GetModuleFileNameA(nullptr, path, MAX_PATH);
+    std::string const own = path;
+    return own.substr(0, own.find_last_of("\\/") + 1) + name + ".exe";
+}
+
 ChildResult run(Child const& child) {
-    std::string const program = folderOfThisProgram() + child.program + ".exe";
+    std::string const program = programBeside(child.program);
     std::string commandLine = quoted(program);
     for (std::string const& argument : child.arguments) commandLine += " " + quoted(argument);
     std::string environment = environmentOf(child);

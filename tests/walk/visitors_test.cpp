@@ -6,6 +6,8 @@
 
 #include <gtest/gtest.h>
 
+#include <initializer_list>
+
 using namespace ZOR_Basis;
 
 namespace {
@@ -118,6 +120,52 @@ TEST_F(VisitorsTest, tell_of_every_failing_call) {
         EXPECT_EQ(exists(scratch / "dst/a"), c.there);
         EXPECT_TRUE(exists(scratch / "src/a"));
     }
+}
+
+TEST_F(VisitorsTest, moving_copies_where_the_platform_cannot_move) {
+    ASSERT_EQ(xos_HostFail("xos_FileMove", 0, 1), 0);
+    ASSERT_EQ(xos_HostFail("xos_DirMove", 0, 1), 0);
+    FileMoveVisitor move(at("dst"), false);
+    EXPECT_TRUE(walk("src", move));
+    EXPECT_EQ(scratch.content("src"), Names{});
+    EXPECT_EQ(scratch.content("dst"), (Names{"a", "d/", "d/b", "d/e/", "d/e/c"}));
+    EXPECT_EQ(textOf(scratch / "dst/d/e/c"), "cccc");
+}
+
+TEST_F(VisitorsTest, moving_loses_the_source_where_the_copy_fails_too) {
+    FileMoveVisitor move(at("dst"), false);
+    FileEntry file = entry("src", "a");
+    ASSERT_EQ(xos_HostFail("xos_FileMove", 0, 1), 0);
+    ASSERT_EQ(xos_HostFail("xos_FileCopy", 0, 1), 0);
+    EXPECT_FALSE(move.perform(&file));
+    FileEntry folder = entry("src", "d");
+    ASSERT_EQ(xos_HostFail("xos_DirMove", 0, 1), 0);
+    ASSERT_EQ(xos_HostFail("xos_DirCopy", 0, 1), 0);
+    EXPECT_FALSE(move.perform(&folder));
+    EXPECT_EQ(scratch.content("src"), Names{});
+    EXPECT_EQ(scratch.content("dst"), Names{});
+}
+
+TEST_F(VisitorsTest, keep_a_directory_that_cannot_be_removed) {
+    makeFolder(scratch / "dst/d/old");
+    FileEntry folder = entry("src", "d");
+    FileCopyVisitor copy(at("dst"), true, true);
+    FileMoveVisitor move(at("dst"), true);
+    FileDeleteVisitor remove;
+    for (FileVisitor* visitor : std::initializer_list<FileVisitor*>{&copy, &move, &remove}) {
+        ASSERT_EQ(xos_HostFail("xos_DirRemove", 0, 1), 0);
+        EXPECT_FALSE(visitor->perform(&folder));
+        EXPECT_EQ(scratch.content("dst"), (Names{"d/", "d/old/"}));
+        EXPECT_EQ(scratch.content("src"), (Names{"a", "d/", "d/b", "d/e/", "d/e/c"}));
+    }
+}
+
+TEST_F(VisitorsTest, fail_an_entry_and_go_on_with_the_others) {
+    put(scratch / "dst/a", "old");
+    FileCopyVisitor copy(at("dst"), false, true);
+    walk("src", copy, LOOK_BOTH, false);
+    EXPECT_EQ(scratch.content("dst"), (Names{"a", "d/", "d/b", "d/e/", "d/e/c"}));
+    EXPECT_EQ(textOf(scratch / "dst/a"), "old");
 }
 
 TEST_F(VisitorsTest, deleting_removes_files_and_trees) {

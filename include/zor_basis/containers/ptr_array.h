@@ -20,17 +20,18 @@ class PtrArray {
 public:
     /// An empty array with room for n pointers; 0 counts as 1.
     PtrArray(std::uint64_t n = 8) { extend(n != 0 ? n : 1); }
-    PtrArray(PtrArray const& other) : PtrArray(other.capacity_) { copySlots(other); }
+    PtrArray(PtrArray const& other) : PtrArray(other.capacity_) { *this = other; }
     /// Holds the other's pointers afterwards, in a block of its own with at least the other's capacity.
     PtrArray& operator=(PtrArray const& other) {
         if (this == &other) return *this;
         if (capacity_ < other.capacity_) {
             std::free(slots_);
             slots_ = makeSlots(capacity_ = other.capacity_);
-        } else {
-            std::memset(slots_, 0, count_ * sizeof(T*));
+            count_ = capacity_;
         }
-        copySlots(other);
+        if (other.count_ != 0) std::memcpy(slots_, other.slots_, other.count_ * sizeof(T*));
+        if (other.count_ < count_) std::memset(slots_ + other.count_, 0, (count_ - other.count_) * sizeof(T*));
+        count_ = other.count_;
         return *this;
     }
     /// Leaves what is pointed to alone.
@@ -67,6 +68,7 @@ protected:
         std::uint64_t const capacity = n > 2 * capacity_ ? n : 2 * capacity_;
         T** const slots = makeSlots(capacity);
         if (count_ != 0) std::memcpy(slots, slots_, count_ * sizeof(T*));
+        if (capacity <= FEW) std::memset(slots + count_, 0, (capacity - count_) * sizeof(T*));
         std::free(slots_);
         slots_ = slots;
         capacity_ = capacity;
@@ -77,15 +79,14 @@ protected:
     T** slots_ = nullptr;
 
 private:
-    static T** makeSlots(std::uint64_t n) {
-        T** const slots = static_cast<T**>(std::calloc(n, sizeof(T*)));
-        if (slots == nullptr) std::abort();
-        return slots;
-    }
+    /// Up to here the runtime has blocks at hand that cost less to clear than its own cleared blocks cost to find.
+    static constexpr std::uint64_t FEW = 128;
 
-    void copySlots(PtrArray const& other) {
-        count_ = other.count_;
-        if (count_ != 0) std::memcpy(slots_, other.slots_, count_ * sizeof(T*));
+    /// Null slots, or slots yet to be cleared where they are few.
+    static T** makeSlots(std::uint64_t n) {
+        void* const slots = n <= FEW ? std::malloc(n * sizeof(T*)) : std::calloc(n, sizeof(T*));
+        if (slots == nullptr) std::abort();
+        return static_cast<T**>(slots);
     }
 };
 

@@ -1,0 +1,58 @@
+#include "zor_basis/crypto/cr_hash.h"
+
+#include "basis/crypto/cr_hash_impl.h"
+#include "zor_basis/text/blob.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace ZOR_Basis {
+namespace {
+
+/// The service counts with 32 bits.
+constexpr std::uint64_t LARGEST_PIECE = std::uint64_t{1} << 30;
+
+std::uint32_t roomOf(Blob const& blob) {
+    return static_cast<std::uint32_t>(
+        std::min<std::uint64_t>(blob.sizeBuf(), std::numeric_limits<std::uint32_t>::max()));
+}
+
+bool exportTo(Blob& out, CryptService::Handle key) {
+    std::uint32_t n = 0;
+    if (!cryptService.exportKey(key, nullptr, n)) return false;
+    out.alloc(n, false);
+    if (out.sizeBuf() < n) return false;
+    n = roomOf(out);
+    if (!cryptService.exportKey(key, out.buf(), n)) return false;
+    out.setSize(n);
+    return true;
+}
+
+} // namespace
+
+CrHash::~CrHash() = default;
+
+CrHashWin::~CrHashWin() {
+    if (hash_ != 0) cryptService.destroyHash(hash_);
+}
+
+bool CrHashWin::hashData(void const* data, std::uint64_t len) {
+    if (data == nullptr && len != 0) return false;
+    char const* next = static_cast<char const*>(data);
+    while (len > LARGEST_PIECE) {
+        if (!cryptService.hashData(hash_, next, LARGEST_PIECE)) return false;
+        next += LARGEST_PIECE;
+        len -= LARGEST_PIECE;
+    }
+    return cryptService.hashData(hash_, next, static_cast<std::uint32_t>(len));
+}
+
+bool CrHashWin::exportKey(Blob& out) {
+    CryptService::Handle key = 0;
+    if (!cryptService.deriveKey(provider_, hash_, true, key)) return false;
+    bool const done = exportTo(out, key);
+    cryptService.destroyKey(key);
+    return done;
+}
+
+} // namespace ZOR_Basis

@@ -1,0 +1,172 @@
+// The sibling is process_win.cpp.
+
+#include "basis/system/process_impl.h"
+
+#include "basis/files/os_path_posix.h"
+#include "basis/system/command_line.h"
+#include "basis/system/process_calls_posix.h"
+#include "basis/system/unawaited_posix.h"
+
+#include <cerrno>
+#include <climits>
+#include <csignal>
+
+#include <dlfcn.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+namespace ZOR_Basis {
+namespace {
+
+// The C library's declarations of these two cannot be used from C++ everywhere.
+int openProcess(pid_t process) { return static_cast<int>(syscall(SYS_pidfd_open, process, 0)); }
+int signalDescriptor(int process, int signal) {
+    return static_cast<int>(syscall(SYS_pidfd_send_signal, process, signal, nullptr, 0));
+}
+
+} // namespace
+
+ProcessCalls processCalls{posix_spawn, posix_spawnp, waitid, openProcess, poll, signalDescriptor, kill, close};
+
+namespace {
+
+constexpr int SIGNALLED = 128;
+constexpr int WITHOUT_LIMIT = -1;
+constexpr std::size_t MOST_UNAWAITED = 4096;
+
+/// Takes what is left of an ended child from the system. \return false: it is no child of ours, or no longer
+bool takeEnd(idtype_t kind, int process, int flags, siginfo_t& end) {
+    while (processCalls.waitFor(kind, static_cast<id_t>(process), &end, WEXITED | flags) != 0) {
+        if (errno != EINTR) return false;
+    }
+    return true;
+}
+
+/// Also true for one that somebody else has taken.
+bool giveUp(pid_t child) {
+    siginfo_t end{};
+    return !takeEnd(P_PID, child, WNOHANG, end) || end.si_pid != 0;
+}
+
+constinit Unawaited<MOST_UNAWAITED, giveUp> unawaited;
+
+/// The standard descriptors and no blocked signals.
+class SpawnSettings {
+public:
+    SpawnSettings() {
+        posix_spawn_file_actions_init(&actions_);
+        isComplete_ = posix_spawn_file_actions_addclosefrom_np(&actions_, STDERR_FILENO + 1) == 0;
+        posix_spawnattr_init(&attributes_);
+        sigset_t none;
+        sigemptyset(&none);
+        posix_spawnattr_setsigmask(&attributes_, &none);
+        posix_spawnattr_setflags(&attributes_, POSIX_SPAWN_SETSIGMASK);
+    }
+    SpawnSettings(SpawnSettings const&) = delete;
+    SpawnSettings& operator=(SpawnSettings const&) = delete;
+    ~SpawnSettings() {
+        posix_spawnattr_destroy(&attributes_);
+        posix_spawn_file_actions_destroy(&actions_);
+    }
+
+    bool start(char const* program, bool search, char* const* words, pid_t& child) const {
+        auto const spawn = search ? processCalls.spawnFromPath : processCalls.spawn;
+        return isComplete_ && spawn(&child, OsPath(program), &actions_, &attributes_, words, environ) == 0;
+    }
+
+private:
+    posix_spawn_file_actions_t actions_;
+    posix_spawnattr_t attributes_;
+    bool isComplete_;
+};
+
+/// A process that was found by its identifier.
+class OpenProcess {
+public:
+    explicit OpenProcess(pid_t process) : descriptor_(processCalls.openProcess(process)) {}
+    OpenProcess(OpenProcess const&) = delete;
+    OpenProcess& operator=(OpenProcess const&) = delete;
+    ~OpenProcess() {
+        if (isOpen()) processCalls.close(descriptor_);
+    }
+
+    bool isOpen() const { return descriptor_ >= 0; }
+
+    bool hasEnded(int timeoutMs) const {
+        pollfd wanted{descriptor_, POLLIN, 0};
+        int ready = 0;
+        while ((ready = processCalls.awaitDescriptor(&wanted, 1, timeoutMs)) < 0 && errno == EINTR) {}
+        return ready > 0;
+    }
+
+    /// What is left of an ended child would stay in the system.
+    void takeLeftovers() const {
+        siginfo_t end{};
+        takeEnd(P_PIDFD, descriptor_, WNOHANG, end);
+    }
+
+    bool kill() const { return processCalls.signalDescriptor(descriptor_, SIGKILL) == 0; }
+
+private:
+    int const descriptor_;
+};
+
+/// 0, which is no process, for a number that cannot be one.
+pid_t processOf(unsigned long processId) { return processId <= INT_MAX ? static_cast<pid_t>(processId) : 0; }
+
+bool start(char const* application, char const* commandLine, pid_t& child) {
+    SpawnSettings const settings;
+    if (detail::isNothing(commandLine)) {
+        char* const words[] = {const_cast<char*>(application), nullptr};
+        return settings.start(application, false, words, child);
+    }
+    // Blanks before the name of a program that is searched for are no empty name.
+    if (application == nullptr) commandLine += std::strspn(commandLine, " \t");
+    CommandLine const line(commandLine);
+    if (line.words() == nullptr) return false;
+    return application != nullptr ? settings.start(application, false, line.words(), child)
+                                  : settings.start(line.words()[0], true, line.words(), child);
+}
+
+} // namespace
+
+bool ProcessImpl::create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode) {
+    pid_t child = 0;
+    if (!start(application, commandLine, child)) return false;
+    if (processId != nullptr) {
+        *processId = static_cast<unsigned long>(child);
+        unawaited.add(child);
+        return true;
+    }
+    siginfo_t end{};
+    if (takeEnd(P_PID, child, 0, end) && exitCode != nullptr)
+        *exitCode = end.si_code == CLD_EXITED ? end.si_status : SIGNALLED + end.si_status;
+    return true;
+}
+
+bool ProcessImpl::wait(unsigned long processId) {
+    pid_t const process = processOf(processId);
+    if (process == 0) return false;
+    unawaited.remove(process);
+    OpenProcess const open(process);
+    if (!open.isOpen()) {
+        // Children can be awaited without a descriptor.
+        siginfo_t end{};
+        return errno == ENOSYS && takeEnd(P_PID, process, 0, end);
+    }
+    if (!open.hasEnded(WITHOUT_LIMIT)) return false;
+    open.takeLeftovers();
+    return true;
+}
+
+bool ProcessImpl::terminate(unsigned long processId) {
+    pid_t const process = processOf(processId);
+    if (process == 0) return false;
+    OpenProcess const open(process);
+    if (!open.isOpen()) return errno == ENOSYS && processCalls.signalProcess(process, SIGKILL) == 0;
+    return !open.hasEnded(0) && open.kill();
+}
+
+void* ProcessImpl::findFunction(void* module, char const* name) { return dlsym(module, name); }
+
+} // namespace ZOR_Basis

@@ -1,0 +1,94 @@
+#include "zor_basis/system/vdp_temp_dir.h"
+
+#include "basis/files/platform_flags.h"
+#include "basis/platform/xos_basics.h"
+#include "basis/sync/held_semaphore.h"
+#include "basis/system/decimal_text.h"
+#include "zor_basis/files/dir.h"
+#include "zor_basis/files/f_stat.h"
+#include "zor_basis/system/sys.h"
+
+namespace ZOR_Basis {
+namespace {
+
+constexpr int NAMED_MUTEX = 264;
+constexpr char SHARED_FOLDER[] = "vdp_tmp";
+constexpr int CLEARS_THE_FOLDER = 1;
+
+/// What all processes of a user take turns by.
+xos_Sem mutexOfAllProcesses() {
+    static constinit std::uint32_t word = 0;
+    return xos_SemNamedMutexCreate(NAMED_MUTEX, 0, 0, &word);
+}
+
+/// Whether the path is a directory now.
+bool becomesDirectory(FPath const& path) {
+    FStat const entry(path.c_str());
+    // kept temp-02: what an earlier run has left is as good as new; who wants the folder empty starts as number 1.
+    if (entry.isDir()) return true;
+    return !entry.isFile() && Dir::NewFor(path) && xos_DirCreateEx(path, 0) == 0;
+}
+
+} // namespace
+
+static_assert(sizeof(xos_Sem) == sizeof(std::uint64_t));
+
+FPath VDPTempDir::_GlbTmp;
+BufStr<15> VDPTempDir::_CurName("0");
+BufStr<15> VDPTempDir::_ExtRip(".r");
+constinit std::atomic<std::uint64_t> VDPTempDir::_Sem{0};
+constinit std::atomic<std::int32_t> VDPTempDir::_Level{0};
+
+void VDPTempDir::Init(int n) {
+    if (_Sem != 0 && (n == 0 || _Level > 0)) return;
+    HeldSemaphore const all(mutexOfAllProcesses());
+    // kept temp-01: folders that jobs have already stay beneath the root.
+    if (_Level > 0 || (n == 0 && _GlbTmp.some())) return;
+    if (xos_Sem const naming = _Sem) {
+        HeldSemaphore const held(naming);
+        choose(n);
+    } else {
+        choose(n);
+        _Sem = xos_SemMCreate();
+    }
+    if (n > 0) _Level = n;
+}
+
+/// Sets the common folder and the suffix.
+void VDPTempDir::choose(int n) {
+    _GlbTmp = Sys::temp();
+    if (n <= 0) return;
+    _GlbTmp.add(SHARED_FOLDER);
+    _ExtRip << n;
+    if (n != CLEARS_THE_FOLDER) return;
+    Dir::Rem(_GlbTmp, true, false);
+    Dir::New(_GlbTmp, true);
+}
+
+/// What `Init` would have done.
+void VDPTempDir::prepare() {
+    HeldSemaphore const all(mutexOfAllProcesses());
+    if (_Level <= 0 && _GlbTmp.empty()) _GlbTmp = Sys::temp();
+    if (_Sem == 0) _Sem = xos_SemMCreate();
+}
+
+void VDPTempDir::Create(FPath& path) {
+    if (_Sem == 0) prepare();
+    HeldSemaphore const naming(_Sem);
+    // kept temp-03: a job cannot go on without its folder, and a root that is full or away comes back.
+    do {
+        incrementDecimal(_CurName);
+        path.assign(_GlbTmp, _CurName).addExt(_ExtRip, false);
+    } while (!becomesDirectory(path));
+}
+
+FPath const& VDPTempDir::Root() { return _GlbTmp; }
+
+VDPTempDir::~VDPTempDir() {
+    // kept temp-04: the second of two copies finds nothing any more.
+    if (deletes_ && FStat::isDir(path_)) xos_DirRemove(path_, REMOVE_ALWAYS | RECURSIVE);
+}
+
+bool VDPTempDir::status() const { return FStat::exist(path_); }
+
+} // namespace ZOR_Basis

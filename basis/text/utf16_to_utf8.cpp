@@ -1,0 +1,252 @@
+#include "basis/text/utf.h"
+#include "basis/text/utf_block.h"
+
+#include <algorithm>
+
+namespace ZOR_Basis::Utf {
+namespace {
+
+constexpr std::uint32_t REPLACEMENT = 0xFFFD;
+constexpr std::uint64_t LONGEST_CHARACTER = 4;
+
+/// What is left to read, and the room that is left to write.
+struct Progress {
+    WChar const* begin;
+    WChar const* text;
+    WChar const* end;
+    char* out;
+    char* outEnd;
+
+    std::uint64_t done() const { return static_cast<std::uint64_t>(text - begin); }
+    std::uint64_t left() const { return static_cast<std::uint64_t>(end - text); }
+    std::uint64_t room() const { return static_cast<std::uint64_t>(outEnd - out); }
+    void advance(std::uint64_t units, std::uint64_t bytes) {
+        text += units;
+        out += bytes;
+    }
+};
+
+__m128i units(int value) { return _mm_set1_epi16(static_cast<short>(value)); }
+
+/// All ones in each unit that has none of the given bits.
+__m128i without(__m128i block, int bits) {
+    return _mm_cmpeq_epi16(_mm_and_si128(block, units(bits)), _mm_setzero_si128());
+}
+
+bool isAscii(__m128i block) { return bitsOf(without(block, 0xFF80)) == 0xFFFF; }
+
+// ---- whole blocks: ASCII, and characters of two bytes among it --------------------------------------------------------
+
+constexpr Selection SHORTENED_UNITS = makeSelection(1, 2);
+
+/// Stores a block of units up to 0x7FF, each as one byte or two. \return the bytes; 0 if there are greater units
+ZB_SHUFFLE_TARGET inline unsigned storeMixedBlock(__m128i block, char* out) {
+    if (bitsOf(without(block, 0xF800)) != 0xFFFF) return 0;
+    __m128i const ascii = without(block, 0xFF80);
+    __m128i const lead = _mm_srli_epi16(block, 6);
+    __m128i const continuation = _mm_slli_epi16(_mm_and_si128(block, units(0x3F)), 8);
+    __m128i const two = _mm_or_si128(_mm_or_si128(lead, continuation), units(0x80C0));
+    __m128i const bytes = _mm_or_si128(_mm_and_si128(ascii, block), _mm_andnot_si128(ascii, two));
+    return storeSelected(out, bytes, bitsOf(_mm_packs_epi16(ascii, ascii)) & 0xFF, SHORTENED_UNITS);
+}
+
+struct WithShuffle {
+    ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
+};
+struct WithoutShuffle {
+    ZB_IN_CALLER static unsigned storeMixed(__m128i, char*) { return 0; }
+};
+
+ZB_IN_CALLER void takeAscii(Progress& progress) {
+    constexpr std::uint64_t STEP = 2 * BLOCK_UNITS;
+    for (std::uint64_t steps = std::min(progress.left(), progress.room()) / STEP; steps > 0; --steps) {
+        __m128i const low = loadBlock(progress.text);
+        __m128i const high = loadBlock(progress.text + BLOCK_UNITS);
+        if (!isAscii(_mm_or_si128(low, high))) return;
+        storeBlock(progress.out, _mm_packus_epi16(low, high));
+        progress.advance(STEP, STEP);
+    }
+}
+
+/// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
+template <class Shuffle>
+ZB_IN_CALLER void takeBlocks(Progress& progress) {
+    takeAscii(progress);
+    while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
+        __m128i const block = loadBlock(progress.text);
+        unsigned const ascii = bitsOf(without(block, 0xFF80));
+        unsigned const bytes = ascii != 0xFFFF ? Shuffle::storeMixed(block, progress.out) : 0;
+        if (bytes != 0) {
+            progress.advance(BLOCK_UNITS, bytes);
+            continue;
+        }
+        storeHalfBlock(progress.out, _mm_packus_epi16(block, block));
+        unsigned const front = static_cast<unsigned>(std::countr_one(ascii)) / 2;
+        if (front < BLOCK_UNITS) {
+            progress.advance(front, front);
+            return;
+        }
+        progress.advance(BLOCK_UNITS, BLOCK_UNITS);
+    }
+}
+
+/// The last units, fewer than a block, with zeros behind them.
+ZB_IN_CALLER __m128i lastBlock(Progress const& progress) {
+    WChar window[2 * BLOCK_UNITS] = {};
+    if (progress.done() < BLOCK_UNITS) {
+        std::memcpy(window, progress.text, progress.left() * sizeof(WChar));
+        return loadBlock(window);
+    }
+    storeBlock(window, loadBlock(progress.end - BLOCK_UNITS));
+    return loadBlock(window + BLOCK_UNITS - progress.left());
+}
+
+/// Takes the text's last units, if there are fewer than a block of them and none is above 0x7FF.
+template <class Shuffle>
+ZB_IN_CALLER void takeEnd(Progress& progress) {
+    std::uint64_t const left = progress.left();
+    if (left >= BLOCK_UNITS || left == 0 || progress.room() < BLOCK_BYTES) return;
+    __m128i const block = lastBlock(progress);
+    if (isAscii(block)) {
+        storeHalfBlock(progress.out, _mm_packus_epi16(block, block));
+        progress.advance(left, left);
+    } else if (unsigned const bytes = Shuffle::storeMixed(block, progress.out); bytes != 0) {
+        progress.advance(left, bytes - (BLOCK_UNITS - left));
+    }
+}
+
+// ---- runs of longer characters, as real text has them -----------------------------------------------------------------
+
+/// The three bytes of a unit above 0x7FF, the first one lowest.
+std::uint32_t threeBytes(std::uint32_t unit) {
+    return 0x8080E0u | unit >> 12 | (unit << 2 & 0x3F00) | (unit & 0x3F) << 16;
+}
+
+/// The four bytes of each surrogate pair in a word of one or two of them, the first one lowest.
+template <class Word>
+Word fourBytes(Word pairs) {
+    constexpr Word EACH = static_cast<Word>(0x00000001'00000001);
+    Word const high = (pairs & 0x3FF * EACH) + 0x40 * EACH; // the character without its lower ten bits
+    Word const low = pairs >> 16 & 0x3FF * EACH;
+    return 0x808080F0 * EACH | (high >> 8 & 0x07 * EACH) | (high & 0xFC * EACH) << 6 | (high & 0x03 * EACH) << 20 |
+           (low & 0x3C0 * EACH) << 10 | (low & 0x3F * EACH) << 24;
+}
+
+template <class Word>
+bool arePairs(Word units) {
+    constexpr Word EACH = static_cast<Word>(0x00000001'00000001);
+    return (units & 0xFC00FC00 * EACH) == 0xDC00D800 * EACH;
+}
+
+ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
+    // The word that is stored is one byte longer than the character.
+    while (progress.left() > 0 && progress.room() >= LONGEST_CHARACTER) {
+        std::uint32_t const unit = *progress.text;
+        if (unit < 0x800 || isSurrogate(unit)) return;
+        storeWord(progress.out, threeBytes(unit));
+        progress.advance(1, 3);
+    }
+}
+
+ZB_IN_CALLER void takePairs(Progress& progress) {
+    while (progress.left() >= 4 && progress.room() >= 2 * LONGEST_CHARACTER) {
+        auto const word = loadWord<std::uint64_t>(progress.text);
+        if (!arePairs(word)) return;
+        storeWord(progress.out, fourBytes(word));
+        progress.advance(4, 2 * LONGEST_CHARACTER);
+    }
+}
+
+// ---- one character ----------------------------------------------------------------------------------------------------
+
+struct Encoded {
+    std::uint32_t bytes; // the first one lowest
+    unsigned length;
+    unsigned units;
+};
+
+/// The character at the front of `size` units, U+FFFD for an unpaired surrogate.
+Encoded encode(WChar const* text, std::uint64_t size) {
+    std::uint32_t const unit = text[0];
+    if (unit < 0x80) return {unit, 1, 1};
+    if (unit < 0x800) return {0x80C0u | unit >> 6 | (unit & 0x3F) << 8, 2, 1};
+    if (size > 1) {
+        auto const word = loadWord<std::uint32_t>(text);
+        if (arePairs(word)) return {fourBytes(word), 4, 2};
+    }
+    return {threeBytes(isSurrogate(unit) ? REPLACEMENT : unit), 3, 1};
+}
+
+/// \return whether the character fits
+ZB_IN_CALLER bool takeCharacter(Progress& progress) {
+    Encoded const character = encode(progress.text, progress.left());
+    if (character.length > progress.room()) return false;
+    std::memcpy(progress.out, &character.bytes, character.length);
+    progress.advance(character.units, character.length);
+    return true;
+}
+
+template <class Shuffle>
+ZB_IN_CALLER std::uint64_t convert(Progress progress) {
+    char const* const out = progress.out;
+    while (progress.text != progress.end) {
+        takeBlocks<Shuffle>(progress);
+        takeThreeByteRun(progress);
+        takePairs(progress);
+        takeEnd<Shuffle>(progress);
+        if (progress.text != progress.end && !takeCharacter(progress)) return NO_ROOM;
+    }
+    return static_cast<std::uint64_t>(progress.out - out);
+}
+
+ZB_SHUFFLE_TARGET std::uint64_t toUtf8WithShuffle(WChar const* text, std::uint64_t size, char* out,
+                                                  std::uint64_t room) {
+    return convert<WithShuffle>({text, text, text + size, out, out + room});
+}
+
+// ---- lengths ----------------------------------------------------------------------------------------------------------
+
+/// How far the bytes of the unit at `text[at]` fall short of three. A pair's six count as four.
+unsigned savedAt(WChar const* text, std::uint64_t at, std::uint64_t size) {
+    std::uint32_t const unit = text[at];
+    if (unit < 0x80) return 2;
+    if (unit < 0x800) return 1;
+    return isHighSurrogate(unit) && at + 1 < size && isLowSurrogate(text[at + 1]) ? 2 : 0;
+}
+
+/// The same for eight units, negated. \pre a ninth unit
+__m128i savedIn(WChar const* text) {
+    __m128i const block = loadBlock(text);
+    __m128i const high = _mm_cmpeq_epi16(_mm_and_si128(block, units(0xFC00)), units(0xD800));
+    __m128i const low = _mm_cmpeq_epi16(_mm_and_si128(loadBlock(text + 1), units(0xFC00)), units(0xDC00));
+    __m128i const pair = _mm_and_si128(high, low);
+    return _mm_add_epi16(_mm_add_epi16(without(block, 0xFF80), without(block, 0xF800)), _mm_add_epi16(pair, pair));
+}
+
+} // namespace
+
+std::uint64_t utf8Length(WChar const* text, std::uint64_t size) {
+    constexpr std::uint64_t MOST_BLOCKS = 127; // at two a unit, more might overflow the byte that is summed
+    std::uint64_t saved = 0;
+    std::uint64_t done = 0;
+    while (size - done > BLOCK_UNITS) {
+        __m128i sums = _mm_setzero_si128();
+        for (std::uint64_t blocks = std::min((size - done - 1) / BLOCK_UNITS, MOST_BLOCKS); blocks > 0; --blocks) {
+            sums = _mm_sub_epi16(sums, savedIn(text + done));
+            done += BLOCK_UNITS;
+        }
+        saved += sumOfBytes(sums);
+    }
+    for (; done < size; ++done) saved += savedAt(text, done, size);
+    return 3 * size - saved;
+}
+
+std::uint64_t toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
+    return convert<WithoutShuffle>({text, text, text + size, out, out + room});
+}
+
+std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
+    return ZB_CAN_SHUFFLE ? toUtf8WithShuffle(text, size, out, room) : toUtf8WithoutShuffle(text, size, out, room);
+}
+
+} // namespace ZOR_Basis::Utf

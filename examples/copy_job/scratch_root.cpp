@@ -1,0 +1,23 @@
+#include "examples/copy_job/scratch_root.h"
+
+#include <xos_host.h>
+
+#include <filesystem>
+#include <random>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+FPath freshPath() {
+    std::string const name = "copy_job-" + std::to_string(std::random_device()());
+    return FPath((std::filesystem::temp_directory_path() / name).generic_string().c_str());
+}
+
+} // namespace
+
+ScratchRoot::ScratchRoot() : path_(freshPath()), made_(Dir::New(path_, false)) { xos_HostSetRoot(path_.c_str()); }
+
+ScratchRoot::~ScratchRoot() {
+    if (made_) Dir::Rem(path_, true, false);
+}

@@ -1,0 +1,5 @@
+#include "examples/copy_job/terminal.h"
+
+#include <unistd.h>
+
+bool outputIsTerminal() { return isatty(STDOUT_FILENO) != 0; }

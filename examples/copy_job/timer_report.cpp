@@ -1,0 +1,21 @@
+#include "examples/copy_job/timer_report.h"
+
+#include <zor_basis/walk.h>
+
+#include <cstdio>
+
+using namespace ZOR_Basis;
+
+bool printTimerReport(FPath const& root) {
+    FPath report;
+    if (zbFindFile(FPath(root, "timer"), "*.timer", LOOK_FILES, report, false, false) == 0) return false;
+    File file(report, File::FILE_READ | File::FILE_BINARY);
+    if (!file.isOpen()) return false;
+    std::putchar('\n');
+    char piece[4096];
+    while (auto const got = file->read(piece, sizeof piece)) {
+        // A row ends in a zero byte and a line feed, for programs that look at one row at a time.
+        for (std::uint64_t i = 0; i < got; ++i) std::putchar(piece[i] != '\0' ? piece[i] : ' ');
+    }
+    return true;
+}

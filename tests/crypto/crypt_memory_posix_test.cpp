@@ -1,0 +1,151 @@
+// What is in each block at the moment when it is released, and what becomes of calls for which there is no memory. The
+// linker leads every `malloc` and `free` of this program's objects here, the library's own ones included.
+
+#include "tests/crypto/crypt_user.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+
+using namespace ZOR_Basis;
+
+extern "C" {
+void* __real_malloc(std::size_t n);
+void __real_free(void* block);
+void* __wrap_malloc(std::size_t n);
+void __wrap_free(void* block);
+}
+
+namespace {
+
+constexpr std::size_t MOST = 32;
+
+/// Blocks made while watched, and whether they were all zero when they were released.
+struct Watch {
+    struct Block {
+        void* place;
+        std::size_t size;
+        bool released, wiped;
+    };
+    bool on = false;
+    std::size_t lacking = MOST; // the number of the block for which there is no memory
+    std::size_t asked = 0;
+    std::size_t made = 0;
+    Block blocks[MOST];
+} watch;
+
+/// While one lives, blocks are watched.
+struct Watched {
+    explicit Watched(std::size_t lacking = MOST) {
+        watch = {};
+        watch.lacking = lacking;
+        watch.on = true;
+    }
+    ~Watched() { watch.on = false; }
+};
+
+} // namespace
+
+void* __wrap_malloc(std::size_t n) {
+    if (!watch.on) return __real_malloc(n);
+    if (watch.asked++ == watch.lacking || watch.made == MOST) return nullptr;
+    void* const block = __real_malloc(n);
+    watch.blocks[watch.made++] = {block, n, false, false};
+    return block;
+}
+
+void __wrap_free(void* block) {
+    for (std::size_t i = 0; watch.on && i < watch.made; ++i) {
+        Watch::Block& known = watch.blocks[i];
+        if (known.place != block || known.released) continue;
+        known.released = true;
+        known.wiped = true;
+        for (std::size_t at = 0; at < known.size; ++at) known.wiped &= static_cast<char*>(block)[at] == 0;
+    }
+    __real_free(block);
+}
+
+TEST(CryptMemory, is_wiped_before_it_is_released) {
+    CryptUser const user;
+    {
+        Watched const watched;
+        {
+            CrHashPtr hash(user.crypt.get());
+            hash->hashData("a secret of more bytes than the one block that the hash takes at a time, and then some",
+                           86);
+            SecretBlob exported;
+            exported.copy(5, "small");
+            ASSERT_TRUE(hash->exportKey(exported));
+            std::unique_ptr<CrKey> const key(user.crypt->deriveKey(hash));
+            SecretBlob message;
+            message.copy(7, "message");
+            ASSERT_TRUE(key->encrypt(message, message));
+            ASSERT_TRUE(key->decrypt(message, message));
+        }
+    }
+    EXPECT_EQ(watch.made, 7u) << "hash, two blocks of the blob, exported key, key, two blocks of the message";
+    for (std::size_t i = 0; i < watch.made; ++i) {
+        EXPECT_TRUE(watch.blocks[i].released) << i;
+        EXPECT_TRUE(watch.blocks[i].wiped) << i;
+    }
+}
+
+TEST(CryptMemory, may_be_short_for_a_hash) {
+    CryptUser const user;
+    Watched const watched(0);
+    std::unique_ptr<CrHash> const hash(user.crypt->createHash());
+    ASSERT_NE(hash, nullptr);
+    EXPECT_FALSE(hash->isValid());
+    EXPECT_FALSE(hash->hashData("x", 1));
+}
+
+TEST(CryptMemory, may_be_short_for_a_key) {
+    CryptUser const user;
+    std::unique_ptr<CrHash> const hash = user.hash("secret");
+    Watched const watched(0);
+    std::unique_ptr<CrKey> const key(user.crypt->deriveKey(hash.get()));
+    ASSERT_NE(key, nullptr);
+    EXPECT_FALSE(key->isValid());
+}
+
+TEST(CryptMemory, may_be_short_for_an_exported_key) {
+    CryptUser const user;
+    std::unique_ptr<CrHash> const hash = user.hash("secret");
+    for (std::size_t lacking : {0, 1}) {
+        SecretBlob out;
+        out.copy(3, "abc");
+        {
+            Watched const watched(lacking);
+            EXPECT_FALSE(hash->exportKey(out)) << lacking;
+        }
+        EXPECT_EQ(bytesOf(out), "abc") << lacking;
+        for (std::size_t i = 0; i < watch.made; ++i) EXPECT_TRUE(watch.blocks[i].released) << lacking;
+    }
+}
+
+TEST(CryptMemory, may_be_short_for_a_message) {
+    CryptUser const user;
+    std::unique_ptr<CrKey> const key = user.key("secret");
+    Blob const plain = blobOf("message");
+    Blob same = plain;
+    Blob out = blobOf("abc");
+    {
+        Watched const watched(0);
+        EXPECT_FALSE(key->encrypt(same, same));
+        EXPECT_FALSE(watch.asked == 0);
+    }
+    EXPECT_EQ(bytesOf(same), "message");
+    {
+        Watched const watched(0);
+        EXPECT_FALSE(key->encrypt(plain, out));
+    }
+    EXPECT_EQ(bytesOf(out), "abc");
+    Blob const encryptedOne = blobOf(encrypted(*key, "message"));
+    {
+        Watched const watched(0);
+        EXPECT_FALSE(key->decrypt(encryptedOne, out));
+    }
+    EXPECT_EQ(bytesOf(out), "abc");
+    EXPECT_TRUE(key->decrypt(encryptedOne, out));
+    EXPECT_EQ(bytesOf(out), "message");
+}

@@ -1,0 +1,160 @@
+// temp_dir_child STEP...: folders for jobs from the very first one, each case in a process of its own.
+//   init=N           VDPTempDir::Init(N)
+//   root             prints VDPTempDir::Root()
+//   make             makes one that deletes and lives to the end: prints its path
+//   keep             makes one that does not delete
+//   create           VDPTempDir::Create: prints the path
+//   drop             destroys the last one that was made
+//   deletes=0|1      deleteOnDestroy of the last one
+//   copy             makes a copy of the last one
+//   assign           makes another and assigns the last one to it: prints the path that it had before
+//   status           prints the status of the last one
+//   put=NAME         puts a file into the last one's folder
+//   replace          puts a file in place of the last one's folder
+//   calls=FUNCTION   prints how often the platform layer was called, last=FUNCTION the arguments of the last call
+//   fail=FUNCTION    lets its next call fail
+//   touch=FILE       makes an empty file
+//   wait=FILE        waits until there is such a file, a minute at most
+//   unblock=FILE     removes that file as soon as a hundred names have been tried in vain
+//   threads=COUNT    so many threads make 25 folders each, put a file into each and keep half of them until all threads are
+//                    done: prints the paths
+
+#include <zor_basis/system/vdp_temp_dir.h>
+
+#include <xos_host.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <list>
+#include <string>
+#include <thread>
+#include <vector>
+
+namespace fs = std::filesystem;
+using namespace ZOR_Basis;
+
+namespace {
+
+constexpr int EACH = 25;
+
+std::list<VDPTempDir> folders;
+std::thread helper;
+
+void print(char const* text) { std::printf("%s\n", text != nullptr ? text : "none"); }
+
+template <class Condition>
+bool waitUntil(Condition condition) {
+    auto const end = std::chrono::steady_clock::now() + std::chrono::minutes(1);
+    while (!condition()) {
+        if (std::chrono::steady_clock::now() > end) return false;
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    }
+    return true;
+}
+
+void assign() {
+    VDPTempDir other(false);
+    FPath const before = other.path();
+    other = folders.back();
+    other.deleteOnDestroy(false);
+    print(other.path() == folders.back().path() ? before.c_str() : "another path");
+}
+
+void unblock(std::string const& path) {
+    helper = std::thread([path] {
+        // Each attempt asks the platform layer for the status of the new name.
+        if (!waitUntil([] { return xos_HostCalls("xos_FileStatByNameEx") >= 100; })) std::abort();
+        fs::remove(path);
+    });
+}
+
+void makeMany(std::vector<VDPTempDir>& kept, std::string& paths) {
+    kept.reserve(EACH);
+    for (int i = 0; i < EACH; ++i) {
+        VDPTempDir folder;
+        fs::path const file = fs::path(folder.path().c_str()) / "file";
+        if (!fs::is_directory(folder.path().c_str()) || fs::exists(file)) std::abort();
+        std::ofstream(file) << i;
+        paths += std::string(folder.path().c_str()) + "\n";
+        if (i % 2 != 0) continue;
+        kept.push_back(folder);
+        folder.deleteOnDestroy(false);
+    }
+}
+
+void race(int count) {
+    std::vector<std::vector<VDPTempDir>> kept(static_cast<std::size_t>(count));
+    std::vector<std::string> paths(kept.size());
+    std::vector<std::thread> threads;
+    for (std::size_t i = 0; i < kept.size(); ++i) {
+        threads.emplace_back([&kept, &paths, i] { makeMany(kept[i], paths[i]); });
+    }
+    for (std::thread& thread : threads) thread.join();
+    for (std::string const& lines : paths) std::fputs(lines.c_str(), stdout);
+}
+
+bool perform(std::string const& name, std::string const& value) {
+    if (name == "init") {
+        VDPTempDir::Init(std::atoi(value.c_str()));
+    } else if (name == "root") {
+        print(VDPTempDir::Root().c_str());
+    } else if (name == "make" || name == "keep") {
+        folders.emplace_back(name == "make");
+        print(folders.back().path().c_str());
+    } else if (name == "create") {
+        FPath path("before");
+        VDPTempDir::Create(path);
+        print(path.c_str());
+    } else if (name == "drop") {
+        folders.pop_back();
+    } else if (name == "deletes") {
+        folders.back().deleteOnDestroy(value == "1");
+    } else if (name == "copy") {
+        folders.emplace_back(folders.back());
+    } else if (name == "assign") {
+        assign();
+    } else if (name == "status") {
+        print(folders.back().status() ? "there" : "gone");
+    } else if (name == "put") {
+        std::ofstream((folders.back().path().c_str() + ("/" + value)).c_str()) << "text";
+    } else if (name == "replace") {
+        fs::remove_all(folders.back().path().c_str());
+        std::ofstream(folders.back().path().c_str()) << "text";
+    } else if (name == "calls") {
+        print(std::to_string(xos_HostCalls(value.c_str())).c_str());
+    } else if (name == "last") {
+        print(xos_HostLastCall(value.c_str()));
+    } else if (name == "fail") {
+        xos_HostFail(value.c_str(), 0, 1);
+    } else if (name == "touch") {
+        std::ofstream(value.c_str()).flush();
+    } else if (name == "wait") {
+        return waitUntil([&value] { return fs::exists(value); });
+    } else if (name == "unblock") {
+        unblock(value);
+    } else if (name == "threads") {
+        race(std::atoi(value.c_str()));
+    } else {
+        return false;
+    }
+    return true;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    for (int i = 1; i < argc; ++i) {
+        std::string const step = argv[i];
+        std::size_t const equals = std::min(step.find('='), step.size());
+        std::string const value = equals < step.size() ? step.substr(equals + 1) : "";
+        if (!perform(step.substr(0, equals), value)) return 2;
+    }
+    if (helper.joinable()) helper.join();
+    folders.clear();
+    return 0;
+}
