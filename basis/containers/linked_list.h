@@ -30,6 +30,16 @@ public:
         --count_;
     }
 
+    /// \return the first node, which is no longer in the list; null without any
+    Node* takeFirst() {
+        Node* const node = first_;
+        if (node == nullptr) return nullptr;
+        first_ = node->next;
+        (first_ != nullptr ? first_->previous : last_) = nullptr;
+        --count_;
+        return node;
+    }
+
 private:
     Node* first_ = nullptr;
     Node* last_ = nullptr;

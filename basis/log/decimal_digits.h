@@ -36,7 +36,7 @@ inline constexpr std::uint64_t POWERS_OF_TEN[] = {
 /// 1 for 0.
 inline int decimalDigits(std::uint64_t number) {
     // A bit is worth 1233 / 4096 digits, which is exact enough up to 64 of them.
-    int const digits = std::bit_width(number | 1) * 1233 >> 12;
+    int const digits = static_cast<int>(std::bit_width(number | 1)) * 1233 >> 12;
     return digits + (number >= POWERS_OF_TEN[digits] || digits == 0 ? 1 : 0);
 }
 

@@ -12,6 +12,13 @@
 #include <cstdio>
 #include <cstring>
 
+/// The frequent steps exist twice, for plain conversions and for all, and are worth it.
+#if defined(__GNUC__)
+#define ZB_ALWAYS_INLINE [[gnu::always_inline]] inline
+#else
+#define ZB_ALWAYS_INLINE inline
+#endif
+
 namespace ZOR_Basis {
 namespace {
 
@@ -72,7 +79,7 @@ bool QuickLine::write(char const* format) {
 }
 
 /// Goes on to the next conversion, or to the end.
-[[gnu::always_inline]] inline bool QuickLine::putPlain(char const*& format) {
+ZB_ALWAYS_INLINE bool QuickLine::putPlain(char const*& format) {
     char* at = at_;
     char const* from = format;
     while (*from != '%' && *from != '\0' && at != end_) *at++ = *from++;
@@ -123,7 +130,7 @@ bool QuickLine::writeParsed(Conversion const& how) {
     }
 }
 
-[[gnu::always_inline]] inline bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
+ZB_ALWAYS_INLINE bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
     std::size_t const blanks = how.width > size ? how.width - size : 0;
     if (size + blanks > room()) return false;
     if (!how.isLeft) fill(' ', blanks);
@@ -132,7 +139,7 @@ bool QuickLine::writeParsed(Conversion const& how) {
     return true;
 }
 
-[[gnu::always_inline]] inline bool QuickLine::writeText(Conversion const& how) {
+ZB_ALWAYS_INLINE bool QuickLine::writeText(Conversion const& how) {
     if (how.length != Conversion::NONE || how.hasZeros || how.hasSignFlag()) return false;
     char const* const text = va_arg(arguments_.list, char const*);
     if (text == nullptr) return false;
@@ -147,6 +154,8 @@ bool QuickLine::writeCharacter(Conversion const& how) {
     return c != '\0' && writePadded(&c, 1, how);
 }
 
+static_assert(sizeof(std::size_t) == sizeof(std::intmax_t) && sizeof(std::ptrdiff_t) == sizeof(std::intmax_t));
+
 std::int64_t QuickLine::nextSigned(Conversion::Length length) {
     switch (length) {
     case Conversion::CHAR:
@@ -159,7 +168,6 @@ std::int64_t QuickLine::nextSigned(Conversion::Length length) {
         return va_arg(arguments_.list, long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_.list, std::ptrdiff_t);
     case Conversion::MAXIMUM:
         return va_arg(arguments_.list, std::intmax_t);
     default:
@@ -179,7 +187,6 @@ std::uint64_t QuickLine::nextUnsigned(Conversion::Length length) {
         return va_arg(arguments_.list, unsigned long long);
     case Conversion::SIZE:
     case Conversion::DIFFERENCE:
-        return va_arg(arguments_.list, std::size_t);
     case Conversion::MAXIMUM:
         return va_arg(arguments_.list, std::uintmax_t);
     default:
@@ -193,13 +200,12 @@ char signOf(bool isNegative, Conversion const& how) {
     return how.hasBlank ? ' ' : '\0';
 }
 
-[[gnu::always_inline]] inline bool QuickLine::writeSigned(Conversion const& how) {
+ZB_ALWAYS_INLINE bool QuickLine::writeSigned(Conversion const& how) {
     if (how.precision >= 0) return false;
     std::int64_t const number = nextSigned(how.length);
     auto const bits = static_cast<std::uint64_t>(number);
     std::uint64_t const magnitude = number < 0 ? 0 - bits : bits;
-    return writeNumber(signOf(number < 0, how), how,
-                       [magnitude](char* to) { return writeDecimal(to, magnitude); });
+    return writeNumber(signOf(number < 0, how), how, [magnitude](char* to) { return writeDecimal(to, magnitude); });
 }
 
 template <int BASE>

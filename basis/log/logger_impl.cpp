@@ -43,7 +43,7 @@ LoggerImpl* LoggerImpl::start(char const* name) {
 }
 
 LoggerImpl::~LoggerImpl() {
-    while (Buffer* const buffer = buffers_.first()) drop(buffer);
+    while (Buffer* const buffer = buffers_.takeFirst()) deleteBuffer(buffer);
 }
 
 void LoggerImpl::newSession() {
@@ -94,8 +94,7 @@ LoggerImpl::Buffer* LoggerImpl::makeBuffer() {
     return buffer;
 }
 
-void LoggerImpl::drop(Buffer* buffer) {
-    buffers_.unlink(buffer);
+void LoggerImpl::deleteBuffer(Buffer* buffer) {
     std::free(buffer->data);
     deleteNode(nodeMgr_, buffer);
 }
@@ -121,7 +120,8 @@ bool LoggerImpl::flush() {
         if (buffer == current_ || buffer->flushed < buffer->used) continue;
         Buffer* const written = buffer;
         buffer = buffer->next;
-        drop(written);
+        buffers_.unlink(written);
+        deleteBuffer(written);
     }
     return ends;
 }

@@ -55,7 +55,7 @@ private:
     void append(char const* text, std::uint64_t size);
     void newBuffer();
     Buffer* makeBuffer();
-    void drop(Buffer* buffer);
+    void deleteBuffer(Buffer* buffer);
 
     LinkedList<Buffer> buffers_;
     MemMgr* nodeMgr_ = nullptr;

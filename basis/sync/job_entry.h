@@ -58,9 +58,7 @@ private:
 
     static std::uintptr_t wordOf(JobEntry* entry) { return reinterpret_cast<std::uintptr_t>(entry); }
     bool isBetween() const { return (place_.load(std::memory_order_acquire) & BETWEEN) != 0; }
-    JobEntry* nearest() const {
-        return reinterpret_cast<JobEntry*>(place_.load(std::memory_order_acquire) & ~BETWEEN);
-    }
+    JobEntry* nearest() const { return reinterpret_cast<JobEntry*>(place_.load(std::memory_order_acquire) & ~BETWEEN); }
 
     std::atomic<std::uintptr_t> place_{0};
 };

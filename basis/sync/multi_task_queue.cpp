@@ -1,6 +1,6 @@
 #include "zor_basis/sync/multi_task_queue.h"
 
-#include "basis/sync/mtq_impl.h"
+#include "basis/sync/multi_task_queue_impl.h"
 
 #include <new>
 

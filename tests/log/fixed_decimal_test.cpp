@@ -38,10 +38,19 @@ TEST(FixedDecimal, rounds_to_the_nearest_and_from_the_middle_to_the_even) {
         std::uint64_t whole, behind;
     };
     for (Case const& c : {
-             Case{{}, 0.5, 0, 0, 0}, Case{{}, 1.5, 0, 2, 0}, Case{{}, 2.5, 0, 2, 0}, Case{{}, 2.5000000000000004, 0, 3, 0},
-             Case{{}, 0.125, 2, 0, 12}, Case{{}, 0.375, 2, 0, 38}, Case{{}, -0.375, 2, 0, 38}, Case{{}, 9.999, 2, 10, 0},
-             Case{{}, 0.1, 19, 0, 1000000000000000056}, Case{{}, 0.99999, 4, 1, 0}, Case{{}, 0.0, 3, 0, 0},
-             Case{{}, 5e-324, 19, 0, 0}, Case{{}, 7.62939453125e-06, 10, 0, 76294}, // 2^-17: a 5 behind the last
+             Case{{}, 0.5, 0, 0, 0},
+             Case{{}, 1.5, 0, 2, 0},
+             Case{{}, 2.5, 0, 2, 0},
+             Case{{}, 2.5000000000000004, 0, 3, 0},
+             Case{{}, 0.125, 2, 0, 12},
+             Case{{}, 0.375, 2, 0, 38},
+             Case{{}, -0.375, 2, 0, 38},
+             Case{{}, 9.999, 2, 10, 0},
+             Case{{}, 0.1, 19, 0, 1000000000000000056},
+             Case{{}, 0.99999, 4, 1, 0},
+             Case{{}, 0.0, 3, 0, 0},
+             Case{{}, 5e-324, 19, 0, 0},
+             Case{{}, 7.62939453125e-06, 10, 0, 76294}, // 2^-17: a 5 behind the last
              Case{{}, 9223372036854774784.0, 3, 9223372036854774784u, 0},
          }) {
         SCOPED_TRACE(c.row);
@@ -75,8 +84,6 @@ TEST(FixedDecimal, agrees_with_the_runtime_for_any_bits) {
         FixedDecimal parts{};
         bool const fits = std::fabs(number) < 9223372036854775808.0;
         ASSERT_EQ(takeApart(number, decimals, parts), fits) << number;
-        if (fits) {
-            ASSERT_EQ(joined(parts, decimals), model(number, decimals)) << number << " " << decimals;
-        }
+        if (fits) { ASSERT_EQ(joined(parts, decimals), model(number, decimals)) << number << " " << decimals; }
     }
 }

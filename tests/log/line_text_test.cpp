@@ -40,8 +40,8 @@ TEST(LineText, goes_the_short_way_for_what_lines_consist_of) {
     EXPECT_TRUE(check(""));
     EXPECT_TRUE(check("no conversion at all"));
     EXPECT_TRUE(check("100%%, %%d %%%%"));
-    for (char const* format : {"%d", "%i", "%5d", "%-5d|", "%05d", "%+d", "% d", "%+05d", "%-+7d|", "%-05d|", "%x", "%o",
-                               "%u", "%08x", "%hhd", "%hd", "%hhu", "%hu", "%2d"}) {
+    for (char const* format : {"%d", "%i", "%5d", "%-5d|", "%05d", "%+d", "% d", "%+05d", "%-+7d|", "%-05d|", "%x",
+                               "%o", "%u", "%08x", "%hhd", "%hd", "%hhu", "%hu", "%2d"}) {
         for (int value : {0, 1, -1, 9, 10, 99, 100, 127, 128, 255, 256, -128, 32767, 32768, 65536, INT_MAX, INT_MIN}) {
             EXPECT_TRUE(check(format, value)) << format;
         }
@@ -64,11 +64,61 @@ TEST(LineText, goes_the_short_way_for_what_lines_consist_of) {
 
 TEST(LineText, rounds_fixed_decimals_as_exactly_as_printf) {
     std::vector<double> const values = {
-        0.0, -0.0, 1.0, -1.0, 0.5, 1.5, 2.5, 3.5, -0.5, -2.5, 0.125, 0.375, 0.0625, 0.1, 0.2, 0.3, 0.005, 0.015, 0.025,
-        1.005, 2.675, 0.9994999, 0.9995, 0.99951, 9.9995, 99.5, 999.9996, 0.0004999, 0.0005, 0.00051, 1e-3, 1e-5, 1e-10,
-        1e-19, 5e-20, 4.9e-20, 1e-300, 5e-324, DBL_MIN, DBL_EPSILON, 1e6, 123456.789, 1e15, 4503599627370495.5,
-        4503599627370496.5, 9007199254740993.0, 1e18, 9.2e18, 9223372036854774784.0, 0.3333333333333333, 1 / 3e9,
-        3.141592653589793, 2.718281828459045e-4, 4.8828125e-4, 2.44140625e-4,
+        0.0,
+        -0.0,
+        1.0,
+        -1.0,
+        0.5,
+        1.5,
+        2.5,
+        3.5,
+        -0.5,
+        -2.5,
+        0.125,
+        0.375,
+        0.0625,
+        0.1,
+        0.2,
+        0.3,
+        0.005,
+        0.015,
+        0.025,
+        1.005,
+        2.675,
+        0.9994999,
+        0.9995,
+        0.99951,
+        9.9995,
+        99.5,
+        999.9996,
+        0.0004999,
+        0.0005,
+        0.00051,
+        1e-3,
+        1e-5,
+        1e-10,
+        1e-19,
+        5e-20,
+        4.9e-20,
+        1e-300,
+        5e-324,
+        DBL_MIN,
+        DBL_EPSILON,
+        1e6,
+        123456.789,
+        1e15,
+        4503599627370495.5,
+        4503599627370496.5,
+        9007199254740993.0,
+        1e18,
+        9.2e18,
+        9223372036854774784.0,
+        0.3333333333333333,
+        1 / 3e9,
+        3.141592653589793,
+        2.718281828459045e-4,
+        4.8828125e-4,
+        2.44140625e-4,
     };
     for (char const* format : {"%f", "%.0f", "%.1f", "%.2f", "%.3f", "%.6f", "%.9f", "%.15f", "%.18f", "%.19f", "%lf",
                                "%.f", "%10.3f", "%-10.3f|", "%010.3f", "%+.3f", "% .3f", "%+010.2f", "%5.0f"}) {
@@ -86,10 +136,9 @@ TEST(LineText, goes_the_long_way_for_everything_else) {
         double value;
     };
     for (Case const& c : {Case{{}, "%f", INFINITE}, Case{{}, "%.3f", -INFINITE}, Case{{}, "%f", std::nan("")},
-                          Case{{}, "%010f", INFINITE}, Case{{}, "%.3f", 9223372036854775808.0},
-                          Case{{}, "%.3f", 1e300}, Case{{}, "%.20f", 0.1}, Case{{}, "%.40f", 0.1}, Case{{}, "%e", 12.5},
-                          Case{{}, "%g", 1e-9}, Case{{}, "%a", 1.0}, Case{{}, "%F", 1.5}, Case{{}, "%#.0f", 1.0},
-                          Case{{}, "%G", 1e20}}) {
+                          Case{{}, "%010f", INFINITE}, Case{{}, "%.3f", 9223372036854775808.0}, Case{{}, "%.3f", 1e300},
+                          Case{{}, "%.20f", 0.1}, Case{{}, "%.40f", 0.1}, Case{{}, "%e", 12.5}, Case{{}, "%g", 1e-9},
+                          Case{{}, "%a", 1.0}, Case{{}, "%F", 1.5}, Case{{}, "%#.0f", 1.0}, Case{{}, "%G", 1e20}}) {
         SCOPED_TRACE(c.row);
         EXPECT_FALSE(check(c.format, c.value));
     }
@@ -244,7 +293,12 @@ TEST(LineText, is_the_one_of_printf_for_random_single_conversions) {
             quick += check(format(INTEGERS, "ll", precise).c_str(), static_cast<long long>(n));
             break;
         case 4:
-            quick += check(format(INTEGERS, random() % 3 == 0 ? "z" : random() % 2 == 0 ? "j" : "t", precise).c_str(),
+            quick += check(format(INTEGERS,
+                                  random() % 3 == 0   ? "z"
+                                  : random() % 2 == 0 ? "j"
+                                                      : "t",
+                                  precise)
+                               .c_str(),
                            static_cast<std::intmax_t>(n));
             break;
         case 5: {

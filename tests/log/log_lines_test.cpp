@@ -121,7 +121,8 @@ TEST_F(LogLines, of_a_log_that_never_had_one_let_it_end) {
     { Log const log(name().c_str()); }
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 0u);
     // The newest alert: the ids go up.
-    std::uint32_t const after = HQ_Basis::AlertTimer::New(PERIOD, [](auto const&) { return PERIOD; }, nullptr);
+    std::uint32_t const after = HQ_Basis::AlertTimer::New(
+        PERIOD, [](auto const&) { return PERIOD; }, nullptr);
     EXPECT_EQ(xos_HostAlertFire(after - 1), 0);
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 1u);
     EXPECT_EQ(xos_HostAlertFire(after - 1), -1);

@@ -68,9 +68,14 @@ TEST_F(LoggerTest, writes_a_block_that_is_being_filled_after_a_period_of_silence
         bool isWritten;
     };
     for (Case const& c : {
-             Case{{}, 1000, 0, false}, Case{{}, 1000, 8191, false}, Case{{}, 1000, 8192, true},
-             Case{{}, 1000, 100'000, true}, Case{{}, 0xFFFF'FF00, 8191, false}, // the count wraps
-             Case{{}, 0xFFFF'FF00, 8192, true}, Case{{}, 0x7FFF'FFF0, 8191, false}, Case{{}, 0x7FFF'FFF0, 8192, true},
+             Case{{}, 1000, 0, false},
+             Case{{}, 1000, 8191, false},
+             Case{{}, 1000, 8192, true},
+             Case{{}, 1000, 100'000, true},
+             Case{{}, 0xFFFF'FF00, 8191, false}, // the count wraps
+             Case{{}, 0xFFFF'FF00, 8192, true},
+             Case{{}, 0x7FFF'FFF0, 8191, false},
+             Case{{}, 0x7FFF'FFF0, 8192, true},
              Case{{}, 5, 0xFFFF'FFFF, true},
          }) {
         SCOPED_TRACE(c.row);
@@ -116,9 +121,15 @@ TEST_F(LoggerTest, begins_a_block_when_the_line_fills_or_passes_the_room) {
         std::size_t writtenAtOnce;
     };
     for (Case const& c : {
-             Case{{}, BLOCK - 100, 98, 0}, Case{{}, BLOCK - 100, 99, 0}, Case{{}, BLOCK - 100, 100, BLOCK},
-             Case{{}, BLOCK - 100, 101, BLOCK}, Case{{}, BLOCK - 1, 1, BLOCK}, Case{{}, BLOCK - 1, 2, BLOCK},
-             Case{{}, BLOCK - 1, 1023, BLOCK}, Case{{}, BLOCK - 1023, 1023, BLOCK}, Case{{}, BLOCK - 1023, 1022, 0},
+             Case{{}, BLOCK - 100, 98, 0},
+             Case{{}, BLOCK - 100, 99, 0},
+             Case{{}, BLOCK - 100, 100, BLOCK},
+             Case{{}, BLOCK - 100, 101, BLOCK},
+             Case{{}, BLOCK - 1, 1, BLOCK},
+             Case{{}, BLOCK - 1, 2, BLOCK},
+             Case{{}, BLOCK - 1, 1023, BLOCK},
+             Case{{}, BLOCK - 1023, 1023, BLOCK},
+             Case{{}, BLOCK - 1023, 1022, 0},
          }) {
         SCOPED_TRACE(c.row);
         std::filesystem::remove(file(0));

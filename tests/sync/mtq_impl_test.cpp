@@ -1,4 +1,4 @@
-#include "basis/sync/mtq_impl.h"
+#include "basis/sync/multi_task_queue_impl.h"
 
 #include "tests/support/random_steps.h"
 #include "tests/support/table.h"
@@ -51,9 +51,7 @@ TEST_F(MTQ_ImplTest, makes_tasks_with_the_same_parameters_always) {
         queue.add(succeed, nullptr, false, !byRecord, false);
         MTQ_Dat* record = queue.first();
         while (MTQ_Dat* const next = queue.next()) record = next;
-        if (byRecord) {
-            EXPECT_TRUE(record->start());
-        }
+        if (byRecord) { EXPECT_TRUE(record->start()); }
         char expected[100];
         std::snprintf(expected, sizeof expected, ", 0x%llx, 0x0, -9, 0, \"MTQ_Dat::start\", 0",
                       static_cast<unsigned long long>(reinterpret_cast<std::uintptr_t>(record)));
@@ -170,10 +168,10 @@ TEST_F(MTQ_ImplTest, goes_on_where_its_mutex_cannot_be_taken_and_gives_nothing_b
         MTQ_Impl queue(MultiTaskQueue::Continue, 1);
         GatedJob job;
         xos_HostFail("xos_SemTake", skip, 1);
-        EXPECT_TRUE(add(queue, job, false));                                        // calls 0 and 1
-        EXPECT_TRUE(queue.add(succeed, nullptr, false, false, false));              // 2
-        EXPECT_EQ(queue.first()->argument(), job.argument());                       // 3
-        EXPECT_NE(queue.next(), nullptr);                                           // 4
+        EXPECT_TRUE(add(queue, job, false));                           // calls 0 and 1
+        EXPECT_TRUE(queue.add(succeed, nullptr, false, false, false)); // 2
+        EXPECT_EQ(queue.first()->argument(), job.argument());          // 3
+        EXPECT_NE(queue.next(), nullptr);                              // 4
         xos_HostCallsReset();
         job.open();
         EXPECT_TRUE(isQuiet(queue, 0)); // 5: the end's report

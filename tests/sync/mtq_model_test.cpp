@@ -1,6 +1,6 @@
 // The queue beside a naive model of its rules.
 
-#include "basis/sync/mtq_impl.h"
+#include "basis/sync/multi_task_queue_impl.h"
 
 #include "tests/support/random_steps.h"
 #include "tests/sync/gated_job.h"
@@ -76,7 +76,10 @@ private:
 class Pair {
 public:
     Pair(std::uint64_t seed, bool failsTasks)
-        : random_(seed), failsTasks_(failsTasks), stops_(random_() % 2 == 0), limit_(static_cast<int>(random_() % 6) - 1),
+        : random_(seed),
+          failsTasks_(failsTasks),
+          stops_(random_() % 2 == 0),
+          limit_(static_cast<int>(random_() % 6) - 1),
           model_(stops_, limit_),
           queue_(new MTQ_Impl(stops_ ? MultiTaskQueue::StopOnError : MultiTaskQueue::Continue, limit_)) {}
 
@@ -180,9 +183,7 @@ private:
         EXPECT_EQ(queue_->current(), nullptr);
         MTQ_Dat const* const next = queue_->next();
         ASSERT_EQ(next != nullptr, following != model_.jobs.end());
-        if (next != nullptr) {
-            EXPECT_EQ(next->argument(), argumentOf(*following)->argument());
-        }
+        if (next != nullptr) { EXPECT_EQ(next->argument(), argumentOf(*following)->argument()); }
     }
 
     /// All jobs come to their end, with results such that their order does not matter.

@@ -75,9 +75,15 @@ TEST(MultiTaskQueue, starts_as_many_as_the_limit_says_and_all_that_are_forced) {
         char const* started;
     };
     for (Case const& c : {
-             Case{{}, 2, "qqqqq", "ss---"}, Case{{}, 0, "qqq", "---"}, Case{{}, -5, "qfq", "-s-"},
-             Case{{}, 1, "fq", "s-"}, Case{{}, 1, "qff", "sss"}, Case{{}, 3, "fqqqq", "sss--"},
-             Case{{}, 2, "ffqfq", "ss-s-"}, Case{{}, 2147483647, "qqqq", "ssss"}, Case{{}, -2147483647 - 1, "q", "-"},
+             Case{{}, 2, "qqqqq", "ss---"},
+             Case{{}, 0, "qqq", "---"},
+             Case{{}, -5, "qfq", "-s-"},
+             Case{{}, 1, "fq", "s-"},
+             Case{{}, 1, "qff", "sss"},
+             Case{{}, 3, "fqqqq", "sss--"},
+             Case{{}, 2, "ffqfq", "ss-s-"},
+             Case{{}, 2147483647, "qqqq", "ssss"},
+             Case{{}, -2147483647 - 1, "q", "-"},
          }) {
         SCOPED_TRACE(c.row);
         std::vector<GatedJob> jobs(std::strlen(c.jobs));

@@ -11,6 +11,7 @@
 
 namespace ZOR_Basis {
 
+class JobEntry;
 class MultiTaskQueue;
 
 /// A job's argument that its queue deletes.
@@ -48,9 +49,14 @@ public:
     /// \return whether the task was made
     bool start();
 
-protected:
+private:
+    friend class JobEntry;
+
     MTQ_Dat(MultiTaskQueue* queue, Function function, void* argument, bool ownsArgument, bool removeWhenDone)
-        : queue_(queue), function_(function), argument_(argument), ownsArgument_(ownsArgument),
+        : queue_(queue),
+          function_(function),
+          argument_(argument),
+          ownsArgument_(ownsArgument),
           removeWhenDone_(removeWhenDone) {}
     ~MTQ_Dat();
 
@@ -59,7 +65,6 @@ protected:
     bool callFunction() const { return function_(argument_); }
     void finish(bool result);
 
-private:
     MultiTaskQueue* const queue_;
     Function const function_;
     void* const argument_;

@@ -1,8 +1,8 @@
 /// \file
 /// The one kind of `MultiTaskQueue`.
 
-#ifndef BASIS_SYNC_MTQ_IMPL_H
-#define BASIS_SYNC_MTQ_IMPL_H
+#ifndef BASIS_SYNC_MULTI_TASK_QUEUE_IMPL_H
+#define BASIS_SYNC_MULTI_TASK_QUEUE_IMPL_H
 
 #include "basis/containers/linked_list.h"
 #include "basis/platform/xos_basics.h"

@@ -1,4 +1,4 @@
-#include "basis/sync/mtq_impl.h"
+#include "basis/sync/multi_task_queue_impl.h"
 
 #include "basis/memory/node_memory.h"
 #include "basis/sync/held_semaphore.h"
@@ -27,11 +27,10 @@ MTQ_Impl::~MTQ_Impl() {
     while (ending() != 0) std::this_thread::yield();
     xos_SemDestroy(completion_);
     xos_SemDestroy(mutex_);
-    while (JobEntry* const job = jobs_.first()) drop(job);
+    while (JobEntry* const job = jobs_.takeFirst()) deleteNode(jobMemory_, job);
 }
 
-bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow,
-                   bool removeWhenDone) {
+bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow, bool removeWhenDone) {
     HeldSemaphore const held(mutex_);
     if (!mayProceed()) return false;
     auto* const job = makeNode<JobEntry>(jobMemory_, this, function, argument, ownsArgument, removeWhenDone);
@@ -100,8 +99,9 @@ void MTQ_Impl::run(JobEntry& job) {
 void MTQ_Impl::done(MTQ_Dat& job) {
     auto& entry = static_cast<JobEntry&>(job);
     JobEntry* before = reports_.load(std::memory_order_relaxed);
-    do { entry.nextReported = before; } while (
-        !reports_.compare_exchange_weak(before, &entry, std::memory_order_acq_rel, std::memory_order_relaxed));
+    do {
+        entry.nextReported = before;
+    } while (!reports_.compare_exchange_weak(before, &entry, std::memory_order_acq_rel, std::memory_order_relaxed));
     if (before != nullptr) return; // the job may be gone already
     std::uint32_t ended = 0;
     {
