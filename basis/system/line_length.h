@@ -13,18 +13,43 @@ namespace ZOR_Basis {
 
 inline bool endsLine(char c) { return c == '\n' || c == '\r' || c == '\0'; }
 
-/// The bytes before the first line feed, carriage return or zero, at most `limit`; none behind those is read.
+#if ZB_VECTORS
+
+inline __m128i load16(char const* text) { return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); }
+
+/// One bit for each of 16 bytes: whether it ends a line.
+inline std::uint64_t lineEndsIn16(char const* text) {
+    __m128i const bytes = load16(text);
+    __m128i const lineFeeds = _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\n'));
+    __m128i const carriageReturns = _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\r'));
+    __m128i const zeros = _mm_cmpeq_epi8(bytes, _mm_setzero_si128());
+    return static_cast<std::uint32_t>(_mm_movemask_epi8(_mm_or_si128(_mm_or_si128(lineFeeds, carriageReturns), zeros)));
+}
+
+/// The same for 64 bytes. None of those that end a line is above a carriage return, and mostly nothing else is below.
+inline std::uint64_t lineEndsIn64(char const* text) {
+    __m128i const lower = _mm_min_epu8(load16(text), load16(text + 16));
+    __m128i const upper = _mm_min_epu8(load16(text + 32), load16(text + 48));
+    __m128i const lowest = _mm_min_epu8(lower, upper);
+    __m128i const capped = _mm_min_epu8(lowest, _mm_set1_epi8('\r'));
+    if (_mm_movemask_epi8(_mm_cmpeq_epi8(capped, lowest)) == 0) return 0;
+    return lineEndsIn16(text) | lineEndsIn16(text + 16) << 16 | lineEndsIn16(text + 32) << 32 |
+           lineEndsIn16(text + 48) << 48;
+}
+
+#endif
+
+/// The bytes before the first line feed, carriage return or zero, at most `limit`; nothing behind the limit is read.
 inline std::uint64_t lengthOfLine(char const* text, std::uint64_t limit) {
     std::uint64_t length = 0;
 #if ZB_VECTORS
-    __m128i const lineFeed = _mm_set1_epi8('\n');
-    __m128i const carriageReturn = _mm_set1_epi8('\r');
-    for (; limit - length >= sizeof(__m128i); length += sizeof(__m128i)) {
-        __m128i const bytes = _mm_loadu_si128(reinterpret_cast<__m128i const*>(text + length));
-        __m128i const lineEnds = _mm_or_si128(_mm_cmpeq_epi8(bytes, lineFeed), _mm_cmpeq_epi8(bytes, carriageReturn));
-        __m128i const ends = _mm_or_si128(lineEnds, _mm_cmpeq_epi8(bytes, _mm_setzero_si128()));
-        auto const found = static_cast<unsigned>(_mm_movemask_epi8(ends));
-        if (found != 0) return length + static_cast<unsigned>(std::countr_zero(found));
+    for (; limit - length >= 64; length += 64) {
+        if (std::uint64_t const ends = lineEndsIn64(text + length))
+            return length + static_cast<unsigned>(std::countr_zero(ends));
+    }
+    for (; limit - length >= 16; length += 16) {
+        if (std::uint64_t const ends = lineEndsIn16(text + length))
+            return length + static_cast<unsigned>(std::countr_zero(ends));
     }
 #endif
     while (length < limit && !endsLine(text[length])) ++length;

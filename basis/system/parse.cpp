@@ -14,8 +14,11 @@ namespace {
 constexpr int LONGEST_EXPECTED = 256;
 constexpr int LONGEST_FILE_NAME = 255;
 
-/// The locale has no say in the printable characters of ASCII, which are nearly all.
-bool isBlank(char c) { return (c <= ' ' || c > '~') && std::isspace(static_cast<unsigned char>(c)) != 0; }
+/// In every locale the same characters of ASCII are printable, which are nearly all, and white space.
+bool isBlank(char c) {
+    if (c > ' ' && c <= '~') return false;
+    return c == ' ' || (c >= '\t' && c <= '\r') || std::isspace(static_cast<unsigned char>(c)) != 0;
+}
 
 } // namespace
 
