@@ -20,6 +20,7 @@ bool leadsToDirectory(char const* path) {
 /// Narrow paths: the platform layer makes directories.
 struct Narrow {
     using Path = FPath;
+    using Char = char;
 
     static Place look(FPath const& path) {
         FStat const entry(path.c_str());
@@ -34,6 +35,7 @@ struct Narrow {
 /// Wide paths: the system makes them, and whatever exists and is no directory is in the way.
 struct Wide {
     using Path = WcPath;
+    using Char = WChar;
 
     static Place look(WcPath const& path) {
         FStat entry;
@@ -48,18 +50,30 @@ bool isOrBecomesDirectory(typename Kind::Path const& path, Place place) {
     return place == Place::DIRECTORY || (place == Place::FREE && Kind::make(path));
 }
 
-/// Makes sure of a directory: itself if that can be, else after the one above it.
+/// The end of the component behind the one that ends at `end`.
+template <class Path>
+std::uint64_t nextEnd(Path const& whole, std::uint64_t end) {
+    do ++end;
+    while (end < whole.size() && !whole.isSlash(end));
+    return end;
+}
+
+/// Makes sure of a directory: of the deepest one upwards that is there or can be made, and then of those below it. No
+/// recursion: a path may have more components than the stack has room for.
 template <class Kind>
-bool ensure(typename Kind::Path path) {
-    Place const place = Kind::look(path);
-    if (place == Place::BLOCKED) return false;
-    if (isOrBecomesDirectory<Kind>(path, place)) return true;
-    std::uint64_t const name = path.offsetName();
-    // Behind a slash at the very front is nothing more to cut.
-    if (name < 2) return false;
-    typename Kind::Path parent(path);
-    parent.cut(name - 1);
-    return ensure<Kind>(parent) && isOrBecomesDirectory<Kind>(path, Kind::look(path));
+bool ensure(typename Kind::Path const& whole) {
+    typename Kind::Path path(whole);
+    for (Place place = Kind::look(path); !isOrBecomesDirectory<Kind>(path, place); place = Kind::look(path)) {
+        std::uint64_t const name = path.offsetName();
+        // Behind a slash at the very front is nothing more to cut.
+        if (place == Place::BLOCKED || name < 2) return false;
+        path.cut(name - 1);
+    }
+    while (path.size() < whole.size()) {
+        path.copy(static_cast<typename Kind::Char const*>(whole), nextEnd(whole, path.size()));
+        if (!isOrBecomesDirectory<Kind>(path, Kind::look(path))) return false;
+    }
+    return true;
 }
 
 template <class Kind>

@@ -42,6 +42,8 @@ public:
 
     bool isDir() override { return !isFile(); }
     bool isFile() override {
+        // Without an entry the answers are those of an empty file, as on the sibling before the first one.
+        if (entry_ == nullptr) return true;
         switch (entry_->d_type) {
         case DT_DIR:
             return false;
@@ -89,13 +91,13 @@ private:
 
     /// What the entry, or what it leads to, is; a link that leads nowhere is itself.
     struct stat const& status() {
-        if (!examined_) {
-            int const folder = dirfd(directory_);
-            status_ = {};
-            if (fstatat(folder, entry_->d_name, &status_, 0) != 0) {
-                fstatat(folder, entry_->d_name, &status_, AT_SYMLINK_NOFOLLOW);
-            }
-            examined_ = true;
+        if (examined_) return status_;
+        examined_ = true;
+        status_ = {};
+        if (entry_ == nullptr) return status_;
+        int const folder = dirfd(directory_);
+        if (fstatat(folder, entry_->d_name, &status_, 0) != 0) {
+            fstatat(folder, entry_->d_name, &status_, AT_SYMLINK_NOFOLLOW);
         }
         return status_;
     }
@@ -103,6 +105,8 @@ private:
     void close() {
         if (directory_ != nullptr) closedir(directory_);
         directory_ = nullptr;
+        entry_ = nullptr;
+        examined_ = false;
     }
 
     DIR* directory_ = nullptr;

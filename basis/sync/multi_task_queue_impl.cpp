@@ -129,9 +129,10 @@ JobEntry* MTQ_Impl::takeReports() {
 
 /// \pre the mutex is held
 void MTQ_Impl::end(JobEntry& job) {
-    running_.fetch_sub(1, std::memory_order_release);
     if (!job.result()) failed_.store(true, std::memory_order_release);
     if (job.removesWhenDone()) drop(&job);
+    // The last, as who waits looks at the count alone.
+    running_.fetch_sub(1, std::memory_order_release);
 }
 
 /// \pre the mutex is held

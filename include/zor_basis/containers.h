@@ -1,5 +1,6 @@
 /// \file
-/// Lists, pointer arrays, the dictionary and its file, hashed texts, and the integer helpers that size their tables.
+/// Lists, pointer arrays, the dictionary and its file, hashed texts, and the integer helpers that size their tables; and
+/// the texts and bytes that they hold.
 
 #ifndef ZOR_BASIS_CONTAINERS_H
 #define ZOR_BASIS_CONTAINERS_H
@@ -10,5 +11,6 @@
 #include "zor_basis/containers/hashing.h"
 #include "zor_basis/containers/ptr_array.h"
 #include "zor_basis/containers/sng_list.h"
+#include "zor_basis/text.h"
 
 #endif

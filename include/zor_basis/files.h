@@ -1,5 +1,5 @@
 /// \file
-/// Paths, files, directories and what there is to know about them.
+/// Paths, files, directories and what there is to know about them; and the texts that they are named by.
 
 #ifndef ZOR_BASIS_FILES_H
 #define ZOR_BASIS_FILES_H
@@ -14,5 +14,6 @@
 #include "zor_basis/files/look_for_type.h"
 #include "zor_basis/files/size.h"
 #include "zor_basis/files/wc_path.h"
+#include "zor_basis/text.h"
 
 #endif

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -26,6 +27,22 @@ struct Item {
     static int living;
 };
 int Item::living = 0;
+
+/// A value of which only so many copies can be made.
+struct Scarce {
+    Scarce() { ++living; }
+    Scarce(Scarce const&) {
+        if (left == 0) throw std::bad_alloc();
+        --left;
+        ++living;
+    }
+    ~Scarce() { --living; }
+
+    static int left;
+    static int living;
+};
+int Scarce::left = 0;
+int Scarce::living = 0;
 
 using List = SngList<Item>;
 
@@ -98,6 +115,27 @@ TEST(SngList, copies_values_into_units_of_its_own) {
     EXPECT_EQ(text(copy), "1 2 ");
     copy = List();
     EXPECT_EQ(text(copy), "");
+}
+
+TEST(SngList, leaves_nothing_behind_when_a_value_cannot_be_copied) {
+    {
+        SngList<Scarce> list;
+        Scarce const value;
+        Scarce::left = 3;
+        for (int i = 0; i < 3; ++i) list.insertBack(value);
+        Scarce::left = 2;
+        EXPECT_THROW(SngList<Scarce>{list}, std::bad_alloc);
+        EXPECT_EQ(Scarce::living, 4);
+        SngList<Scarce> other;
+        Scarce::left = 1;
+        EXPECT_THROW(other = list, std::bad_alloc);
+        EXPECT_EQ(other.size(), 0u);
+        EXPECT_EQ(Scarce::living, 4);
+        EXPECT_THROW(list.insertFront(value), std::bad_alloc);
+        EXPECT_TRUE(list.isConsistent());
+        EXPECT_EQ(list.size(), 3u);
+    }
+    EXPECT_EQ(Scarce::living, 0);
 }
 
 TEST(SngList, adopts_a_chain) {

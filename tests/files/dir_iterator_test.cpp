@@ -48,6 +48,20 @@ TEST_F(DirIteratorTest, breathes) {
     EXPECT_EQ(list->lastError(), 18u);
 }
 
+TEST_F(DirIteratorTest, answers_without_an_entry_and_without_a_fault) {
+    put(scratch / "file", "123");
+    DirIteratorW list(LOOK_ALL, here().c_str());
+    EXPECT_TRUE(list->isFile());
+    EXPECT_FALSE(list->isDir());
+    EXPECT_EQ(list->size(), 0u);
+    EXPECT_LE(list->time(), 0);
+    while (list->next() != nullptr) {}
+    EXPECT_NE(list->isFile(), list->isDir());
+    list->finish();
+    EXPECT_NE(list->isFile(), list->isDir());
+    EXPECT_LE(list->size(), 3u);
+}
+
 TEST_F(DirIteratorTest, reports_the_kinds_asked_for) {
     makeFolder(scratch / "folder");
     makeFolder(scratch / "other");

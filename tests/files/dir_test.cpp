@@ -9,6 +9,8 @@
 
 #include <gtest/gtest.h>
 
+#include <pthread.h>
+
 #include <functional>
 
 using namespace ZOR_Basis;
@@ -132,6 +134,28 @@ TEST_F(DirTest, has_parents_made_through_either_slash_kind_and_runs_of_them) {
         EXPECT_TRUE(Dir::NewForW(wide(other / c.path).c_str()));
         EXPECT_EQ(other.content(), c.made);
     }
+}
+
+TEST_F(DirTest, looks_for_parents_without_deep_recursion) {
+    put(at("f"), "");
+    std::string path = at("f");
+    for (int i = 0; i < 2000; ++i) path += "/a";
+    auto const make = [](void* text) -> void* {
+        std::string const& asked = *static_cast<std::string const*>(text);
+        bool const made = Dir::NewFor(asked.c_str()) || Dir::NewForW(wide(asked).c_str());
+        return made ? text : nullptr;
+    };
+    // Room for a few calls, not for one a component.
+    pthread_attr_t attributes;
+    pthread_attr_init(&attributes);
+    pthread_attr_setstacksize(&attributes, 256 * 1024);
+    pthread_t thread;
+    ASSERT_EQ(pthread_create(&thread, &attributes, make, &path), 0);
+    pthread_attr_destroy(&attributes);
+    void* made = &path;
+    pthread_join(thread, &made);
+    EXPECT_EQ(made, nullptr);
+    EXPECT_EQ(scratch.content(), Names{"f"});
 }
 
 TEST_F(DirTest, Kept_dir_01_has_no_parent_to_make_without_a_slash) {

@@ -301,6 +301,26 @@ TEST(MultiTaskQueue, may_be_deleted_as_soon_as_waiting_ends) {
     }
 }
 
+TEST(MultiTaskQueue, has_looked_at_every_end_when_waiting_ends) {
+    struct Slow : MTQ_Arg {
+        explicit Slow(std::atomic<bool>& flag) : isDeleted(flag) {}
+        ~Slow() override {
+            std::this_thread::sleep_for(std::chrono::milliseconds(2));
+            isDeleted = true;
+        }
+        std::atomic<bool>& isDeleted;
+    };
+    for (int i = 0; i < 20; ++i) {
+        std::atomic<bool> isDeleted{false};
+        Queue const queue = make(MultiTaskQueue::Continue, 1);
+        queue->add(fail, static_cast<MTQ_Arg*>(new Slow(isDeleted)), true, true, true);
+        queue->wait();
+        EXPECT_TRUE(isDeleted);
+        EXPECT_TRUE(queue->failed());
+        EXPECT_EQ(queue->first(), nullptr);
+    }
+}
+
 TEST(MultiTaskQueue, Kept_queue_03_counts_only_the_end_of_a_job_that_is_started_by_its_record) {
     Queue const queue = make(MultiTaskQueue::StopOnError, 0);
     GatedJob direct, first, second;

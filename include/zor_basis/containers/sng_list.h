@@ -56,7 +56,7 @@ public:
     /// Adopts a chain as it is. \pre `first` leads to `last`, whose link is null, over `count` units
     SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_(count) {}
     /// Copies the values in their order.
-    SngList(SngList const& other) {
+    SngList(SngList const& other) : SngList() {
         for (Unit* unit = other.first_; unit != nullptr; unit = unit->next) insertBack(unit->value);
     }
     SngList& operator=(SngList const& other) {

@@ -1,0 +1,3 @@
+// Only its precompiled headers are of use.
+
+int main() { return 0; }
