@@ -18,7 +18,10 @@ constexpr std::uint64_t GROWTH = 4;
 
 std::uint64_t alignment(std::uint64_t wanted) { return wanted < 4 ? 2 : wanted < 8 ? 4 : 8; }
 
-std::uint64_t roundedUp(std::uint64_t size, std::uint64_t align) { return (size + align - 1) / align * align; }
+std::uint64_t roundedUp(std::uint64_t size, std::uint64_t align) {
+    std::uint64_t const most = ~std::uint64_t{0} - align + 1; // rounded up, more would come out small
+    return (std::min(size, most) + align - 1) / align * align;
+}
 
 /// The power of 2 above a number of bytes, at most 2^limit.
 std::uint64_t chunkFor(std::uint64_t bytes, std::uint64_t limit) { return Pow2(std::min(Log2(bytes) + 1, limit)); }

@@ -5,7 +5,6 @@
 #define TESTS_CRYPTO_CRYPT_USER_H
 
 #include <zor_basis/crypto.h>
-#include <zor_basis/text/blob.h>
 
 #include <memory>
 #include <string>

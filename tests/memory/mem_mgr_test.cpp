@@ -54,6 +54,8 @@ TEST(MemMgrPtr, owns_its_manager) {
     EXPECT_NE(plain, nullptr);
     MemMgrPtr const none;
     EXPECT_EQ(static_cast<MemMgr*>(none), nullptr);
+    MemMgrPtr const converted = MemMgr::makeStack(64, nullptr);
+    EXPECT_NE(converted->alloc(1), nullptr);
 }
 
 // ---- elements of one size ------------------------------------------------------------------------------------------
@@ -133,6 +135,17 @@ TEST(MemMgrSmallBlock, refuses_what_is_larger_than_an_element) {
     EXPECT_NE(manager->alloc(1), nullptr);
     EXPECT_NE(manager->alloc(12), nullptr) << "the size is rounded up";
     EXPECT_EQ(manager->alloc(13), nullptr);
+}
+
+TEST(MemMgrSmallBlock, refuses_elements_that_no_memory_holds) {
+    constexpr std::uint64_t MOST = ~std::uint64_t{0};
+    for (std::uint64_t size : {MOST, MOST - 1, MOST - 7, MOST / 2}) {
+        for (std::uint64_t align : {2, 4, 8}) {
+            MemMgrPtr const manager(MemMgr::makeSmlBlk(size, 1, 0, align));
+            EXPECT_EQ(manager->alloc(), nullptr) << size << ", " << align;
+            EXPECT_EQ(manager->alloc(1), nullptr) << size << ", " << align;
+        }
+    }
 }
 
 TEST(MemMgrSmallBlock, Kept_memory_01_small_elements_are_not_widened) {

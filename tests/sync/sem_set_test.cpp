@@ -12,6 +12,7 @@
 #include <atomic>
 #include <chrono>
 #include <thread>
+#include <type_traits>
 #include <vector>
 
 using namespace ZOR_Basis;
@@ -36,6 +37,8 @@ void expectEmpty(SemArray const& set) {
 }
 
 } // namespace
+
+static_assert(std::is_convertible_v<std::size_t, SemSet>, "sets stand in arrays by their sizes");
 
 TEST_F(SemSetTest, breathes) {
     SemSet set;

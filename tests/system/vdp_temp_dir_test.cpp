@@ -13,6 +13,7 @@
 #include <sstream>
 #include <string>
 #include <thread>
+#include <type_traits>
 #include <vector>
 
 using namespace ZOR_Basis;
@@ -40,6 +41,7 @@ struct TempDirs : testing::Test {
 } // namespace
 
 static_assert(sizeof(VDPTempDir) == sizeof(FPath) + 8);
+static_assert(std::is_convertible_v<bool, VDPTempDir>, "folders stand in arrays by their flags");
 
 TEST_F(TempDirs, breathe) {
     EXPECT_EQ(after({"make", "status", "make", "root"}), "ROOT/tmp/1.r\nthere\nROOT/tmp/2.r\nROOT/tmp\n");

@@ -7,12 +7,11 @@
 #define ZOR_BASIS_CRYPTO_CR_HASH_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/blob.h"
 
 #include <cstdint>
 
 namespace ZOR_Basis {
-
-class Blob;
 
 class ZB_API CrHash {
 public:

@@ -10,10 +10,9 @@
 #define ZOR_BASIS_CRYPTO_CR_KEY_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/blob.h"
 
 namespace ZOR_Basis {
-
-class Blob;
 
 class ZB_API CrKey {
 public:

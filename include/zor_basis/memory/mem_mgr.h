@@ -72,7 +72,7 @@ protected:
 class ZB_API MemMgrPtr {
 public:
     /// \param manager  adopted; may be null, is never the standard manager
-    explicit MemMgrPtr(MemMgr* manager = nullptr) : manager_(manager) {}
+    MemMgrPtr(MemMgr* manager = nullptr) : manager_(manager) {}
     MemMgrPtr(MemMgrPtr const&) = delete;
     MemMgrPtr& operator=(MemMgrPtr const&) = delete;
     ~MemMgrPtr() { delete manager_; }

@@ -24,7 +24,7 @@ public:
     /// \param size  keys that are held at once, roughly: there are as many buckets as the largest prime not above the
     ///        largest power of 2 not above it. 0 and 1 give one bucket
     /// \error  without memory for the buckets nothing can be taken
-    explicit SemSet(std::size_t size);
+    SemSet(std::size_t size);
     /// For 31 keys, in 13 buckets.
     SemSet() : SemSet(31) {}
     SemSet(SemSet const&) = delete;

@@ -44,7 +44,7 @@ public:
 
     /// Makes a folder by `Create`.
     VDPTempDir() : VDPTempDir(true) {}
-    explicit VDPTempDir(bool deleteOnDestroy) : deletes_(deleteOnDestroy) { Create(path_); }
+    VDPTempDir(bool deleteOnDestroy) : deletes_(deleteOnDestroy) { Create(path_); }
     /// \kept temp-04: a copy has the same folder and deletes it too, so one of the two gives that up
     VDPTempDir(VDPTempDir const& other) = default;
     /// The same; a folder that this object had is left behind.
