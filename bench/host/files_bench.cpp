@@ -22,14 +22,6 @@ namespace fs = std::filesystem;
 
 // Trees
 
-template <class Copy>
-void copyTree(benchmark::State& state, Copy copy) {
-    std::string const from = sourceTree();
-    std::string const to = workplace() / "copy";
-    timed(
-        state, NOTHING, [&] { return copy(to, from); }, [&] { fs::remove_all(to); });
-}
-
 void copyByHost(benchmark::State& state) {
     copyTree(state, [](std::string const& to, std::string const& from) {
         return xos_DirCopy(to.c_str(), from.c_str(), 0x200) == 0;

@@ -2,11 +2,11 @@
 // out between the measurements, by the alert; what that costs its thread is in a row of its own. All rows are of 1,000
 // lines.
 
+#include "bench/support/scratch_root.h"
+
 #include "basis/platform/hq_basis.h"
 
 #include <zor_basis/log.h>
-
-#include <xos_host.h>
 
 #include <benchmark/benchmark.h>
 
@@ -33,23 +33,7 @@ namespace {
 constexpr int LINES = 1000;
 constexpr std::size_t VALUES = 1024;
 
-/// On a file system in memory, where there is one.
-class Scratch {
-public:
-    Scratch()
-        : folder_((fs::exists("/dev/shm") ? fs::path("/dev/shm") : fs::temp_directory_path()) /
-                  ("zb_bench_log_" + std::to_string(getpid()))) {
-        fs::create_directories(folder_);
-        xos_HostSetRoot(folder_.c_str());
-    }
-    ~Scratch() { fs::remove_all(folder_); }
-    fs::path const& folder() const { return folder_; }
-
-private:
-    fs::path folder_;
-};
-
-Scratch const scratch;
+ScratchRoot const root("tmp");
 
 /// With them "%s %d %.3f" makes about 80 bytes.
 struct Values {
@@ -84,7 +68,7 @@ public:
         xos_HostAlertFire(alert_);
         fs::resize_file(file(), 0);
     }
-    static fs::path file() { return scratch.folder() / "tmp/zb_log/bench/0.log"; }
+    static fs::path file() { return workplace() / "tmp/zb_log/bench/0.log"; }
 
 private:
     Log log_;
@@ -109,7 +93,7 @@ public:
         logger_.flush();
         fs::resize_file(file(), 0);
     }
-    static fs::path file() { return scratch.folder() / "spdlog.log"; }
+    static fs::path file() { return workplace() / "spdlog.log"; }
 
 private:
     spdlog::logger logger_;

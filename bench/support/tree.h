@@ -8,6 +8,7 @@
 #include <benchmark/benchmark.h>
 
 #include <chrono>
+#include <filesystem>
 #include <initializer_list>
 #include <string>
 
@@ -50,5 +51,14 @@ void timed(benchmark::State& state, Before before, Work work, After after) {
 }
 
 inline constexpr auto NOTHING = [] {};
+
+/// Times `bool copy(to, from)` of the source tree, into a place that does not exist.
+template <class Copy>
+void copyTree(benchmark::State& state, Copy copy) {
+    std::string const& from = sourceTree();
+    std::string const to = workplace() / "copy";
+    timed(
+        state, NOTHING, [&] { return copy(to, from); }, [&] { std::filesystem::remove_all(to); });
+}
 
 #endif

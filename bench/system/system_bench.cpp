@@ -1,9 +1,9 @@
 // Processes, lines of a text and folders for jobs beside what the system does for them at least.
 
+#include "bench/support/scratch_root.h"
+
 #include <zor_basis/files/f_path.h>
 #include <zor_basis/system.h>
-
-#include <xos_host.h>
 
 #include <benchmark/benchmark.h>
 
@@ -22,23 +22,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// On a file system in memory, where there is one.
-class Scratch {
-public:
-    Scratch()
-        : folder_((fs::exists("/dev/shm") ? fs::path("/dev/shm") : fs::temp_directory_path()) /
-                  ("zb_bench_system_" + std::to_string(getpid()))) {
-        fs::create_directories(folder_ / "tmp");
-        xos_HostSetRoot(folder_.c_str());
-    }
-    ~Scratch() { fs::remove_all(folder_); }
-    fs::path temp() const { return folder_ / "tmp"; }
-
-private:
-    fs::path folder_;
-};
-
-Scratch const scratch;
+ScratchRoot const root("tmp");
 
 /* A child */
 
@@ -133,7 +117,7 @@ void tempDir(benchmark::State& state) {
 /// Looks at the name, which is free, and at the folder above; makes the folder; looks whether it is there still, and
 /// removes it.
 void systemCalls(benchmark::State& state) {
-    std::string const above = scratch.temp().string();
+    std::string const above = workplace() / "tmp";
     std::uint64_t number = 0;
     struct stat status;
     for (auto _ : state) {

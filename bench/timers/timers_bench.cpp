@@ -1,9 +1,9 @@
 // Timers beside the readings of the clock that they cannot do without, and a report beside the same rows by snprintf.
 
+#include "bench/support/scratch_root.h"
+
 #include <zor_basis/files/file.h>
 #include <zor_basis/timers.h>
-
-#include <xos_host.h>
 
 #include "basis/platform/xos_basics.h"
 
@@ -24,26 +24,12 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// On a file system in memory, where there is one.
-class Scratch {
-public:
-    Scratch()
-        : folder_((fs::exists("/dev/shm") ? fs::path("/dev/shm") : fs::temp_directory_path()) /
-                  ("zb_bench_timers_" + std::to_string(getpid()))) {
-        fs::create_directories(folder_ / "timer");
-        xos_HostSetRoot(folder_.c_str());
-    }
-    ~Scratch() { fs::remove_all(folder_); }
-    fs::path reports() const { return folder_ / "timer"; }
-    void removeReports() const {
-        for (auto const& entry : fs::directory_iterator(reports())) fs::remove(entry);
-    }
+ScratchRoot const root("timer");
 
-private:
-    fs::path folder_;
-};
-
-Scratch const scratch;
+fs::path reports() { return workplace() / "timer"; }
+void removeReports() {
+    for (auto const& entry : fs::directory_iterator(reports())) fs::remove(entry);
+}
 
 std::int64_t reading() {
     timespec time;
@@ -165,7 +151,7 @@ void report(benchmark::State& state) {
     }();
     for (auto _ : state) {
         state.PauseTiming();
-        scratch.removeReports();
+        removeReports();
         for (int i = 1; i <= TIMERS; ++i) fill(*manager->getTimer(static_cast<std::uint64_t>(i)), i);
         state.ResumeTiming();
         manager->reset(true);
@@ -197,9 +183,9 @@ void reportBySnprintf(benchmark::State& state) {
     static std::vector<Numbers> const all = makeNumbers();
     for (auto _ : state) {
         state.PauseTiming();
-        scratch.removeReports();
+        removeReports();
         state.ResumeTiming();
-        File file((scratch.reports() / "peer").c_str(), 0x226, true);
+        File file((reports() / "peer").c_str(), 0x226, true);
         char row[512];
         for (Numbers const& numbers : all) {
             file->write(row, static_cast<std::uint64_t>(printRow(row, sizeof row, numbers)));

@@ -125,14 +125,6 @@ bool copyOurs(std::string const& to, std::string const& from) {
            FileIterator::doIt(Str(from), LOOK_BOTH, &copier, nullptr, nullptr, false, true, false);
 }
 
-template <class Copy>
-void copyTree(benchmark::State& state, Copy copy) {
-    std::string const to = workplace() / "copy";
-    std::string const& from = sourceTree();
-    timed(
-        state, NOTHING, [&] { return copy(to, from); }, [&] { fs::remove_all(to); });
-}
-
 void jobCopyOurs(benchmark::State& state) { copyTree(state, copyOurs); }
 void jobCopyFilesystem(benchmark::State& state) {
     copyTree(state, [](std::string const& to, std::string const& from) {
