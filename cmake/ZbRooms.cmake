@@ -17,20 +17,25 @@ function(zb_room target)
 endfunction()
 
 # zb_tests(<room> EXPORTED <files> INTERNAL <files> [LIBRARIES <targets>] [TIMEOUT <s>] [THREADED]): a room's tests.
-# All files make the program <room>_tests, which holds the library's objects and may see internal headers. The EXPORTED
-# ones also go into exported_tests, which uses nothing but the public headers and the shared library. THREADED marks a
-# program that the thread sanitizer shall watch.
+# The EXPORTED ones use nothing but the public headers and go into exported_tests, which links the shared library. The
+# INTERNAL ones make the program <room>_tests, which holds the library's objects and may see internal headers. Under a
+# sanitizer all of them do. THREADED marks a program that the thread sanitizer shall watch.
 function(zb_tests room)
   cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LIBRARIES" ${ARGN})
-  add_executable(${room}_tests ${ARG_EXPORTED} ${ARG_INTERNAL})
+  set(own_files ${ARG_INTERNAL})
+  if(ZB_SANITIZE)
+    list(APPEND own_files ${ARG_EXPORTED})
+  else()
+    list(TRANSFORM ARG_EXPORTED PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
+    set_property(GLOBAL APPEND PROPERTY ZB_EXPORTED_TESTS ${ARG_EXPORTED})
+  endif()
+  add_executable(${room}_tests ${own_files})
   target_link_libraries(${room}_tests PRIVATE zb_test_support zor_basis_internal ${ARG_LIBRARIES})
   zb_warnings(${room}_tests)
   if(ARG_THREADED)
     set(threaded THREADED)
   endif()
   zb_test_program(${room}_tests TIMEOUT ${ARG_TIMEOUT} ${threaded})
-  list(TRANSFORM ARG_EXPORTED PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
-  set_property(GLOBAL APPEND PROPERTY ZB_EXPORTED_TESTS ${ARG_EXPORTED})
 endfunction()
 
 # zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is optimised.
