@@ -2,41 +2,17 @@
 // linker leads every `malloc` and `free` of this program's objects here, the library's own ones included.
 
 #include "tests/crypto/crypt_user.h"
+#include "tests/support/watched_blocks.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-
 using namespace ZOR_Basis;
-
-extern "C" {
-void* __real_malloc(std::size_t n);
-void __real_free(void* block);
-void* __wrap_malloc(std::size_t n);
-void __wrap_free(void* block);
-}
 
 namespace {
 
-constexpr std::size_t MOST = 32;
-
-/// Blocks made while watched, and whether they were all zero when they were released.
-struct Watch {
-    struct Block {
-        void* place;
-        std::size_t size;
-        bool released, wiped;
-    };
-    bool on = false;
-    std::size_t lacking = MOST; // the number of the block for which there is no memory
-    std::size_t asked = 0;
-    std::size_t made = 0;
-    Block blocks[MOST];
-} watch;
-
 /// While one lives, blocks are watched.
 struct Watched {
-    explicit Watched(std::size_t lacking = MOST) {
+    explicit Watched(std::size_t lacking = Watch::MOST) {
         watch = {};
         watch.lacking = lacking;
         watch.on = true;
@@ -45,25 +21,6 @@ struct Watched {
 };
 
 } // namespace
-
-void* __wrap_malloc(std::size_t n) {
-    if (!watch.on) return __real_malloc(n);
-    if (watch.asked++ == watch.lacking || watch.made == MOST) return nullptr;
-    void* const block = __real_malloc(n);
-    watch.blocks[watch.made++] = {block, n, false, false};
-    return block;
-}
-
-void __wrap_free(void* block) {
-    for (std::size_t i = 0; watch.on && i < watch.made; ++i) {
-        Watch::Block& known = watch.blocks[i];
-        if (known.place != block || known.released) continue;
-        known.released = true;
-        known.wiped = true;
-        for (std::size_t at = 0; at < known.size; ++at) known.wiped &= static_cast<char*>(block)[at] == 0;
-    }
-    __real_free(block);
-}
 
 TEST(CryptMemory, is_wiped_before_it_is_released) {
     CryptUser const user;

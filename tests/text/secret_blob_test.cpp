@@ -4,37 +4,13 @@
 #include <zor_basis/text/blob.h>
 
 #include "tests/support/memory_file.h"
+#include "tests/support/watched_blocks.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-
 using namespace ZOR_Basis;
 
-extern "C" {
-void* __real_malloc(std::size_t n);
-void __real_free(void* block);
-void* __wrap_malloc(std::size_t n);
-void __wrap_free(void* block);
-}
-
 namespace {
-
-constexpr std::size_t MOST = 16;
-
-/// Blocks made while watched, and what of them was not zero when they were released.
-struct Watch {
-    struct Block {
-        void* place;
-        std::size_t size;
-        bool released;
-        bool wiped;
-    };
-    bool on = false;
-    bool hasMemory = true;
-    std::size_t made = 0;
-    Block blocks[MOST];
-} watch;
 
 void begin() {
     watch = {};
@@ -52,25 +28,6 @@ std::size_t end(bool wiped) {
 }
 
 } // namespace
-
-void* __wrap_malloc(std::size_t n) {
-    if (!watch.on) return __real_malloc(n);
-    if (!watch.hasMemory || watch.made == MOST) return nullptr;
-    void* const block = __real_malloc(n);
-    watch.blocks[watch.made++] = {block, n, false, false};
-    return block;
-}
-
-void __wrap_free(void* block) {
-    for (std::size_t i = 0; watch.on && i < watch.made; ++i) {
-        Watch::Block& known = watch.blocks[i];
-        if (known.place != block || known.released) continue;
-        known.released = true;
-        known.wiped = true;
-        for (std::size_t at = 0; at < known.size; ++at) known.wiped &= static_cast<char*>(block)[at] == 0;
-    }
-    __real_free(block);
-}
 
 namespace {
 
