@@ -16,12 +16,15 @@ function(zb_room target)
   target_sources(${target} PRIVATE ${files})
 endfunction()
 
-# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LIBRARIES <targets>] [TIMEOUT <s>] [THREADED]): a room's tests.
+# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LONG_RUNS <files>] [LIBRARIES <targets>] [TIMEOUT <s>] [THREADED]):
+# a room's tests.
 # The EXPORTED ones use nothing but the public headers and go into exported_tests, which links the shared library. The
 # INTERNAL ones make the program <room>_tests, which holds the library's objects and may see internal headers. Under a
-# sanitizer all of them do. THREADED marks a program that the thread sanitizer shall watch.
+# sanitizer all of them do. LONG_RUNS are those of both that run longer than they compile. THREADED marks a program that
+# the thread sanitizer shall watch.
 function(zb_tests room)
-  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LIBRARIES" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
+  zb_optimised_tests(${ARG_LONG_RUNS})
   set(own_files ${ARG_INTERNAL})
   if(ZB_SANITIZE)
     list(APPEND own_files ${ARG_EXPORTED})
@@ -38,6 +41,15 @@ function(zb_tests room)
   zb_test_program(${room}_tests TIMEOUT ${ARG_TIMEOUT} ${threaded})
 endfunction()
 
+# zb_optimised_tests(<files>): excepts files of the calling folder from `zb_quickly_compiled`.
+function(zb_optimised_tests)
+  if(ARGN AND NOT MSVC)
+    list(TRANSFORM ARGN PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
+    set_source_files_properties(${ARGN} DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
+      PROPERTIES COMPILE_OPTIONS -O1 SKIP_PRECOMPILE_HEADERS ON)
+  endif()
+endfunction()
+
 # zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is optimised.
 function(zb_quickly_compiled target)
   if(NOT MSVC)
@@ -52,7 +64,10 @@ function(zb_test_program target)
     set(ARG_TIMEOUT 600)
   endif()
   add_test(NAME ${target} COMMAND ${target} ${ARG_ARGUMENTS})
-  set_tests_properties(${target} PROPERTIES TIMEOUT ${ARG_TIMEOUT})
+  # The largest programs start first, so that all processors are done at about the same time.
+  get_target_property(files ${target} SOURCES)
+  list(LENGTH files cost)
+  set_tests_properties(${target} PROPERTIES TIMEOUT ${ARG_TIMEOUT} COST ${cost})
   if(ARG_THREADED)
     set_tests_properties(${target} PROPERTIES LABELS threads)
     add_dependencies(threaded_tests ${target})

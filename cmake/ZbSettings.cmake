@@ -39,6 +39,9 @@ function(zb_warnings target)
     target_compile_options(${target} PRIVATE
       -Wall -Wextra -Wpedantic -Wshadow -Wcast-align
       $<$<COMPILE_LANGUAGE:CXX>:-Woverloaded-virtual>
+      $<$<COMPILE_LANGUAGE:CXX>:-Wzero-as-null-pointer-constant>
+      # `WBStr` has virtual functions and is never deleted by another type; clang says so of every container of them.
+      $<$<AND:$<COMPILE_LANGUAGE:CXX>,$<CXX_COMPILER_ID:Clang>>:-Wno-delete-non-abstract-non-virtual-dtor>
       $<$<BOOL:${ZB_WARNINGS_AS_ERRORS}>:-Werror>)
   endif()
 endfunction()

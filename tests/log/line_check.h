@@ -47,7 +47,8 @@ template <class... Values>
 std::string printed(std::size_t room, char const* format, Values... values) {
     Line line;
     line.fill('Y');
-    std::snprintf(line.data(), room, format, values...);
+    // A last argument that no format asks for: without any, compilers take the format for a text.
+    std::snprintf(line.data(), room, format, values..., nullptr);
     return line.data();
 }
 

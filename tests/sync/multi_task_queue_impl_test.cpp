@@ -164,7 +164,6 @@ TEST_F(MTQ_ImplTest, Kept_queue_03_does_not_fail_where_a_record_cannot_start) {
 TEST_F(MTQ_ImplTest, goes_on_where_its_mutex_cannot_be_taken_and_gives_nothing_back_then) {
     for (std::uint32_t skip = 0; skip < 6; ++skip) {
         SCOPED_TRACE(skip);
-        std::atomic<int> deletions{0};
         MTQ_Impl queue(MultiTaskQueue::Continue, 1);
         GatedJob job;
         xos_HostFail("xos_SemTake", skip, 1);
