@@ -22,13 +22,18 @@ bool utf8ToWide(char const* text, std::uint64_t size, WBStr& out) {
 }
 
 bool wideToUtf8(WChar const* text, std::uint64_t size, BufStr<255>& out) {
-    std::uint64_t written = Utf::toUtf8(text, size, out.getBuf(), out.sizeBuf() - 1);
-    if (written == Utf::NO_ROOM) {
+    Utf::Utf8Text written = Utf::toUtf8(text, size, out.getBuf(), out.sizeBuf() - 1);
+    if (written.size == Utf::NO_ROOM) {
         out.extendBuf(Utf::utf8Length(text, size) + 1);
         written = Utf::toUtf8(text, size, out.getBuf(), out.sizeBuf());
     }
-    // kept convert-01: `resize` measures up to the first zero, so that the size is that of the text as C sees it.
-    out.resize(written);
+    if (written.hasZero) {
+        // kept convert-01: `resize` measures up to the first zero, so that the size is that of the text as C sees it.
+        out.resize(written.size);
+    } else {
+        out.getBuf()[out.sizeBuf()] = '\0';
+        detail::InlineText<BufStr<255>, char, 255>::setSize(out, written.size);
+    }
     return true;
 }
 

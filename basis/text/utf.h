@@ -30,13 +30,18 @@ std::uint64_t toUtf16WithoutShuffle(char const* text, std::uint64_t size, WChar*
 /// The bytes of the UTF-8 form of `size` units of UTF-16, an unpaired surrogate counting as U+FFFD.
 std::uint64_t utf8Length(WChar const* text, std::uint64_t size);
 
+/// What a conversion to UTF-8 has made.
+struct Utf8Text {
+    std::uint64_t size; ///< in bytes, or NO_ROOM
+    bool hasZero;       ///< whether zeros are among them; means nothing where there was no room
+};
+
 /// Writes the UTF-8 form of `size` units of UTF-16, U+FFFD for each unpaired surrogate.
 /// \param out  `room` bytes, none of which keeps its value; no terminator is written
-/// \return the bytes of the whole text; NO_ROOM
-std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
+Utf8Text toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
 
 /// The same on processors without SSSE3.
-std::uint64_t toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
+Utf8Text toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room);
 
 inline constexpr bool isSurrogate(std::uint32_t unit) { return (unit & 0xF800) == 0xD800; }
 inline constexpr bool isHighSurrogate(std::uint32_t unit) { return (unit & 0xFC00) == 0xD800; }

@@ -16,6 +16,7 @@ struct Progress {
     WChar const* end;
     char* out;
     char* outEnd;
+    bool hasZero = false; ///< whether a zero was among the units
 
     std::uint64_t done() const { return static_cast<std::uint64_t>(text - begin); }
     std::uint64_t left() const { return static_cast<std::uint64_t>(end - text); }
@@ -28,12 +29,14 @@ struct Progress {
 
 __m128i units(int value) { return _mm_set1_epi16(static_cast<short>(value)); }
 
+__m128i zerosIn(__m128i block) { return _mm_cmpeq_epi16(block, _mm_setzero_si128()); }
+
 /// All ones in each unit that has none of the given bits.
-__m128i without(__m128i block, int bits) {
-    return _mm_cmpeq_epi16(_mm_and_si128(block, units(bits)), _mm_setzero_si128());
-}
+__m128i without(__m128i block, int bits) { return zerosIn(_mm_and_si128(block, units(bits))); }
 
 bool isAscii(__m128i block) { return bitsOf(without(block, 0xFF80)) == 0xFFFF; }
+
+__m128i packed(__m128i block) { return _mm_packus_epi16(block, block); }
 
 // ---- whole blocks: ASCII, and characters of two bytes among it --------------------------------------------------------
 
@@ -50,37 +53,78 @@ ZB_SHUFFLE_TARGET inline unsigned storeMixedBlock(__m128i block, char* out) {
     return storeSelected(out, bytes, bitsOf(_mm_packs_epi16(ascii, ascii)) & 0xFF, SHORTENED_UNITS);
 }
 
+/// A block's last `left` units, moved to its front; zeros behind them.
+ZB_SHUFFLE_TARGET inline __m128i movedToFront(__m128i block, std::uint64_t left) {
+    static constexpr auto PLACES = [] {
+        std::array<std::uint8_t, 2 * BLOCK_BYTES> places{};
+        for (unsigned i = 0; i < places.size(); ++i) places[i] = static_cast<std::uint8_t>(i < BLOCK_BYTES ? i : 0x80);
+        return places;
+    }();
+    return _mm_shuffle_epi8(block, loadBlock(PLACES.data() + BLOCK_BYTES - sizeof(WChar) * left));
+}
+
 struct WithShuffle {
     ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
+    ZB_SHUFFLE_TARGET static __m128i lastOf(__m128i block, std::uint64_t left) { return movedToFront(block, left); }
 };
 struct WithoutShuffle {
     ZB_IN_CALLER static unsigned storeMixed(__m128i, char*) { return 0; }
+    ZB_IN_CALLER static __m128i lastOf(__m128i block, std::uint64_t left) {
+        WChar window[2 * BLOCK_UNITS] = {};
+        storeBlock(window, block);
+        return loadBlock(window + BLOCK_UNITS - left);
+    }
 };
 
-ZB_IN_CALLER void takeAscii(Progress& progress) {
+ZB_IN_CALLER void takeAsciiBlocks(Progress& progress) {
     constexpr std::uint64_t STEP = 2 * BLOCK_UNITS;
+    __m128i zeros = _mm_setzero_si128();
     for (std::uint64_t steps = std::min(progress.left(), progress.room()) / STEP; steps > 0; --steps) {
         __m128i const low = loadBlock(progress.text);
         __m128i const high = loadBlock(progress.text + BLOCK_UNITS);
-        if (!isAscii(_mm_or_si128(low, high))) return;
-        storeBlock(progress.out, _mm_packus_epi16(low, high));
+        if (!isAscii(_mm_or_si128(low, high))) break;
+        __m128i const bytes = _mm_packus_epi16(low, high);
+        zeros = _mm_or_si128(zeros, _mm_cmpeq_epi8(bytes, _mm_setzero_si128()));
+        storeBlock(progress.out, bytes);
         progress.advance(STEP, STEP);
     }
+    progress.hasZero |= bitsOf(zeros) != 0;
+}
+
+/// Takes all of the text, if it is ASCII; else as much of its front as goes easily. \pre nothing has been taken
+ZB_IN_CALLER void takeAsciiText(Progress& progress) {
+    takeAsciiBlocks(progress);
+    if (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_UNITS) {
+        __m128i const block = loadBlock(progress.text);
+        if (!isAscii(block)) return;
+        progress.hasZero |= bitsOf(zerosIn(block)) != 0;
+        storeHalfBlock(progress.out, packed(block));
+        progress.advance(BLOCK_UNITS, BLOCK_UNITS);
+    }
+    std::uint64_t const left = progress.left();
+    if (left >= BLOCK_UNITS || left == 0 || progress.room() < left || progress.done() == 0) return;
+    // Units taken before are taken once more, to where they are already.
+    __m128i const block = loadBlock(progress.end - BLOCK_UNITS);
+    if (!isAscii(block)) return;
+    progress.hasZero |= bitsOf(zerosIn(block)) != 0;
+    storeHalfBlock(progress.out + left - BLOCK_UNITS, packed(block));
+    progress.advance(left, left);
 }
 
 /// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
 template <class Shuffle>
 ZB_IN_CALLER void takeBlocks(Progress& progress) {
-    takeAscii(progress);
+    takeAsciiBlocks(progress);
     while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
         __m128i const block = loadBlock(progress.text);
+        progress.hasZero |= bitsOf(zerosIn(block)) != 0;
         unsigned const ascii = bitsOf(without(block, 0xFF80));
         unsigned const bytes = ascii != 0xFFFF ? Shuffle::storeMixed(block, progress.out) : 0;
         if (bytes != 0) {
             progress.advance(BLOCK_UNITS, bytes);
             continue;
         }
-        storeHalfBlock(progress.out, _mm_packus_epi16(block, block));
+        storeHalfBlock(progress.out, packed(block));
         unsigned const front = static_cast<unsigned>(std::countr_one(ascii)) / 2;
         if (front < BLOCK_UNITS) {
             progress.advance(front, front);
@@ -91,14 +135,13 @@ ZB_IN_CALLER void takeBlocks(Progress& progress) {
 }
 
 /// The last units, fewer than a block, with zeros behind them.
+template <class Shuffle>
 ZB_IN_CALLER __m128i lastBlock(Progress const& progress) {
-    WChar window[2 * BLOCK_UNITS] = {};
-    if (progress.done() < BLOCK_UNITS) {
-        std::memcpy(window, progress.text, progress.left() * sizeof(WChar));
-        return loadBlock(window);
-    }
-    storeBlock(window, loadBlock(progress.end - BLOCK_UNITS));
-    return loadBlock(window + BLOCK_UNITS - progress.left());
+    std::uint64_t const left = progress.left();
+    if (progress.done() + left >= BLOCK_UNITS) return Shuffle::lastOf(loadBlock(progress.end - BLOCK_UNITS), left);
+    WChar window[BLOCK_UNITS] = {};
+    std::memcpy(window, progress.text, left * sizeof(WChar));
+    return loadBlock(window);
 }
 
 /// Takes the text's last units, if there are fewer than a block of them and none is above 0x7FF.
@@ -106,13 +149,17 @@ template <class Shuffle>
 ZB_IN_CALLER void takeEnd(Progress& progress) {
     std::uint64_t const left = progress.left();
     if (left >= BLOCK_UNITS || left == 0 || progress.room() < BLOCK_BYTES) return;
-    __m128i const block = lastBlock(progress);
+    __m128i const block = lastBlock<Shuffle>(progress);
+    unsigned bytes = BLOCK_UNITS;
     if (isAscii(block)) {
-        storeHalfBlock(progress.out, _mm_packus_epi16(block, block));
-        progress.advance(left, left);
-    } else if (unsigned const bytes = Shuffle::storeMixed(block, progress.out); bytes != 0) {
-        progress.advance(left, bytes - (BLOCK_UNITS - left));
+        storeHalfBlock(progress.out, packed(block));
+    } else {
+        bytes = Shuffle::storeMixed(block, progress.out);
+        if (bytes == 0) return;
     }
+    std::uint64_t const behind = BLOCK_UNITS - left;
+    progress.hasZero |= (bitsOf(zerosIn(block)) << sizeof(WChar) * behind & 0xFFFF) != 0;
+    progress.advance(left, bytes - behind);
 }
 
 // ---- runs of longer characters, as real text has them -----------------------------------------------------------------
@@ -181,27 +228,36 @@ Encoded encode(WChar const* text, std::uint64_t size) {
 ZB_IN_CALLER bool takeCharacter(Progress& progress) {
     Encoded const character = encode(progress.text, progress.left());
     if (character.length > progress.room()) return false;
+    progress.hasZero |= *progress.text == WChar();
     std::memcpy(progress.out, &character.bytes, character.length);
     progress.advance(character.units, character.length);
     return true;
 }
 
+/// \return whether the rest of the text fits
 template <class Shuffle>
-ZB_IN_CALLER std::uint64_t convert(Progress progress) {
-    char const* const out = progress.out;
+ZB_IN_CALLER bool takeRest(Progress& progress) {
     while (progress.text != progress.end) {
         takeBlocks<Shuffle>(progress);
         takeThreeByteRun(progress);
         takePairs(progress);
         takeEnd<Shuffle>(progress);
-        if (progress.text != progress.end && !takeCharacter(progress)) return NO_ROOM;
+        if (progress.text != progress.end && !takeCharacter(progress)) return false;
     }
-    return static_cast<std::uint64_t>(progress.out - out);
+    return true;
 }
 
-ZB_SHUFFLE_TARGET std::uint64_t toUtf8WithShuffle(WChar const* text, std::uint64_t size, char* out,
-                                                  std::uint64_t room) {
-    return convert<WithShuffle>({text, text, text + size, out, out + room});
+ZB_SHUFFLE_TARGET bool takeRestWithShuffle(Progress& progress) { return takeRest<WithShuffle>(progress); }
+bool takeRestWithoutShuffle(Progress& progress) { return takeRest<WithoutShuffle>(progress); }
+
+ZB_IN_CALLER Utf8Text convert(WChar const* text, std::uint64_t size, char* out, std::uint64_t room, bool canShuffle) {
+    Progress progress{text, text, text + size, out, out + room};
+    takeAsciiText(progress);
+    if (progress.text != progress.end) {
+        bool const fits = canShuffle ? takeRestWithShuffle(progress) : takeRestWithoutShuffle(progress);
+        if (!fits) return {NO_ROOM, progress.hasZero};
+    }
+    return {static_cast<std::uint64_t>(progress.out - out), progress.hasZero};
 }
 
 // ---- lengths ----------------------------------------------------------------------------------------------------------
@@ -241,12 +297,12 @@ std::uint64_t utf8Length(WChar const* text, std::uint64_t size) {
     return 3 * size - saved;
 }
 
-std::uint64_t toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
-    return convert<WithoutShuffle>({text, text, text + size, out, out + room});
+Utf8Text toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
+    return convert(text, size, out, room, false);
 }
 
-std::uint64_t toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
-    return ZB_CAN_SHUFFLE ? toUtf8WithShuffle(text, size, out, room) : toUtf8WithoutShuffle(text, size, out, room);
+Utf8Text toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
+    return convert(text, size, out, room, ZB_CAN_SHUFFLE);
 }
 
 } // namespace ZOR_Basis::Utf

@@ -85,13 +85,14 @@ struct Conversion : testing::TestWithParam<Way> {
         std::string const narrow = reference::utf8(reference::characters(wide));
         EXPECT_EQ(Utf::utf8Length(wide.data(), wide.size()), narrow.size());
         Output<char> output(room);
-        std::uint64_t const size = GetParam().toUtf8(wide.data(), wide.size(), output.units.data(), room);
+        auto const [size, hasZero] = GetParam().toUtf8(wide.data(), wide.size(), output.units.data(), room);
         EXPECT_TRUE(output.keptBehind());
         if (room < narrow.size()) {
             EXPECT_EQ(size, Utf::NO_ROOM);
         } else {
             ASSERT_EQ(size, narrow.size());
             EXPECT_EQ(output.text(size), narrow);
+            EXPECT_EQ(hasZero, narrow.find('\0') != std::string::npos);
         }
     }
 };
