@@ -33,10 +33,10 @@ bool SemSynList::give(std::uint64_t key) {
     xos_SemTake(listMutex_);
     bool given = false;
     if (entry != nullptr) {
-        links_.lock();
+        links_.beginWriting();
         bool const unused = --entry->users == 0;
         if (unused) unlink(entry);
-        links_.unlock();
+        links_.endWriting();
         given = xos_SemGive(entry->mutex) == 0;
         if (unused) {
             xos_SemDestroy(entry->mutex);
@@ -73,13 +73,13 @@ SemSynList::Entry* SemSynList::enter(std::uint64_t key) {
     bool const isNew = entry == nullptr;
     if (isNew) entry = makeEntry();
     if (entry == nullptr) return nullptr;
-    links_.lock();
+    links_.beginWriting();
     if (isNew) {
         entry->key.store(key, std::memory_order_release);
         linkFront(entry);
     }
     ++entry->users;
-    links_.unlock();
+    links_.endWriting();
     return entry;
 }
 

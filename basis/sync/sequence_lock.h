@@ -1,5 +1,6 @@
 /// \file
-/// Lets readers go without a lock and see afterwards whether they read something whole. Writers wait for each other.
+/// Lets readers go without a lock and see afterwards whether they read something whole. Writers exclude each other by
+/// other means; where they fail to, the number comes to rest all the same, so that no reader waits for ever.
 /// What is guarded is read with acquire and written with release order, which keeps it between the looks at the number.
 
 #ifndef BASIS_SYNC_SEQUENCE_LOCK_H
@@ -15,13 +16,10 @@ class SequenceLock {
 public:
     /// \name Writing
     /// @{
-    void lock() {
-        std::uint32_t expected = beginReading();
-        while (!sequence_.compare_exchange_weak(expected, expected + 1, std::memory_order_acquire)) {
-            expected = beginReading();
-        }
+    void beginWriting() { sequence_.store(sequence_.load(std::memory_order_relaxed) | 1, std::memory_order_relaxed); }
+    void endWriting() {
+        sequence_.store((sequence_.load(std::memory_order_relaxed) | 1) + 1, std::memory_order_release);
     }
-    void unlock() { sequence_.store(sequence_.load(std::memory_order_relaxed) + 1, std::memory_order_release); }
     /// @}
 
     /// \name Reading

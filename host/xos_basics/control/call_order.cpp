@@ -17,7 +17,6 @@ std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller) {
         // sees the mark.
         sole.store(&spareThreadCalls, std::memory_order_relaxed);
     }
-    if (isOrderedByEvents(function)) { return nextTime(caller); }
     publishTime(caller);
     return orderStamp();
 }

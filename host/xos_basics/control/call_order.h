@@ -1,11 +1,11 @@
 /// \file
 /// Which of two threads' calls was the later one.
 ///
-/// Most functions read a clock, once several threads call them. Taking and giving a semaphore costs less than that
-/// reading, so these two count time by events: a thread's time grows with each such call, a semaphore carries the
-/// giver's time to the taker, and the common time passes it on where threads or tasks start and end, where any other
-/// function is called by several threads, and where somebody asks for a last call. So only threads that agree on an
-/// order by means of their own, between calls of nothing but these two, leave the order of those calls open.
+/// Most functions read a clock, once several threads call them. What is done to a semaphore costs less than that reading,
+/// so these functions count time by events: a thread's time grows with each such call, a semaphore carries the giver's
+/// time to the taker, and the common time passes it on where threads or tasks start and end, where any other function is
+/// called by several threads, and where somebody asks for a last call. So only threads that agree on an order by means of
+/// their own, between calls of nothing but these, leave the order of those calls open.
 
 #ifndef HOST_XOS_BASICS_CONTROL_CALL_ORDER_H
 #define HOST_XOS_BASICS_CONTROL_CALL_ORDER_H
@@ -21,7 +21,9 @@ namespace host {
 extern constinit std::atomic<std::uint64_t> commonTime;
 
 constexpr bool isOrderedByEvents(Function function) {
-    return function == Function::xos_SemTake || function == Function::xos_SemGive;
+    return function == Function::xos_SemTake || function == Function::xos_SemGive ||
+           function == Function::xos_SemMCreate || function == Function::xos_SemBCreate ||
+           function == Function::xos_SemDestroy;
 }
 
 inline std::uint64_t nextTime(ThreadCalls& mine) {
@@ -50,7 +52,14 @@ inline void learnTime(ThreadCalls& mine, std::atomic<std::uint64_t> const& time)
 }
 
 /// The stamp of a call by a thread that is not known as its function's only caller.
+/// \pre the function is not ordered by events
 std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller);
+
+[[gnu::always_inline]] inline std::uint64_t stampOfCall(Function function, ThreadCalls& caller) {
+    if (isOrderedByEvents(function)) { return nextTime(caller); }
+    bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &caller;
+    return alone ? 0 : stampOfSharedCall(function, caller);
+}
 
 } // namespace host
 

@@ -32,7 +32,7 @@ struct TextBuffer {
 
 struct CallSlot {
     std::array<std::atomic<std::uint64_t>, MAX_ARGUMENTS> words;
-    /// When the call was made, where several threads call the function; 0 where one does.
+    /// When the call was made; 0 where one thread alone calls the function, unless events order its calls.
     std::atomic<std::uint64_t> stamp;
     std::atomic<TextBuffer*> texts;
     /// How many words of the texts the call uses.
@@ -72,7 +72,8 @@ extern constinit thread_local ThreadCalls* currentThreadCalls;
 /// Gives the calling thread its records.
 ThreadCalls* adoptThreadCalls();
 
-/// The only thread that has called a function so far; a value that is no thread's once there are several.
+/// The only thread that has called a function so far; a value that is no thread's once there are several. Not kept for
+/// functions whose calls are ordered by events.
 extern constinit std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> soleCaller;
 
 inline ThreadCalls& threadCalls() {

@@ -61,8 +61,7 @@ private:
         : _record(mine.records[indexOf(function)]),
           _number(_record.completed.load(std::memory_order_relaxed) + 1),
           _slot(_record.slots[_number % 2]) {
-        bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &mine;
-        _slot.stamp.store(alone ? 0 : stampOfSharedCall(function, mine), std::memory_order_release);
+        _slot.stamp.store(stampOfCall(function, mine), std::memory_order_release);
     }
 
     CallRecord& _record;

@@ -9,6 +9,7 @@
 #define HOST_XOS_BASICS_SEMAPHORES_SEMAPHORE_H
 
 #include "basis/platform/xos_basics.h"
+#include "host/xos_basics/wait/lock_word.h"
 
 #include <atomic>
 #include <cstddef>
@@ -24,8 +25,9 @@ enum class SemaphoreKind : std::uint32_t { mutex, binary, named };
 struct alignas(64) Semaphore {
     /// 0 while the block is in the pool.
     std::atomic<xos_Sem> handle;
-    std::atomic<std::uint32_t> state;
+    LockWord lock;
     SemaphoreKind kind;
+    std::uint16_t generation;
     /// Serial of the thread that holds the mutex; 0: none.
     std::atomic<std::uint64_t> owner;
     /// How often the owner has taken it. The owner's alone.
@@ -34,7 +36,6 @@ struct alignas(64) Semaphore {
     std::atomic<std::uint64_t> time;
     NamedMutex* named;
     Semaphore* nextFree;
-    std::uint16_t generation;
 };
 
 static_assert(sizeof(Semaphore) == 64);
@@ -49,7 +50,7 @@ inline Semaphore* semaphoreOf(xos_Sem handle) {
     return isCurrent ? semaphore : nullptr;
 }
 
-/// A block of the pool with a new handle. \param state  of a binary semaphore or mutex
+/// A block of the pool with a new handle. \param state  of a binary semaphore or mutex: WORD_FREE or WORD_HELD
 /// \return null without memory; the last error is then set
 Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state);
 

@@ -87,7 +87,8 @@ Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state) {
         return nullptr;
     }
     semaphore->kind = kind;
-    semaphore->state.store(state, std::memory_order_relaxed);
+    semaphore->lock.held.store(state, std::memory_order_relaxed);
+    semaphore->lock.awaited.store(0, std::memory_order_relaxed);
     semaphore->owner.store(0, std::memory_order_relaxed);
     semaphore->depth = 0;
     semaphore->time.store(0, std::memory_order_relaxed);

@@ -15,13 +15,13 @@ int failWith(host::Error error) {
 }
 
 inline void takeState(host::Semaphore& semaphore, host::ThreadCalls& mine) {
-    host::takeWord(semaphore.state);
+    host::takeWord(semaphore.lock);
     host::learnTime(mine, semaphore.time);
 }
 
 inline void giveState(host::Semaphore& semaphore, host::ThreadCalls const& mine) {
     host::leaveTime(mine, semaphore.time);
-    host::giveWord(semaphore.state);
+    host::giveWord(semaphore.lock);
 }
 
 int takeMutex(host::Semaphore& mutex) {

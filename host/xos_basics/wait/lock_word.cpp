@@ -1,6 +1,7 @@
 #include "host/xos_basics/wait/lock_word.h"
 
 #include "host/xos_basics/wait/pause.h"
+#include "host/xos_basics/wait/word_wait.h"
 
 namespace host {
 
@@ -11,32 +12,46 @@ namespace {
 constexpr int LONGEST_REST = 64;
 constexpr int LOOKS_AT_LONGEST = 4;
 
-bool isTakenNow(std::atomic<std::uint32_t>& word) {
-    std::uint32_t seen = word.load(std::memory_order_relaxed);
-    return seen == WORD_FREE &&
-           word.compare_exchange_strong(seen, WORD_HELD, std::memory_order_acquire, std::memory_order_relaxed);
+bool isTakenNow(LockWord& lock) {
+    return lock.held.load(std::memory_order_relaxed) == WORD_FREE && isTakenAtOnce(lock);
 }
 
-bool isTakenAfterRest(std::atomic<std::uint32_t>& word, int pauses) {
+bool isTakenAfterRest(LockWord& lock, int pauses) {
     for (int i = 0; i < pauses; ++i) { pauseBriefly(); }
-    return isTakenNow(word);
+    return isTakenNow(lock);
 }
 
-bool isTakenAwake(std::atomic<std::uint32_t>& word) {
+bool isTakenAwake(LockWord& lock) {
     for (int rest = 1; rest < LONGEST_REST; rest *= 2) {
-        if (isTakenAfterRest(word, rest)) { return true; }
+        if (isTakenAfterRest(lock, rest)) { return true; }
     }
     for (int i = 0; i < LOOKS_AT_LONGEST; ++i) {
-        if (isTakenAfterRest(word, LONGEST_REST)) { return true; }
+        if (isTakenAfterRest(lock, LONGEST_REST)) { return true; }
     }
     return false;
 }
 
+/// Makes sure that whoever gives the lock from now on sees that it is awaited.
+void announceSleeper(LockWord& lock) {
+    lock.awaited.exchange(1, std::memory_order_seq_cst);
+    if (hasProcessBarrier) { passProcessBarrier(); }
+}
+
 } // namespace
 
-void takeContended(std::atomic<std::uint32_t>& word) {
-    if (isTakenAwake(word)) { return; }
-    while (word.exchange(WORD_AWAITED, std::memory_order_acquire) != WORD_FREE) { waitWhile(word, WORD_AWAITED); }
+void takeContended(LockWord& lock) {
+    if (isTakenAwake(lock)) { return; }
+    // Whoever has slept leaves the lock awaited, as others may be asleep still; its own giving wakes the next one.
+    for (;;) {
+        announceSleeper(lock);
+        std::uint32_t expected = WORD_FREE;
+        if (lock.held.compare_exchange_strong(expected, WORD_HELD, std::memory_order_seq_cst)) { return; }
+        waitWhile(lock.awaited, 1);
+    }
+}
+
+void wakeSleeper(LockWord& lock) {
+    if (lock.awaited.exchange(0, std::memory_order_relaxed) != 0) { wakeOne(lock.awaited); }
 }
 
 } // namespace host

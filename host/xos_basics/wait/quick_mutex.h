@@ -1,5 +1,5 @@
 /// \file
-/// The host's own lock: four bytes, initialised before any code runs and never destroyed, uncontended in user space.
+/// The host's own lock: eight bytes, initialised before any code runs and never destroyed, uncontended in user space.
 /// Works with `std::lock_guard`.
 
 #ifndef HOST_XOS_BASICS_WAIT_QUICK_MUTEX_H
@@ -15,11 +15,11 @@ public:
     QuickMutex(QuickMutex const&) = delete;
     QuickMutex& operator=(QuickMutex const&) = delete;
 
-    void lock() { takeWord(_word); }
-    void unlock() { giveWord(_word); }
+    void lock() { takeWord(_lock); }
+    void unlock() { giveWord(_lock); }
 
 private:
-    std::atomic<std::uint32_t> _word{WORD_FREE};
+    LockWord _lock;
 };
 
 } // namespace host

@@ -156,6 +156,45 @@ TEST(HostBinary, wakes_every_waiter_once_per_give) {
     xos_SemDestroy(sem);
 }
 
+/// Works for a random time around that after which a waiter goes to sleep.
+void workAWhile(std::mt19937_64& random) {
+    auto const end = std::chrono::steady_clock::now() + std::chrono::nanoseconds(random() % 30'000);
+    while (std::chrono::steady_clock::now() < end) {}
+}
+
+TEST(HostBinary, wakes_a_waiter_that_goes_to_sleep_at_that_moment) {
+    std::uint64_t const steps = randomSteps(20'000);
+    xos_Sem const ping = xos_SemBCreate(0);
+    xos_Sem const pong = xos_SemBCreate(0);
+    std::atomic<std::uint64_t> passed{0};
+    auto play = [&](xos_Sem mine, xos_Sem other, std::uint64_t seed) {
+        std::mt19937_64 random{seed};
+        for (std::uint64_t step = 0; step < steps; ++step) {
+            xos_SemTake(mine);
+            ++passed;
+            workAWhile(random);
+            xos_SemGive(other);
+        }
+    };
+    std::thread first(play, ping, pong, 1);
+    std::thread second(play, pong, ping, 2);
+    xos_SemGive(ping);
+    int idle = 0;
+    for (std::uint64_t before = 0; passed < 2 * steps; before = passed) {
+        std::this_thread::sleep_for(100ms);
+        idle = passed == before ? idle + 1 : 0;
+        if (idle == 50) {
+            ADD_FAILURE() << "nobody woke up after " << passed << " turns";
+            xos_SemGive(ping);
+            xos_SemGive(pong);
+        }
+    }
+    first.join();
+    second.join();
+    xos_SemDestroy(ping);
+    xos_SemDestroy(pong);
+}
+
 TEST(HostSemaphores, fail_on_no_handle_and_on_one_that_was_destroyed) {
     for (auto* const operation : {xos_SemTake, xos_SemGive, xos_SemDestroy}) {
         clearSystemError();
