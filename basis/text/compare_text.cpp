@@ -58,13 +58,6 @@ inline __m128i ends8To16(char const* text, std::uint64_t length) noexcept {
     return _mm_unpacklo_epi64(load8(text), load8(text + length - 8));
 }
 
-/// 17 to 32 bytes.
-inline Places<std::uint32_t> placesOfTwo(char const* a, char const* b, std::uint64_t length) noexcept {
-    auto const head = placesOf(load16(a), load16(b));
-    auto const tail = placesOf(load16(a + length - 16), load16(b + length - 16));
-    return {head.different | tail.different << 16, head.decided | tail.decided << 16};
-}
-
 int orderAt(char const* a, char const* b, std::uint64_t place) noexcept {
     return static_cast<int>(static_cast<unsigned char>(a[place])) -
            static_cast<int>(static_cast<unsigned char>(b[place]));
@@ -85,98 +78,198 @@ inline int orderAtTheEnd(char const* a, char const* b) noexcept {
     return orderAt(a, b, 0);
 }
 
+/// Two texts of 17 to 64 bytes in four vectors, which overlap each other in shorter ones. They are compared as memory
+/// first. Only where they differ does it matter whether they ended before that; such texts are rare, and the runtime
+/// compares them.
+constexpr unsigned AllSame = 0xFFFFFFFF;
+
+class MediumTexts {
+public:
+    ZB_INLINE MediumTexts(char const* a, char const* b, std::uint64_t length) noexcept
+        : second_(std::min<std::uint64_t>(16, length - 16)), last_(length - 16) {
+        compare(0, a, b, 0);
+        compare(1, a, b, second_);
+        compare(2, a, b, last_ - second_);
+        compare(3, a, b, last_);
+    }
+
+    ZB_INLINE bool same() const noexcept {
+        __m128i const all = _mm_and_si128(_mm_and_si128(same_[0], same_[1]), _mm_and_si128(same_[2], same_[3]));
+        return _mm_movemask_epi8(all) == 0xFFFF;
+    }
+    ZB_INLINE bool haveZero() const noexcept {
+        return zerosOf(_mm_min_epu8(_mm_min_epu8(bytes_[0], bytes_[1]), _mm_min_epu8(bytes_[2], bytes_[3]))) != 0;
+    }
+    /// The place of the first difference; where there is none, the length.
+    ZB_INLINE std::uint64_t difference() const noexcept {
+        unsigned const front = samePlaces(0) | samePlaces(1) << 16;
+        if (front != AllSame) {
+            auto const place = static_cast<std::uint64_t>(std::countr_one(front));
+            return place < 16 ? place : place - 16 + second_;
+        }
+        unsigned const back = samePlaces(2) | samePlaces(3) << 16;
+        auto const place = static_cast<std::uint64_t>(std::countr_one(back));
+        return place < 16 ? place + last_ - second_ : place - 16 + last_;
+    }
+
+private:
+    ZB_INLINE void compare(unsigned i, char const* a, char const* b, std::uint64_t place) noexcept {
+        bytes_[i] = load16(a + place);
+        same_[i] = _mm_cmpeq_epi8(bytes_[i], load16(b + place));
+    }
+    ZB_INLINE unsigned samePlaces(unsigned i) const noexcept {
+        return static_cast<unsigned>(_mm_movemask_epi8(same_[i]));
+    }
+
+    std::uint64_t second_;
+    std::uint64_t last_;
+    __m128i bytes_[4];
+    __m128i same_[4];
+};
+
 #if ZB_WIDE_VECTOR_TEXT
 
-constexpr std::uint64_t Undecided = std::numeric_limits<std::uint64_t>::max();
+// What a place is where there is none: the texts do not differ, or not all of them may be read.
+constexpr std::uint64_t Nowhere = std::numeric_limits<std::uint64_t>::max();
+constexpr std::uint64_t Unreadable = Nowhere - 1;
 
-ZB_AVX2 ZB_INLINE unsigned zerosOf(__m256i bytes) noexcept {
-    return static_cast<unsigned>(_mm256_movemask_epi8(_mm256_cmpeq_epi8(bytes, _mm256_setzero_si256())));
-}
+/// Two texts of more than 64 bytes, in the same way.
+struct LongTexts {
+    ZB_AVX2 ZB_INLINE LongTexts(char const* first, char const* second, std::uint64_t size) noexcept
+        : a(first), b(second), length(size), least(_mm256_set1_epi8(-1)) {}
 
-/// Where the texts are decided in two vectors of 32 bytes, the second of which may overlap the first.
-ZB_AVX2 ZB_INLINE std::uint64_t decisionIn(char const* a, char const* b, std::uint64_t second) noexcept {
-    __m256i const head = load32(a);
-    __m256i const tail = load32(a + second);
-    __m256i const undecidedHead = _mm256_min_epu8(_mm256_cmpeq_epi8(head, load32(b)), head);
-    __m256i const undecidedTail = _mm256_min_epu8(_mm256_cmpeq_epi8(tail, load32(b + second)), tail);
-    if (zerosOf(_mm256_min_epu8(undecidedHead, undecidedTail)) == 0) return Undecided;
-    unsigned const headPlaces = zerosOf(undecidedHead);
-    if (headPlaces != 0) return static_cast<std::uint64_t>(std::countr_zero(headPlaces));
-    return second + static_cast<std::uint64_t>(std::countr_zero(zerosOf(undecidedTail)));
-}
+    /// Where the first of several vectors begins that are not all the same, or a run of them.
+    template <class Text>
+    ZB_AVX2 ZB_INLINE std::uint64_t difference() noexcept {
+        constexpr std::uint64_t Run = 128;
+        std::uint64_t done = 0;
+        for (; length - done > Run; done += Run) {
+            if (!Text::readable(a + done, b + done, Run)) return Unreadable;
+            if (!sameFour(done, done + 64)) return done;
+        }
+        if (!Text::readable(a + done, b + done, length - done)) return Unreadable;
+        // The last run of a longer text begins in the one before.
+        if (length > Run) return sameFour(length - Run, length - 64) ? Nowhere : done;
+        return sameFour(0, length - 64) ? Nowhere : 0;
+    }
 
-/// More than 32 bytes, in runs of 64. The last run of a longer text begins in the one before.
+    /// Whether a zero is among the bytes looked at so far.
+    ZB_AVX2 ZB_INLINE bool haveZero() const noexcept { return hasZero(least); }
+
+    /// The place of the first difference. \pre there is one behind `place`
+    ZB_AVX2 ZB_INLINE std::uint64_t firstFrom(std::uint64_t place) const noexcept {
+        for (;; place += 32) {
+            place = std::min(place, length - 32);
+            unsigned const same = sameBytes(load32(a + place), place);
+            if (same != AllSame) return place + static_cast<std::uint64_t>(std::countr_one(same));
+        }
+    }
+
+private:
+    ZB_AVX2 ZB_INLINE __m256i compared(__m256i bytes, std::uint64_t place) const noexcept {
+        return _mm256_cmpeq_epi8(bytes, load32(b + place));
+    }
+    ZB_AVX2 ZB_INLINE unsigned sameBytes(__m256i bytes, std::uint64_t place) const noexcept {
+        return static_cast<unsigned>(_mm256_movemask_epi8(compared(bytes, place)));
+    }
+    ZB_AVX2 ZB_INLINE bool sameFour(std::uint64_t head, std::uint64_t tail) noexcept {
+        __m256i const v0 = load32(a + head);
+        __m256i const v1 = load32(a + head + 32);
+        __m256i const v2 = load32(a + tail);
+        __m256i const v3 = load32(a + tail + 32);
+        least = _mm256_min_epu8(least, _mm256_min_epu8(_mm256_min_epu8(v0, v1), _mm256_min_epu8(v2, v3)));
+        __m256i const front = _mm256_and_si256(compared(v0, head), compared(v1, head + 32));
+        __m256i const back = _mm256_and_si256(compared(v2, tail), compared(v3, tail + 32));
+        return static_cast<unsigned>(_mm256_movemask_epi8(_mm256_and_si256(front, back))) == AllSame;
+    }
+
+    char const* a;
+    char const* b;
+    std::uint64_t length;
+    __m256i least;
+};
+
 template <class Text>
 ZB_AVX2 ZB_COLD bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
-    for (; length > 64; a += 64, b += 64, length -= 64) {
-        if (!Text::readable(a, b, 64)) return sameByRuntime(a, b, length);
-        std::uint64_t const place = decisionIn(a, b, 32);
-        if (place != Undecided) return a[place] == b[place];
-    }
-    if (!Text::readable(a, b, length)) return sameByRuntime(a, b, length);
-    std::uint64_t const back = length < 32 ? 32 - length : 0;
-    a -= back;
-    b -= back;
-    std::uint64_t const place = decisionIn(a, b, length + back - 32);
-    return place == Undecided || a[place] == b[place];
+    LongTexts texts(a, b, length);
+    std::uint64_t const run = texts.difference<Text>();
+    if (run == Nowhere) return true;
+    return (run == Unreadable || texts.haveZero()) && sameByRuntime(a, b, length);
 }
 
-/// The same, and how texts compare that are likely to end there.
+/// How texts compare that are likely to end there.
 template <class Text>
 ZB_AVX2 ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
-    for (; length > 64; a += 64, b += 64, length -= 64) {
-        if (!Text::readable(a, b, 64)) return orderByRuntime(a, b);
-        std::uint64_t const place = decisionIn(a, b, 32);
-        if (place != Undecided) return orderAt(a, b, place);
-    }
-    if (!Text::readable(a, b, length)) return orderByRuntime(a, b);
-    std::uint64_t const back = length < 32 ? 32 - length : 0;
-    a -= back;
-    b -= back;
-    std::uint64_t const second = length + back - 32;
-    std::uint64_t const place = decisionIn(a, b, second);
-    return place != Undecided ? orderAt(a, b, place) : orderAtTheEnd(a + second + 32, b + second + 32);
+    LongTexts texts(a, b, length);
+    std::uint64_t const run = texts.difference<Text>();
+    if (run == Unreadable || texts.haveZero()) return orderByRuntime(a, b);
+    return run == Nowhere ? orderAtTheEnd(a + length, b + length) : orderAt(a, b, texts.firstFrom(run));
 }
 
 #endif
 
+/// More than 64 bytes.
 template <class Text>
-bool same(char const* a, char const* b, std::uint64_t length) noexcept {
+ZB_INLINE bool sameLong(char const* a, char const* b, std::uint64_t length) noexcept {
 #if ZB_WIDE_VECTOR_TEXT
-    if (length > 32 && __builtin_cpu_supports("avx2")) return sameLongTexts<Text>(a, b, length);
+    if (__builtin_cpu_supports("avx2")) [[likely]]
+        return sameLongTexts<Text>(a, b, length);
 #endif
-    if (length > 32 || !Text::readable(a, b, length)) [[unlikely]]
+    return sameByRuntime(a, b, length);
+}
+
+template <class Text>
+ZB_INLINE bool same(char const* a, char const* b, std::uint64_t length) noexcept {
+    if (length > 64) [[unlikely]]
+        return sameLong<Text>(a, b, length);
+    if (!Text::readable(a, b, length)) [[unlikely]]
         return sameByRuntime(a, b, length);
-    if (length > 16) return placesOfTwo(a, b, length).same();
-    if (length >= 8) [[likely]]
-        return placesOf(ends8To16(a, length), ends8To16(b, length)).same();
+    if (length > 16) [[likely]] {
+        MediumTexts const texts(a, b, length);
+        if (texts.same()) [[likely]]
+            return true;
+        return texts.haveZero() && sameByRuntime(a, b, length);
+    }
+    if (length >= 8) return placesOf(ends8To16(a, length), ends8To16(b, length)).same();
     if (length >= 4) return placesOf(ends4To7(a, length), ends4To7(b, length)).same();
     return length == 0 || placesOf(ends1To3(a, length), ends1To3(b, length)).same();
 }
 
-template <class Text>
-int order(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
-    std::uint64_t const length = std::min(aSize, bSize); // where the shorter one is likely to end
-#if ZB_WIDE_VECTOR_TEXT
-    if (length > 32 && __builtin_cpu_supports("avx2")) return orderOfLongTexts<Text>(a, b, length);
-#endif
-    if (length > 32 || length < 4 || !Text::readable(a, b, length)) return orderByRuntime(a, b);
-    Places<std::uint32_t> places;
-    std::uint64_t front; // places from the first end of the texts
-    if (length > 16) {
-        places = placesOfTwo(a, b, length);
-        front = 16;
-    } else if (length >= 8) [[likely]] {
-        places = placesOf(ends8To16(a, length), ends8To16(b, length));
-        front = 8;
-    } else {
-        places = placesOf(ends4To7(a, length), ends4To7(b, length));
-        places.decided &= 0xFFU;
-        front = 4;
-    }
+/// 4 to 16 bytes.
+ZB_INLINE int orderOfShortTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const front = length >= 8 ? 8 : 4; // places from the first end of the texts
+    auto places = front == 8 ? placesOf(ends8To16(a, length), ends8To16(b, length))
+                             : placesOf(ends4To7(a, length), ends4To7(b, length));
+    if (front == 4) places.decided &= 0xFFU;
     if (places.decided == 0) return orderAtTheEnd(a + length, b + length);
     std::uint64_t const first = places.first();
     return orderAt(a, b, first < front ? first : length - 2 * front + first);
+}
+
+/// More than 64 bytes.
+template <class Text>
+ZB_INLINE int orderOfLong(char const* a, char const* b, std::uint64_t length) noexcept {
+#if ZB_WIDE_VECTOR_TEXT
+    if (__builtin_cpu_supports("avx2")) [[likely]]
+        return orderOfLongTexts<Text>(a, b, length);
+#endif
+    return orderByRuntime(a, b);
+}
+
+template <class Text>
+ZB_INLINE int order(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
+    std::uint64_t const length = std::min(aSize, bSize); // where the shorter one is likely to end
+    if (length > 64) [[unlikely]]
+        return orderOfLong<Text>(a, b, length);
+    if (length < 4 || !Text::readable(a, b, length)) [[unlikely]]
+        return orderByRuntime(a, b);
+    if (length <= 16) [[unlikely]]
+        return orderOfShortTexts(a, b, length);
+    MediumTexts const texts(a, b, length);
+    if (texts.haveZero()) [[unlikely]]
+        return orderByRuntime(a, b);
+    std::uint64_t const place = texts.difference();
+    return place == length ? orderAtTheEnd(a + length, b + length) : orderAt(a, b, place);
 }
 
 #endif

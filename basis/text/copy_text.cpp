@@ -21,9 +21,17 @@ void copyUpToTerminator(Char* target, Char const* source, std::uint64_t length) 
 
 namespace {
 
+/// Whether a text goes on beyond the page in which it begins; then all of the next page may be read as well.
+ZB_COLD bool leavesItsPage(char const* text) noexcept {
+    std::uint64_t const inPage = PageSize - (reinterpret_cast<std::uintptr_t>(text) & (PageSize - 1));
+    return text != nullptr && textLengthUpTo(text, inPage) == inPage;
+}
+
 /// How much of a text may be read before anything is known about its bytes.
 struct Given {
-    static bool readable(char const* text, std::uint64_t length) noexcept { return inOnePage(text, length); }
+    static bool readable(char const* text, std::uint64_t length) noexcept {
+        return inOnePage(text, length) || leavesItsPage(text);
+    }
 };
 struct Owned {
     static bool readable(char const*, std::uint64_t) noexcept { return true; }
@@ -145,8 +153,7 @@ template <class Text>
 ZB_AVX2 ZB_COLD void copyRuns(char* target, char const* source, std::uint64_t length) noexcept {
     if (overlap(target, source, length)) return copyOther(target, source, length);
     for (; length > 256; target += 128, source += 128, length -= 128) {
-        bool const readable = Text::readable(source, 128) || textLengthUpTo(source, 128) == 128;
-        if (!readable || !copy65To128(target, source, 128)) return copyOther(target, source, length);
+        if (!Text::readable(source, 128) || !copy65To128(target, source, 128)) return copyOther(target, source, length);
     }
     if (!Text::readable(source, length) || !copy129To256(target, source, length)) copyOther(target, source, length);
 }

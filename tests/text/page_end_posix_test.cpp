@@ -58,6 +58,14 @@ TEST(TextAtThePagesEnd, is_read_up_to_its_terminator_only) {
             ASSERT_EQ(HeapStr(a, claimed).size(), claimed);
         }
         ASSERT_EQ(BufStr<15>(a).size(), size);
+        for (std::size_t place = size > 40 ? size - 40 : 0; place < size; ++place) {
+            std::string greater = text;
+            greater[place] = 'y';
+            char const* c = second.textAtTheEnd(greater);
+            ASSERT_FALSE(Str(a, size) == Str(c, size)) << size << ' ' << place;
+            ASSERT_EQ(Str(a, size).compare(Str(c, size)), -1) << size << ' ' << place;
+            ASSERT_EQ(Str(c, size).compare(Str(a, size + 9)), 1) << size << ' ' << place;
+        }
     }
 }
 

@@ -206,7 +206,8 @@ private:
 template <std::uint64_t N>
 bool operator==(BufStr<N> const& a, BufStr<N> const& b) noexcept {
     // kept text-01: the right-hand size decides here too
-    if (b.size() == 0) return a.eq(b.c_str(), 0);
+    if (b.size() == 0) [[unlikely]]
+        return a.eq(b.c_str(), 0);
     return a.size() == b.size() && detail::sameOwned(a.c_str(), b.c_str(), b.size());
 }
 template <std::uint64_t N>
