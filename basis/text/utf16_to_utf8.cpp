@@ -53,6 +53,24 @@ ZB_SHUFFLE_TARGET inline unsigned storeMixedBlock(__m128i block, char* out) {
     return storeSelected(out, bytes, bitsOf(_mm_packs_epi16(ascii, ascii)) & 0xFF, SHORTENED_UNITS);
 }
 
+constexpr std::uint64_t LONG_BLOCK_BYTES = 3 * BLOCK_UNITS;
+constexpr std::uint64_t LONG_BLOCK_ROOM = LONG_BLOCK_BYTES + 4; // what is stored beyond the block
+
+/// Stores a block of units of three bytes each. \return whether it is one
+ZB_SHUFFLE_TARGET inline bool storeLongBlock(__m128i block, char* out) {
+    __m128i const high = _mm_and_si128(block, units(0xF800));
+    if (bitsOf(_mm_or_si128(zerosIn(high), _mm_cmpeq_epi16(high, units(0xD800)))) != 0) return false;
+    __m128i const first = _mm_srli_epi16(block, 12);
+    __m128i const second = _mm_and_si128(_mm_slli_epi16(block, 2), units(0x3F00));
+    __m128i const front = _mm_or_si128(_mm_or_si128(first, second), units(0x80E0));
+    __m128i const last = _mm_or_si128(_mm_and_si128(block, units(0x3F)), units(0x80));
+    // Of each character's four bytes the last one goes.
+    __m128i const kept = _mm_setr_epi8(0, 1, 2, 4, 5, 6, 8, 9, 10, 12, 13, 14, -1, -1, -1, -1);
+    storeBlock(out, _mm_shuffle_epi8(_mm_unpacklo_epi16(front, last), kept));
+    storeBlock(out + LONG_BLOCK_BYTES / 2, _mm_shuffle_epi8(_mm_unpackhi_epi16(front, last), kept));
+    return true;
+}
+
 /// A block's last `left` units, moved to its front; zeros behind them.
 ZB_SHUFFLE_TARGET inline __m128i movedToFront(__m128i block, std::uint64_t left) {
     static constexpr auto PLACES = [] {
@@ -65,10 +83,12 @@ ZB_SHUFFLE_TARGET inline __m128i movedToFront(__m128i block, std::uint64_t left)
 
 struct WithShuffle {
     ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
+    ZB_SHUFFLE_TARGET static bool storeLong(__m128i block, char* out) { return storeLongBlock(block, out); }
     ZB_SHUFFLE_TARGET static __m128i lastOf(__m128i block, std::uint64_t left) { return movedToFront(block, left); }
 };
 struct WithoutShuffle {
     ZB_IN_CALLER static unsigned storeMixed(__m128i, char*) { return 0; }
+    ZB_IN_CALLER static bool storeLong(__m128i, char*) { return false; }
     ZB_IN_CALLER static __m128i lastOf(__m128i block, std::uint64_t left) {
         WChar window[2 * BLOCK_UNITS] = {};
         storeBlock(window, block);
@@ -78,43 +98,69 @@ struct WithoutShuffle {
 
 ZB_IN_CALLER void takeAsciiBlocks(Progress& progress) {
     constexpr std::uint64_t STEP = 2 * BLOCK_UNITS;
-    __m128i zeros = _mm_setzero_si128();
+    __m128i least = _mm_set1_epi8(-1);
     for (std::uint64_t steps = std::min(progress.left(), progress.room()) / STEP; steps > 0; --steps) {
         __m128i const low = loadBlock(progress.text);
         __m128i const high = loadBlock(progress.text + BLOCK_UNITS);
         if (!isAscii(_mm_or_si128(low, high))) break;
         __m128i const bytes = _mm_packus_epi16(low, high);
-        zeros = _mm_or_si128(zeros, _mm_cmpeq_epi8(bytes, _mm_setzero_si128()));
+        least = _mm_min_epu8(least, bytes);
         storeBlock(progress.out, bytes);
         progress.advance(STEP, STEP);
     }
-    progress.hasZero |= bitsOf(zeros) != 0;
+    progress.hasZero |= bitsOf(_mm_cmpeq_epi8(least, _mm_setzero_si128())) != 0;
 }
 
-/// Takes all of the text, if it is ASCII; else as much of its front as goes easily. \pre nothing has been taken
-ZB_IN_CALLER void takeAsciiText(Progress& progress) {
-    takeAsciiBlocks(progress);
-    if (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_UNITS) {
-        __m128i const block = loadBlock(progress.text);
-        if (!isAscii(block)) return;
-        progress.hasZero |= bitsOf(zerosIn(block)) != 0;
-        storeHalfBlock(progress.out, packed(block));
-        progress.advance(BLOCK_UNITS, BLOCK_UNITS);
+struct Run {
+    std::uint64_t units;
+    bool hasZero;
+};
+
+/// ASCII from the front of `most` units, by blocks of twice the size.
+ZB_WIDE_TARGET Run takeWideAscii(WChar const* text, char* out, std::uint64_t most) {
+    constexpr std::uint64_t STEP = 4 * BLOCK_UNITS;
+    __m256i const beyondAscii = _mm256_set1_epi16(static_cast<short>(0xFF80));
+    __m256i least = _mm256_set1_epi8(-1);
+    std::uint64_t done = 0;
+    for (; done + STEP <= most; done += STEP) {
+        __m256i const low = loadWideBlock(text + done);
+        __m256i const high = loadWideBlock(text + done + STEP / 2);
+        if (_mm256_testz_si256(_mm256_or_si256(low, high), beyondAscii) == 0) break;
+        // Packing takes the halves of both by turns.
+        __m256i const bytes = _mm256_permute4x64_epi64(_mm256_packus_epi16(low, high), _MM_SHUFFLE(3, 1, 2, 0));
+        least = _mm256_min_epu8(least, bytes);
+        storeWideBlock(out + done, bytes);
     }
+    return {done, _mm256_movemask_epi8(_mm256_cmpeq_epi8(least, _mm256_setzero_si256())) != 0};
+}
+
+/// Takes all of the text, if it is ASCII; else as much of its front as goes easily.
+/// \pre nothing has been taken; at least a block
+ZB_IN_CALLER void takeAsciiText(Progress& progress) {
+    if (progress.left() >= LEAST_WIDE_UNITS && ZB_CAN_WIDE) {
+        auto const [units, hasZero] =
+            takeWideAscii(progress.text, progress.out, std::min(progress.left(), progress.room()));
+        progress.hasZero = hasZero;
+        progress.advance(units, units);
+    }
+    takeAsciiBlocks(progress);
+    // Two blocks reach from the end back to what has been taken; some of that is stored once more, where it is already.
     std::uint64_t const left = progress.left();
-    if (left >= BLOCK_UNITS || left == 0 || progress.room() < left || progress.done() == 0) return;
-    // Units taken before are taken once more, to where they are already.
-    __m128i const block = loadBlock(progress.end - BLOCK_UNITS);
-    if (!isAscii(block)) return;
-    progress.hasZero |= bitsOf(zerosIn(block)) != 0;
-    storeHalfBlock(progress.out + left - BLOCK_UNITS, packed(block));
+    if (left == 0 || left >= 2 * BLOCK_UNITS || progress.room() < left) return;
+    std::uint64_t const back = std::min(progress.done() + left, 2 * BLOCK_UNITS);
+    __m128i const low = loadBlock(progress.end - back);
+    __m128i const high = loadBlock(progress.end - BLOCK_UNITS);
+    if (!isAscii(_mm_or_si128(low, high))) return;
+    char* const end = progress.out + left;
+    storeHalfBlock(end - back, packed(low));
+    storeHalfBlock(end - BLOCK_UNITS, packed(high));
+    progress.hasZero |= bitsOf(_mm_or_si128(zerosIn(low), zerosIn(high))) != 0;
     progress.advance(left, left);
 }
 
 /// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
 template <class Shuffle>
 ZB_IN_CALLER void takeBlocks(Progress& progress) {
-    takeAsciiBlocks(progress);
     while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
         __m128i const block = loadBlock(progress.text);
         progress.hasZero |= bitsOf(zerosIn(block)) != 0;
@@ -131,6 +177,7 @@ ZB_IN_CALLER void takeBlocks(Progress& progress) {
             return;
         }
         progress.advance(BLOCK_UNITS, BLOCK_UNITS);
+        takeAsciiBlocks(progress);
     }
 }
 
@@ -185,7 +232,12 @@ bool arePairs(Word units) {
     return (units & 0xFC00FC00 * EACH) == 0xDC00D800 * EACH;
 }
 
+template <class Shuffle>
 ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
+    while (progress.left() >= BLOCK_UNITS && progress.room() >= LONG_BLOCK_ROOM &&
+           Shuffle::storeLong(loadBlock(progress.text), progress.out)) {
+        progress.advance(BLOCK_UNITS, LONG_BLOCK_BYTES);
+    }
     // The word that is stored is one byte longer than the character.
     while (progress.left() > 0 && progress.room() >= LONGEST_CHARACTER) {
         std::uint32_t const unit = *progress.text;
@@ -195,7 +247,32 @@ ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
     }
 }
 
+__m128i eachLane(std::uint32_t value) { return _mm_set1_epi32(static_cast<int>(value)); }
+__m128i lanesOf(__m128i block, std::uint32_t bits) { return _mm_and_si128(block, eachLane(bits)); }
+
+/// The same for a block of four pairs.
+__m128i fourBytes(__m128i pairs) {
+    __m128i const high = _mm_add_epi32(lanesOf(pairs, 0x3FF), eachLane(0x40));
+    __m128i const low = _mm_srli_epi32(pairs, 16);
+    __m128i const first = lanesOf(_mm_srli_epi32(high, 8), 0x07);
+    __m128i const second = _mm_slli_epi32(lanesOf(high, 0xFC), 6);
+    __m128i const third =
+        _mm_or_si128(_mm_slli_epi32(lanesOf(high, 0x03), 20), _mm_slli_epi32(lanesOf(low, 0x3C0), 10));
+    __m128i const fourth = _mm_slli_epi32(lanesOf(low, 0x3F), 24);
+    return _mm_or_si128(_mm_or_si128(_mm_or_si128(first, second), _mm_or_si128(third, fourth)), eachLane(0x808080F0));
+}
+
+bool arePairs(__m128i block) {
+    return bitsOf(_mm_cmpeq_epi32(lanesOf(block, 0xFC00FC00), eachLane(0xDC00D800))) == 0xFFFF;
+}
+
 ZB_IN_CALLER void takePairs(Progress& progress) {
+    while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
+        __m128i const block = loadBlock(progress.text);
+        if (!arePairs(block)) break;
+        storeBlock(progress.out, fourBytes(block));
+        progress.advance(BLOCK_UNITS, BLOCK_BYTES);
+    }
     while (progress.left() >= 4 && progress.room() >= 2 * LONGEST_CHARACTER) {
         auto const word = loadWord<std::uint64_t>(progress.text);
         if (!arePairs(word)) return;
@@ -234,30 +311,42 @@ ZB_IN_CALLER bool takeCharacter(Progress& progress) {
     return true;
 }
 
-/// \return whether the rest of the text fits
-template <class Shuffle>
-ZB_IN_CALLER bool takeRest(Progress& progress) {
-    while (progress.text != progress.end) {
-        takeBlocks<Shuffle>(progress);
-        takeThreeByteRun(progress);
-        takePairs(progress);
-        takeEnd<Shuffle>(progress);
-        if (progress.text != progress.end && !takeCharacter(progress)) return false;
-    }
-    return true;
+Utf8Text result(Progress const& progress, char const* out) {
+    std::uint64_t const size = static_cast<std::uint64_t>(progress.out - out);
+    return {progress.text == progress.end ? size : NO_ROOM, progress.hasZero};
 }
 
-ZB_SHUFFLE_TARGET bool takeRestWithShuffle(Progress& progress) { return takeRest<WithShuffle>(progress); }
-bool takeRestWithoutShuffle(Progress& progress) { return takeRest<WithoutShuffle>(progress); }
+/// Goes on to the end of the text, or of the room. \param front  how many units have been taken, all ASCII
+template <class Shuffle>
+ZB_IN_CALLER Utf8Text takeRest(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
+                               std::uint64_t front, bool hasZero) {
+    Progress progress{text, text + front, text + size, out + front, out + room, hasZero};
+    while (progress.text != progress.end) {
+        takeBlocks<Shuffle>(progress);
+        takeThreeByteRun<Shuffle>(progress);
+        takePairs(progress);
+        takeEnd<Shuffle>(progress);
+        if (progress.text != progress.end && !takeCharacter(progress)) break;
+    }
+    return result(progress, out);
+}
+
+// These take words that fit registers: a whole `Progress` would have to be stored and waited for.
+ZB_SHUFFLE_TARGET Utf8Text takeRestWithShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
+                                               std::uint64_t front, bool hasZero) {
+    return takeRest<WithShuffle>(text, size, out, room, front, hasZero);
+}
+Utf8Text takeRestWithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
+                                std::uint64_t front, bool hasZero) {
+    return takeRest<WithoutShuffle>(text, size, out, room, front, hasZero);
+}
 
 ZB_IN_CALLER Utf8Text convert(WChar const* text, std::uint64_t size, char* out, std::uint64_t room, bool canShuffle) {
     Progress progress{text, text, text + size, out, out + room};
-    takeAsciiText(progress);
-    if (progress.text != progress.end) {
-        bool const fits = canShuffle ? takeRestWithShuffle(progress) : takeRestWithoutShuffle(progress);
-        if (!fits) return {NO_ROOM, progress.hasZero};
-    }
-    return {static_cast<std::uint64_t>(progress.out - out), progress.hasZero};
+    if (size >= BLOCK_UNITS) takeAsciiText(progress);
+    if (progress.text == progress.end) return result(progress, out);
+    return (canShuffle ? takeRestWithShuffle : takeRestWithoutShuffle)(text, size, out, room, progress.done(),
+                                                                       progress.hasZero);
 }
 
 // ---- lengths ----------------------------------------------------------------------------------------------------------

@@ -70,11 +70,36 @@ ZB_SHUFFLE_TARGET inline Taken takeMixedBlock(__m128i block, WChar* out) {
     return {static_cast<unsigned>(BLOCK_BYTES) - cut, size};
 }
 
+constexpr std::uint64_t LONG_CHARACTERS = 4;
+
+/// Takes the four characters of three bytes that a block begins with. \return false if it does not
+ZB_SHUFFLE_TARGET inline bool takeLongBlock(__m128i block, WChar* out) {
+    __m128i const marks = _mm_setr_epi8(-16, -64, -64, -16, -64, -64, -16, -64, -64, -16, -64, -64, 0, 0, 0, 0);
+    __m128i const marked =
+        _mm_setr_epi8(-32, -128, -128, -32, -128, -128, -32, -128, -128, -32, -128, -128, 0, 0, 0, 0);
+    if (bitsOf(_mm_cmpeq_epi8(_mm_and_si128(block, marks), marked)) != 0xFFFF) return false;
+    // A lane for each character, its last byte lowest; then the six bits of each byte but the first are moved together.
+    __m128i const lanes = _mm_shuffle_epi8(block, _mm_setr_epi8(2, 1, 0, -1, 5, 4, 3, -1, 8, 7, 6, -1, 11, 10, 9, -1));
+    __m128i const payload = _mm_and_si128(lanes, _mm_set1_epi32(0x000F3F3F));
+    __m128i const pairs = _mm_maddubs_epi16(payload, _mm_set1_epi32(0x00014001));
+    __m128i const characters = _mm_madd_epi16(pairs, _mm_set1_epi32(0x10000001));
+    __m128i const units =
+        _mm_shuffle_epi8(characters, _mm_setr_epi8(0, 1, 4, 5, 8, 9, 12, 13, -1, -1, -1, -1, -1, -1, -1, -1));
+    __m128i const high = _mm_and_si128(units, _mm_set1_epi16(static_cast<short>(0xF800)));
+    __m128i const wrong = _mm_or_si128(_mm_cmpeq_epi16(high, _mm_setzero_si128()),
+                                       _mm_cmpeq_epi16(high, _mm_set1_epi16(static_cast<short>(0xD800))));
+    if ((bitsOf(wrong) & 0xFF) != 0) return false;
+    storeHalfBlock(out, units);
+    return true;
+}
+
 struct WithShuffle {
     ZB_SHUFFLE_TARGET static Taken takeMixed(__m128i block, WChar* out) { return takeMixedBlock(block, out); }
+    ZB_SHUFFLE_TARGET static bool takeLong(__m128i block, WChar* out) { return takeLongBlock(block, out); }
 };
 struct WithoutShuffle {
     ZB_IN_CALLER static Taken takeMixed(__m128i, WChar*) { return {0, 0}; }
+    ZB_IN_CALLER static bool takeLong(__m128i, WChar*) { return false; }
 };
 
 /// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
@@ -128,14 +153,26 @@ ZB_IN_CALLER void takeEnd(Progress& progress) {
 
 bool isThreeByteUnit(std::uint32_t unit) { return unit >= 0x800 && !isSurrogate(unit); }
 
+/// The next bytes, six of them at least, the first one lowest. \pre eight bytes in all
+ZB_IN_CALLER std::uint64_t wordAt(Progress const& progress) {
+    std::uint64_t const missing =
+        sizeof(std::uint64_t) - std::min(progress.left(), std::uint64_t{sizeof(std::uint64_t)});
+    return loadWord<std::uint64_t>(progress.text - missing) >> 8 * missing;
+}
+
 /// The unit of the three-byte character in the lower bytes of a word.
 std::uint32_t threeByteUnit(std::uint64_t word) {
     return static_cast<std::uint32_t>((word & 0x0F) << 12 | (word >> 2 & 0xFC0) | (word >> 16 & 0x3F));
 }
 
+template <class Shuffle>
 ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
-    while (progress.left() >= sizeof(std::uint64_t) && progress.room() >= 2) {
-        auto const word = loadWord<std::uint64_t>(progress.text);
+    while (progress.left() >= BLOCK_BYTES && progress.room() >= LONG_CHARACTERS &&
+           Shuffle::takeLong(loadBlock(progress.text), progress.out)) {
+        progress.advance(3 * LONG_CHARACTERS, LONG_CHARACTERS);
+    }
+    while (progress.left() >= 6 && progress.done() + progress.left() >= sizeof(std::uint64_t) && progress.room() >= 2) {
+        auto const word = wordAt(progress);
         std::uint32_t const first = threeByteUnit(word);
         std::uint32_t const second = threeByteUnit(word >> 24);
         if ((word & 0xC0C0F0'C0C0F0) != 0x8080E0'8080E0 || !isThreeByteUnit(first) || !isThreeByteUnit(second)) return;
@@ -207,7 +244,7 @@ ZB_IN_CALLER std::uint64_t convert(Progress progress) {
     WChar const* const out = progress.out;
     while (progress.text != progress.end) {
         takeBlocks<Shuffle>(progress);
-        takeThreeByteRun(progress);
+        takeThreeByteRun<Shuffle>(progress);
         takeFourByteRun(progress);
         takeEnd<Shuffle>(progress);
         if (progress.text == progress.end) break;

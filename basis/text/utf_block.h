@@ -1,6 +1,7 @@
 /// \file
 /// Sixteen bytes of text at a time, for the conversions between UTF-8 and UTF-16. Needs SSE2, which every x64 has; where
-/// bytes are dropped from a block, it takes SSSE3, and processors without it go character by character.
+/// bytes are dropped from a block, it takes SSSE3, and processors without it go character by character. AVX2 is used for
+/// long runs.
 
 #ifndef BASIS_TEXT_UTF_BLOCK_H
 #define BASIS_TEXT_UTF_BLOCK_H
@@ -15,14 +16,17 @@
 #if defined(__GNUC__)
 #include <immintrin.h>
 #define ZB_SHUFFLE_TARGET __attribute__((target("ssse3")))
+#define ZB_WIDE_TARGET __attribute__((target("avx2")))
 #define ZB_IN_CALLER [[gnu::always_inline]] inline
 #define ZB_CAN_SHUFFLE (__builtin_cpu_supports("ssse3") != 0)
+#define ZB_CAN_WIDE (__builtin_cpu_supports("avx2") != 0)
 #else
-#include <emmintrin.h>
-#include <tmmintrin.h>
+#include <immintrin.h>
 #define ZB_SHUFFLE_TARGET
+#define ZB_WIDE_TARGET
 #define ZB_IN_CALLER inline
 #define ZB_CAN_SHUFFLE false
+#define ZB_CAN_WIDE false
 #endif
 
 namespace ZOR_Basis::Utf {
@@ -33,6 +37,15 @@ inline constexpr std::uint64_t BLOCK_UNITS = BLOCK_BYTES / sizeof(WChar);
 inline __m128i loadBlock(void const* from) { return _mm_loadu_si128(static_cast<__m128i const*>(from)); }
 inline void storeBlock(void* to, __m128i block) { _mm_storeu_si128(static_cast<__m128i*>(to), block); }
 inline void storeHalfBlock(void* to, __m128i block) { _mm_storel_epi64(static_cast<__m128i*>(to), block); }
+
+/// Blocks of twice the size, for functions that run only where the processor has them.
+inline constexpr std::uint64_t LEAST_WIDE_UNITS = 64; // shorter texts do not repay what they cost to start
+ZB_WIDE_TARGET inline __m256i loadWideBlock(void const* from) {
+    return _mm256_loadu_si256(static_cast<__m256i const*>(from));
+}
+ZB_WIDE_TARGET inline void storeWideBlock(void* to, __m256i block) {
+    _mm256_storeu_si256(static_cast<__m256i*>(to), block);
+}
 
 inline unsigned bitsOf(__m128i mask) { return static_cast<unsigned>(_mm_movemask_epi8(mask)); }
 

@@ -133,6 +133,34 @@ TEST_P(Conversion, Surrogates_without_their_others) {
     }
 }
 
+TEST_P(Conversion, One_character_anywhere_among_others) {
+    for (auto const& [others, one] : {std::pair{0x41u, 0u},
+                                      {0x41u, 0xE9u},
+                                      {0x41u, 0x20ACu},
+                                      {0x41u, 0x1F600u},
+                                      {0xE9u, 0x41u},
+                                      {0x20ACu, 0x41u},
+                                      {0x20ACu, 0xE9u},
+                                      {0x20ACu, 0x1F600u},
+                                      {0x1F600u, 0x20ACu},
+                                      {0x1F600u, 0u}}) {
+        for (std::size_t size = 1; size <= 80 && !HasFailure(); ++size) {
+            for (std::size_t place = 0; place < size; ++place) {
+                std::vector<std::uint32_t> text(size, others);
+                text[place] = one;
+                std::string const narrow = reference::utf8(text);
+                reference::WideText const wide = reference::utf16(text);
+                for (std::uint64_t missing : {0u, 1u}) {
+                    narrowToWide(narrow, wide.size() - missing);
+                    wideToNarrow(wide, narrow.size() - missing);
+                }
+                narrowToWide(narrow, wide.size() + 40);
+                wideToNarrow(wide, narrow.size() + 40);
+            }
+        }
+    }
+}
+
 TEST_P(Conversion, Lengths_beyond_what_one_round_of_sums_holds) {
     for (std::uint32_t character : {0x41u, 0xE9u, 0x20ACu, 0x1F600u}) {
         std::vector<std::uint32_t> const text(10'001, character);
