@@ -16,6 +16,19 @@ namespace {
 
 using HQ_Basis::AlertTimer;
 
+/// Deleting an alert reports no failure: one may come once more when its logger is gone.
+struct Loggers {
+    std::mutex mutex;
+    LinkedList<LoggerImpl> list;
+
+    static Loggers& all() {
+        // Never destroyed: alerts go on while the process ends.
+        alignas(Loggers) static unsigned char memory[sizeof(Loggers)];
+        static auto* const kept = new (memory) Loggers;
+        return *kept;
+    }
+};
+
 /// \error what cannot be written is lost
 void appendToFile(char const* path, char const* text, std::uint64_t size) {
     std::FILE* const file = systemCalls.openStream(path, "a");
@@ -28,21 +41,34 @@ void appendToFile(char const* path, char const* text, std::uint64_t size) {
 
 Logger::~Logger() = default;
 
-LoggerImpl::LoggerImpl(char const* name) : name_(name) {}
+LoggerImpl::LoggerImpl(char const* name) : name_(name) {
+    Loggers& all = Loggers::all();
+    std::lock_guard const held(all.mutex);
+    all.list.append(this);
+}
 
 LoggerImpl* LoggerImpl::start(char const* name) {
     auto* const logger = new (std::nothrow) LoggerImpl(name);
     if (logger == nullptr) return nullptr;
-    logger->alertId_ = AlertTimer::New(PERIOD_MS, tick, logger);
-    if (logger->alertId_ == 0) {
+    std::uint32_t const id = AlertTimer::New(PERIOD_MS, tick, logger);
+    if (id == 0) {
         delete logger;
         return nullptr;
+    }
+    {
+        std::lock_guard const held(Loggers::all().mutex);
+        logger->alertId_ = id;
     }
     logPath(logger->name_, logger->session_, true);
     return logger;
 }
 
 LoggerImpl::~LoggerImpl() {
+    {
+        Loggers& all = Loggers::all();
+        std::lock_guard const held(all.mutex);
+        all.list.unlink(this);
+    }
     while (Buffer* const buffer = buffers_.takeFirst()) deleteBuffer(buffer);
 }
 
@@ -99,12 +125,22 @@ void LoggerImpl::deleteBuffer(Buffer* buffer) {
     deleteNode(nodeMgr_, buffer);
 }
 
+/// \return null when the alert's logger is gone, also where another one lies in its place
+LoggerImpl* LoggerImpl::ownerOf(AlertTimer::Alert const& alert) {
+    Loggers& all = Loggers::all();
+    std::lock_guard const held(all.mutex);
+    LoggerImpl* logger = all.list.first();
+    while (logger != nullptr && logger != alert.context) logger = logger->next;
+    // An alert may come before the logger knows its id.
+    bool const isOwner = logger != nullptr && (logger->alertId_ == alert.id || logger->alertId_ == 0);
+    return isOwner ? logger : nullptr;
+}
+
 std::uint32_t LoggerImpl::tick(AlertTimer::Alert const& alert) {
-    auto* const logger = static_cast<LoggerImpl*>(alert.context);
-    if (logger->flush()) {
-        std::uint32_t const id = logger->alertId_;
+    LoggerImpl* const logger = ownerOf(alert);
+    if (logger == nullptr || logger->flush()) {
         delete logger;
-        AlertTimer::Delete(id);
+        AlertTimer::Delete(alert.id);
     }
     return PERIOD_MS;
 }

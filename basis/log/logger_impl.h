@@ -48,6 +48,7 @@ private:
 
     explicit LoggerImpl(char const* name);
 
+    static LoggerImpl* ownerOf(HQ_Basis::AlertTimer::Alert const& alert);
     static std::uint32_t tick(HQ_Basis::AlertTimer::Alert const& alert);
     bool flush();
     bool mustWait(Buffer const* buffer) const;
@@ -66,6 +67,11 @@ private:
     bool closing_ = false;
     std::uint32_t alertId_ = 0;
     std::uint32_t lastWrite_ = 0;
+
+    friend class LinkedList<LoggerImpl>;
+    /// The neighbours among all loggers.
+    LoggerImpl* previous = nullptr;
+    LoggerImpl* next = nullptr;
 };
 
 } // namespace ZOR_Basis
