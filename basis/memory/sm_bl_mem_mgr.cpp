@@ -51,7 +51,8 @@ SmBlMemMgr::SmBlMemMgr(std::uint64_t elemSize, std::uint64_t count, std::uint64_
 void* SmBlMemMgr::alloc(std::uint64_t size) { return size <= elemSize_ ? SmBlMemMgr::alloc() : nullptr; }
 
 void* SmBlMemMgr::alloc() {
-    if (freeList_ != nullptr) return std::exchange(freeList_, nextOf(freeList_));
+    if (freeList_ != nullptr) [[unlikely]]
+        return std::exchange(freeList_, nextOf(freeList_));
     return hasRoom() ? carve() : carveFromNewChunk();
 }
 
@@ -60,7 +61,7 @@ void SmBlMemMgr::free(void* p, std::uint64_t) { SmBlMemMgr::free(p); }
 void SmBlMemMgr::free(void* p) {
     // Many elements freed in a row are as many lines of memory to fetch, which all can be under way at once.
     _mm_prefetch(static_cast<char const*>(p), _MM_HINT_T0);
-    if (p == top_) {
+    if (p == top_) [[likely]] {
         // The same as from `top_`, which was written a moment ago and would have to be waited for.
         top_ = static_cast<char*>(p) + elemSize_;
     } else if (p != nullptr) {
