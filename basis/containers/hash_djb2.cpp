@@ -1,10 +1,22 @@
-#include "zor_basis/containers/hashing.h"
+#include "basis/containers/hash_djb2.h"
 
-#include <emmintrin.h>
+#include "zor_basis/containers/hashing.h"
 
 #include <array>
 #include <bit>
 #include <cstdint>
+
+#if defined(__GNUC__)
+#include <immintrin.h>
+#define ZB_SSSE3 [[gnu::target("ssse3")]]
+#define ZB_HAS_SSSE3 (__builtin_cpu_supports("ssse3") != 0)
+#define ZB_IN_CALLER [[gnu::always_inline]] inline
+#else
+#include <immintrin.h>
+#define ZB_SSSE3
+#define ZB_HAS_SSSE3 false
+#define ZB_IN_CALLER inline
+#endif
 
 // The hash of a text is 33^n times the start, plus the sum of its bytes weighted with falling powers of 33. Sixteen bytes
 // are weighted at once. The last block is filled with zeros, which weights its bytes too high by a power of 33; as 33 is
@@ -35,16 +47,35 @@ constexpr auto INVERSE_POWER = powersOf(inverse(FACTOR));
 
 std::uint64_t signExtended(std::int64_t value) { return static_cast<std::uint64_t>(value); }
 
+constexpr int weights(std::uint64_t first, std::uint64_t second) { return static_cast<int>(second << 16 | first); }
+
+// How pairs of bytes are weighted: eight sums of 33 times the first, plus the second.
+struct ByMultiplication {
+    ZB_IN_CALLER static __m128i pairs(__m128i bytes) {
+        // kept hash-01: the sign of each byte is extended.
+        __m128i const signs = _mm_cmpgt_epi8(_mm_setzero_si128(), bytes);
+        __m128i const byPair = _mm_set1_epi32(weights(POWER[1], 1));
+        return _mm_packs_epi32(_mm_madd_epi16(_mm_unpacklo_epi8(bytes, signs), byPair),
+                               _mm_madd_epi16(_mm_unpackhi_epi8(bytes, signs), byPair));
+    }
+};
+struct BySsse3 {
+    ZB_SSSE3 static __m128i pairs(__m128i bytes) {
+        // kept hash-01: the second operand's bytes are signed.
+        return _mm_maddubs_epi16(_mm_set1_epi16(static_cast<short>(1 << 8 | POWER[1])), bytes);
+    }
+};
+
+/// Sixteen bytes in four groups, each weighted within itself; 32 bits hold it.
+template <class Pairs>
+ZB_IN_CALLER __m128i byGroups(__m128i bytes) {
+    return _mm_madd_epi16(Pairs::pairs(bytes), _mm_set1_epi32(weights(POWER[2], 1)));
+}
+
 /// Byte i of sixteen, signed, times 33^(15 - i), summed.
-std::uint64_t weighted(__m128i bytes) {
-    // kept hash-01: the sign of each byte is extended.
-    __m128i const signs = _mm_cmpgt_epi8(_mm_setzero_si128(), bytes);
-    __m128i const byPair = _mm_set1_epi32(1 << 16 | static_cast<int>(POWER[1]));
-    __m128i const low = _mm_madd_epi16(_mm_unpacklo_epi8(bytes, signs), byPair);
-    __m128i const high = _mm_madd_epi16(_mm_unpackhi_epi8(bytes, signs), byPair);
-    __m128i const byGroup = _mm_set1_epi32(1 << 16 | static_cast<int>(POWER[2]));
-    __m128i const groups = _mm_madd_epi16(_mm_packs_epi32(low, high), byGroup);
-    // Four groups of four bytes, each as far as 32 bits reach.
+template <class Pairs>
+ZB_IN_CALLER std::uint64_t weighted(__m128i bytes) {
+    __m128i const groups = byGroups<Pairs>(bytes);
     std::int64_t const front = _mm_cvtsi128_si64(groups);
     std::int64_t const back = _mm_cvtsi128_si64(_mm_unpackhi_epi64(groups, groups));
     return signExtended(static_cast<std::int32_t>(front)) * POWER[12] + signExtended(front >> 32) * POWER[8] +
@@ -59,7 +90,7 @@ __m128i load(char const* p) { return _mm_loadu_si128(reinterpret_cast<__m128i co
 #endif
 inline __m128i
 loadText(char const* text) {
-    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) {
+    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) [[likely]] {
         return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); // not load(): that one is sanitized
     }
     char bytes[BLOCK] = {};
@@ -74,21 +105,51 @@ __m128i firstBytes(__m128i bytes, unsigned count) {
     return _mm_and_si128(bytes, load(MASK + BLOCK - count));
 }
 
-} // namespace
+unsigned zerosIn(__m128i bytes) {
+    return static_cast<unsigned>(_mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())));
+}
 
-std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
-    if (text == nullptr) return START;
+template <class Pairs>
+ZB_IN_CALLER std::uint64_t hashOf(char const* text) {
     std::uint64_t hash = START;
     for (;; text += BLOCK) {
         __m128i const bytes = loadText(text);
-        auto const zeros = static_cast<unsigned>(_mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())));
+        unsigned const zeros = zerosIn(bytes);
         if (zeros != 0) {
             auto const count = static_cast<unsigned>(std::countr_zero(zeros));
             if (count == 0) return hash;
-            return hash * POWER[count] + weighted(firstBytes(bytes, count)) * INVERSE_POWER[BLOCK - count];
+            return hash * POWER[count] + weighted<Pairs>(firstBytes(bytes, count)) * INVERSE_POWER[BLOCK - count];
         }
-        hash = hash * POWER[BLOCK] + weighted(bytes);
+        hash = hash * POWER[BLOCK] + weighted<Pairs>(bytes);
     }
+}
+
+constexpr unsigned SHORT = 8;
+
+/// Of the first `count` of sixteen bytes, at most SHORT.
+ZB_IN_CALLER std::uint64_t hashOfShort(__m128i bytes, unsigned count) {
+    // Zeros in front of the text weigh nothing. In two steps, as all bits may go.
+    unsigned const half = 4 * (SHORT - count);
+    auto const last = static_cast<std::uint64_t>(_mm_cvtsi128_si64(bytes)) << half << half;
+    __m128i const groups = byGroups<ByMultiplication>(_mm_cvtsi64_si128(static_cast<std::int64_t>(last)));
+    std::int64_t const both = _mm_cvtsi128_si64(groups);
+    return START * POWER[count] + signExtended(static_cast<std::int32_t>(both)) * POWER[4] + signExtended(both >> 32);
+}
+
+ZB_SSSE3 std::uint64_t hashBySsse3(char const* text) { return hashOf<BySsse3>(text); }
+
+} // namespace
+
+std::uint64_t hashDjb2ByMultiplication(char const* text) { return hashOf<ByMultiplication>(text); }
+
+std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
+    if (text == nullptr) [[unlikely]]
+        return START;
+    __m128i const bytes = loadText(text);
+    unsigned const zeros = zerosIn(bytes) & ((2U << SHORT) - 1);
+    if (zeros != 0) [[likely]]
+        return hashOfShort(bytes, static_cast<unsigned>(std::countr_zero(zeros)));
+    return ZB_HAS_SSSE3 ? hashBySsse3(text) : hashDjb2ByMultiplication(text);
 }
 
 } // namespace ZOR_Basis
