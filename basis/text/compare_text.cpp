@@ -78,11 +78,12 @@ inline int orderAtTheEnd(char const* a, char const* b) noexcept {
     return orderAt(a, b, 0);
 }
 
+/// Of 32 places, a bit each.
+constexpr unsigned AllSame = 0xFFFFFFFF;
+
 /// Two texts of 17 to 64 bytes in four vectors, which overlap each other in shorter ones. They are compared as memory
 /// first. Only where they differ does it matter whether they ended before that; such texts are rare, and the runtime
 /// compares them.
-constexpr unsigned AllSame = 0xFFFFFFFF;
-
 class MediumTexts {
 public:
     ZB_INLINE MediumTexts(char const* a, char const* b, std::uint64_t length) noexcept
@@ -134,59 +135,60 @@ constexpr std::uint64_t Nowhere = std::numeric_limits<std::uint64_t>::max();
 constexpr std::uint64_t Unreadable = Nowhere - 1;
 
 /// Two texts of more than 64 bytes, in the same way.
-struct LongTexts {
-    ZB_AVX2 ZB_INLINE LongTexts(char const* first, char const* second, std::uint64_t size) noexcept
-        : a(first), b(second), length(size), least(_mm256_set1_epi8(-1)) {}
+class LongTexts {
+public:
+    ZB_AVX2 ZB_INLINE LongTexts(char const* a, char const* b, std::uint64_t length) noexcept
+        : a_(a), b_(b), length_(length), least_(_mm256_set1_epi8(-1)) {}
 
-    /// Where the first of several vectors begins that are not all the same, or a run of them.
+    /// Where a run of vectors begins that are not all the same.
     template <class Text>
     ZB_AVX2 ZB_INLINE std::uint64_t difference() noexcept {
         constexpr std::uint64_t Run = 128;
         std::uint64_t done = 0;
-        for (; length - done > Run; done += Run) {
-            if (!Text::readable(a + done, b + done, Run)) return Unreadable;
+        for (; length_ - done > Run; done += Run) {
+            if (!Text::readable(a_ + done, b_ + done, Run)) return Unreadable;
             if (!sameFour(done, done + 64)) return done;
         }
-        if (!Text::readable(a + done, b + done, length - done)) return Unreadable;
+        if (!Text::readable(a_ + done, b_ + done, length_ - done)) return Unreadable;
         // The last run of a longer text begins in the one before.
-        if (length > Run) return sameFour(length - Run, length - 64) ? Nowhere : done;
-        return sameFour(0, length - 64) ? Nowhere : 0;
+        if (length_ > Run) return sameFour(length_ - Run, length_ - 64) ? Nowhere : done;
+        return sameFour(0, length_ - 64) ? Nowhere : 0;
     }
 
     /// Whether a zero is among the bytes looked at so far.
-    ZB_AVX2 ZB_INLINE bool haveZero() const noexcept { return hasZero(least); }
+    ZB_AVX2 ZB_INLINE bool haveZero() const noexcept { return hasZero(least_); }
 
     /// The place of the first difference. \pre there is one behind `place`
     ZB_AVX2 ZB_INLINE std::uint64_t firstFrom(std::uint64_t place) const noexcept {
         for (;; place += 32) {
-            place = std::min(place, length - 32);
-            unsigned const same = sameBytes(load32(a + place), place);
+            place = std::min(place, length_ - 32);
+            unsigned const same = sameBytes(load32(a_ + place), place);
             if (same != AllSame) return place + static_cast<std::uint64_t>(std::countr_one(same));
         }
     }
 
 private:
     ZB_AVX2 ZB_INLINE __m256i compared(__m256i bytes, std::uint64_t place) const noexcept {
-        return _mm256_cmpeq_epi8(bytes, load32(b + place));
+        return _mm256_cmpeq_epi8(bytes, load32(b_ + place));
     }
     ZB_AVX2 ZB_INLINE unsigned sameBytes(__m256i bytes, std::uint64_t place) const noexcept {
         return static_cast<unsigned>(_mm256_movemask_epi8(compared(bytes, place)));
     }
     ZB_AVX2 ZB_INLINE bool sameFour(std::uint64_t head, std::uint64_t tail) noexcept {
-        __m256i const v0 = load32(a + head);
-        __m256i const v1 = load32(a + head + 32);
-        __m256i const v2 = load32(a + tail);
-        __m256i const v3 = load32(a + tail + 32);
-        least = _mm256_min_epu8(least, _mm256_min_epu8(_mm256_min_epu8(v0, v1), _mm256_min_epu8(v2, v3)));
+        __m256i const v0 = load32(a_ + head);
+        __m256i const v1 = load32(a_ + head + 32);
+        __m256i const v2 = load32(a_ + tail);
+        __m256i const v3 = load32(a_ + tail + 32);
+        least_ = _mm256_min_epu8(least_, _mm256_min_epu8(_mm256_min_epu8(v0, v1), _mm256_min_epu8(v2, v3)));
         __m256i const front = _mm256_and_si256(compared(v0, head), compared(v1, head + 32));
         __m256i const back = _mm256_and_si256(compared(v2, tail), compared(v3, tail + 32));
         return static_cast<unsigned>(_mm256_movemask_epi8(_mm256_and_si256(front, back))) == AllSame;
     }
 
-    char const* a;
-    char const* b;
-    std::uint64_t length;
-    __m256i least;
+    char const* a_;
+    char const* b_;
+    std::uint64_t length_;
+    __m256i least_;
 };
 
 template <class Text>

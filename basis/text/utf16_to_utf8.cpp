@@ -226,10 +226,30 @@ Word fourBytes(Word pairs) {
            (low & 0x3C0 * EACH) << 10 | (low & 0x3F * EACH) << 24;
 }
 
+/// Whether a word consists of surrogate pairs.
 template <class Word>
 bool arePairs(Word units) {
     constexpr Word EACH = static_cast<Word>(0x00000001'00000001);
     return (units & 0xFC00FC00 * EACH) == 0xDC00D800 * EACH;
+}
+
+__m128i eachLane(std::uint32_t value) { return _mm_set1_epi32(static_cast<int>(value)); }
+__m128i lanesOf(__m128i block, std::uint32_t bits) { return _mm_and_si128(block, eachLane(bits)); }
+
+/// The same of a block of four pairs.
+__m128i fourBytes(__m128i pairs) {
+    __m128i const high = _mm_add_epi32(lanesOf(pairs, 0x3FF), eachLane(0x40));
+    __m128i const low = _mm_srli_epi32(pairs, 16);
+    __m128i const first = lanesOf(_mm_srli_epi32(high, 8), 0x07);
+    __m128i const second = _mm_slli_epi32(lanesOf(high, 0xFC), 6);
+    __m128i const third =
+        _mm_or_si128(_mm_slli_epi32(lanesOf(high, 0x03), 20), _mm_slli_epi32(lanesOf(low, 0x3C0), 10));
+    __m128i const fourth = _mm_slli_epi32(lanesOf(low, 0x3F), 24);
+    return _mm_or_si128(_mm_or_si128(_mm_or_si128(first, second), _mm_or_si128(third, fourth)), eachLane(0x808080F0));
+}
+
+bool arePairs(__m128i block) {
+    return bitsOf(_mm_cmpeq_epi32(lanesOf(block, 0xFC00FC00), eachLane(0xDC00D800))) == 0xFFFF;
 }
 
 template <class Shuffle>
@@ -245,25 +265,6 @@ ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
         storeWord(progress.out, threeBytes(unit));
         progress.advance(1, 3);
     }
-}
-
-__m128i eachLane(std::uint32_t value) { return _mm_set1_epi32(static_cast<int>(value)); }
-__m128i lanesOf(__m128i block, std::uint32_t bits) { return _mm_and_si128(block, eachLane(bits)); }
-
-/// The same for a block of four pairs.
-__m128i fourBytes(__m128i pairs) {
-    __m128i const high = _mm_add_epi32(lanesOf(pairs, 0x3FF), eachLane(0x40));
-    __m128i const low = _mm_srli_epi32(pairs, 16);
-    __m128i const first = lanesOf(_mm_srli_epi32(high, 8), 0x07);
-    __m128i const second = _mm_slli_epi32(lanesOf(high, 0xFC), 6);
-    __m128i const third =
-        _mm_or_si128(_mm_slli_epi32(lanesOf(high, 0x03), 20), _mm_slli_epi32(lanesOf(low, 0x3C0), 10));
-    __m128i const fourth = _mm_slli_epi32(lanesOf(low, 0x3F), 24);
-    return _mm_or_si128(_mm_or_si128(_mm_or_si128(first, second), _mm_or_si128(third, fourth)), eachLane(0x808080F0));
-}
-
-bool arePairs(__m128i block) {
-    return bitsOf(_mm_cmpeq_epi32(lanesOf(block, 0xFC00FC00), eachLane(0xDC00D800))) == 0xFFFF;
 }
 
 ZB_IN_CALLER void takePairs(Progress& progress) {
