@@ -109,11 +109,11 @@ unsigned zerosIn(__m128i bytes) {
     return static_cast<unsigned>(_mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())));
 }
 
+/// \param bytes  the first sixteen of the text, or what `loadText` gives for them
 template <class Pairs>
-ZB_IN_CALLER std::uint64_t hashOf(char const* text) {
+ZB_IN_CALLER std::uint64_t hashOf(char const* text, __m128i bytes) {
     std::uint64_t hash = START;
-    for (;; text += BLOCK) {
-        __m128i const bytes = loadText(text);
+    for (;; bytes = loadText(text += BLOCK)) {
         unsigned const zeros = zerosIn(bytes);
         if (zeros != 0) {
             auto const count = static_cast<unsigned>(std::countr_zero(zeros));
@@ -136,11 +136,11 @@ ZB_IN_CALLER std::uint64_t hashOfShort(__m128i bytes, unsigned count) {
     return START * POWER[count] + signExtended(static_cast<std::int32_t>(both)) * POWER[4] + signExtended(both >> 32);
 }
 
-ZB_SSSE3 std::uint64_t hashBySsse3(char const* text) { return hashOf<BySsse3>(text); }
+ZB_SSSE3 std::uint64_t hashBySsse3(char const* text, __m128i bytes) { return hashOf<BySsse3>(text, bytes); }
 
 } // namespace
 
-std::uint64_t hashDjb2ByMultiplication(char const* text) { return hashOf<ByMultiplication>(text); }
+std::uint64_t hashDjb2ByMultiplication(char const* text) { return hashOf<ByMultiplication>(text, loadText(text)); }
 
 std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
     if (text == nullptr) [[unlikely]]
@@ -149,7 +149,7 @@ std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
     unsigned const zeros = zerosIn(bytes) & ((2U << SHORT) - 1);
     if (zeros != 0) [[likely]]
         return hashOfShort(bytes, static_cast<unsigned>(std::countr_zero(zeros)));
-    return ZB_HAS_SSSE3 ? hashBySsse3(text) : hashDjb2ByMultiplication(text);
+    return ZB_HAS_SSSE3 ? hashBySsse3(text, bytes) : hashDjb2ByMultiplication(text);
 }
 
 } // namespace ZOR_Basis

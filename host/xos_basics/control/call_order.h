@@ -3,8 +3,8 @@
 ///
 /// Most functions read a clock, once several threads call them. What is done to a semaphore costs less than that reading,
 /// so these functions count time by events: a thread's time grows with each such call, a semaphore carries the giver's
-/// time to the taker, and the common time passes it on where threads or tasks start and end, where any other function is
-/// called by several threads, and where somebody asks for a last call. So only threads that agree on an order by means of
+/// time to the taker, and the common time passes it on where threads or tasks start and end, where any other function
+/// with arguments is called by several threads, and where somebody asks for a last call. So only threads that agree on an order by means of
 /// their own, between calls of nothing but these, leave the order of those calls open.
 
 #ifndef HOST_XOS_BASICS_CONTROL_CALL_ORDER_H

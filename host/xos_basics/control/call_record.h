@@ -32,7 +32,8 @@ struct TextBuffer {
 
 struct CallSlot {
     std::array<std::atomic<std::uint64_t>, MAX_ARGUMENTS> words;
-    /// When the call was made; 0 where one thread alone calls the function, unless events order its calls.
+    /// When the call was made; 0 where one thread alone calls the function, unless events order its calls,
+    /// and where it has no arguments.
     std::atomic<std::uint64_t> stamp;
     std::atomic<TextBuffer*> texts;
     /// How many words of the texts the call uses.

@@ -34,7 +34,9 @@ bool takesInjectedFailure(Function function);
 /// Notes one call in the calling thread's record, from construction to destruction.
 class CallNote {
 public:
-    [[gnu::always_inline]] explicit CallNote(Function function) : CallNote(function, threadCalls()) {}
+    /// \param isAlike  all calls of the function are noted alike, so that nobody asks which of them was the last
+    [[gnu::always_inline]] explicit CallNote(Function function, bool isAlike = false)
+        : CallNote(function, isAlike, threadCalls()) {}
     CallNote(CallNote const&) = delete;
     CallNote& operator=(CallNote const&) = delete;
     ~CallNote() { _record.completed.store(_number, std::memory_order_release); }
@@ -57,11 +59,11 @@ public:
     }
 
 private:
-    [[gnu::always_inline]] CallNote(Function function, ThreadCalls& mine)
+    [[gnu::always_inline]] CallNote(Function function, bool isAlike, ThreadCalls& mine)
         : _record(mine.records[indexOf(function)]),
           _number(_record.completed.load(std::memory_order_relaxed) + 1),
           _slot(_record.slots[_number % 2]) {
-        _slot.stamp.store(stampOfCall(function, mine), std::memory_order_release);
+        _slot.stamp.store(isAlike ? 0 : stampOfCall(function, mine), std::memory_order_release);
     }
 
     CallRecord& _record;
@@ -80,7 +82,7 @@ template <class... Arguments>
 [[gnu::always_inline]] inline bool failsNow(Function function, Arguments const&... arguments) {
     static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
     {
-        CallNote note{function};
+        CallNote note{function, sizeof...(Arguments) == 0};
         (note.add(arguments), ...);
     }
     return failsAfterNote(function);
