@@ -32,6 +32,13 @@
 #define ZB_INSTANTIATE_TEMPLATE template class
 #endif
 
+/// `ZB_API` for functions so short that the detour counts through which ELF programs reach a library's functions.
+#if defined(__ELF__) && !defined(__clang__)
+#define ZB_API_STRAIGHT ZB_API __attribute__((noplt))
+#else
+#define ZB_API_STRAIGHT ZB_API
+#endif
+
 /// C linkage for what C can call.
 #ifdef __cplusplus
 #define ZB_EXTERN_C extern "C"

@@ -40,9 +40,9 @@ namespace ZOR_Basis::detail {
 
 /// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read; for the order
 /// the terminator behind them too.
-ZB_API void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
-ZB_API bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
-ZB_API int compareOwnedTexts(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept;
+ZB_API_STRAIGHT void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
+ZB_API_STRAIGHT bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
+ZB_API_STRAIGHT int compareOwnedTexts(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept;
 
 template <class Word>
 inline Word loadWord(char const* text) noexcept {
