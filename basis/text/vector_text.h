@@ -1,5 +1,5 @@
 /// \file
-/// Narrow text in vectors of 16 bytes, for copying and comparing without a call of the runtime.
+/// Narrow text in vectors, for copying and comparing without a call of the runtime.
 ///
 /// The text may end before its given length, with nothing readable behind its terminator. So a vector is read only where
 /// it lies in the page of its first byte, which is readable, and what does not is left to the runtime. Texts of up to 64
@@ -27,7 +27,8 @@
 #endif
 #endif
 
-#if ZB_VECTOR_TEXT && defined(__GNUC__)
+// Vectors of more than 16 bytes never lie on the stack in optimised code, which mingw would not align for them.
+#if ZB_VECTOR_TEXT && defined(__GNUC__) && (defined(__OPTIMIZE__) || !defined(_WIN32))
 #define ZB_WIDE_VECTOR_TEXT 1
 #include <immintrin.h>
 #else
@@ -76,6 +77,7 @@ inline bool hasZero(std::uint64_t bytes) noexcept {
 
 // Longer vectors, in functions of their own that run only where the processor has them.
 #define ZB_AVX2 [[gnu::target("avx2")]]
+#define ZB_AVX512 [[gnu::target("avx512bw")]]
 
 ZB_AVX2 ZB_INLINE __m256i load32(char const* text) noexcept {
     return _mm256_loadu_si256(reinterpret_cast<__m256i const*>(text));

@@ -1,44 +1,14 @@
 // Linux only, as the page behind a text is taken away here: nothing behind a terminator is read, whatever length is given.
 // The Windows build has the same code.
 
+#include "tests/text/last_page_posix.h"
 #include "zor_basis/text.h"
 
 #include <gtest/gtest.h>
 
-#include <sys/mman.h>
-
-#include <cstring>
 #include <string>
 
 using namespace ZOR_Basis;
-
-namespace {
-
-constexpr std::size_t PageSize = 4096;
-
-/// Two pages, of which the second cannot be read.
-class LastPage {
-public:
-    LastPage() {
-        void* pages = mmap(nullptr, 2 * PageSize, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
-        begin_ = static_cast<char*>(pages);
-        mprotect(begin_ + PageSize, PageSize, PROT_NONE);
-    }
-    ~LastPage() { munmap(begin_, 2 * PageSize); }
-    LastPage(LastPage const&) = delete;
-    LastPage& operator=(LastPage const&) = delete;
-
-    template <class Char>
-    Char const* textAtTheEnd(std::basic_string<Char> const& text) {
-        std::size_t const bytes = (text.size() + 1) * sizeof(Char);
-        return static_cast<Char const*>(std::memcpy(begin_ + PageSize - bytes, text.c_str(), bytes));
-    }
-
-private:
-    char* begin_;
-};
-
-} // namespace
 
 TEST(TextAtThePagesEnd, is_read_up_to_its_terminator_only) {
     LastPage first;

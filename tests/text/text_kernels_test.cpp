@@ -118,6 +118,7 @@ TEST(TextKernels, compare_every_length_with_a_difference_at_every_place) {
                 ASSERT_EQ(Str(a, size).compare(Str(b, bSize)), order) << size << ' ' << place;
                 ASSERT_EQ(Str(b, bSize).compare(Str(a, size)), -order) << size << ' ' << place;
                 ASSERT_EQ(Str(a, size / 2).compare(Str(b, 3)), order) << "sizes only guide the reading";
+                ASSERT_EQ(Str(a, size / 2).compare(Str(b, size)), order) << size << ' ' << place;
                 ASSERT_EQ(Str(a, size + 500).compare(Str(b, size + 900)), order);
                 ASSERT_EQ(Str(a).compare(b), order);
                 ASSERT_EQ(sign(Str(a).compare(b, size + 1)), order);
@@ -132,6 +133,22 @@ TEST(TextKernels, compare_every_length_with_a_difference_at_every_place) {
                     ownedA.size() == ownedB.size() && std::strncmp(ownedA, ownedB, ownedA.size()) == 0;
                 ASSERT_TRUE(ownedB.size() == 0 || (ownedA == ownedB) == ownedSame) << size << ' ' << place;
             }
+        }
+    }
+}
+
+TEST(TextKernels, compare_where_runs_of_64_bytes_meet) {
+    for (std::size_t size : {127U, 128U, 129U, 191U, 192U, 193U, 256U, 257U, 320U, 321U, 400U, 449U}) {
+        BufStr<255> const a(std::string(size, 'q'));
+        ASSERT_TRUE(a == BufStr<255>(a)) << size;
+        for (std::size_t place = 0; place < size; ++place) {
+            BufStr<255> b(a);
+            b[place] = 'r';
+            ASSERT_FALSE(a == b) << size << ' ' << place;
+            ASSERT_EQ(a.compare(b), -1) << size << ' ' << place;
+            b[place] = '\0';
+            ASSERT_FALSE(a == b) << size << ' ' << place;
+            ASSERT_EQ(a.compare(b), 1) << size << ' ' << place;
         }
     }
 }

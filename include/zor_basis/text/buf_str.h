@@ -73,7 +73,7 @@ public:
     /// As for any two texts, only faster.
     template <std::same_as<BufStr> Other>
     int compare(Other const& other) const noexcept {
-        return detail::compareOwned(text_, size_, other.text_, other.size_);
+        return detail::compareOwned<N>(text_, size_, other.text_, other.size_);
     }
 
     /// Appends a text; an empty source changes nothing.
@@ -208,11 +208,11 @@ bool operator==(BufStr<N> const& a, BufStr<N> const& b) noexcept {
     // kept text-01: the right-hand size decides here too
     if (b.size() == 0) [[unlikely]]
         return a.eq(b.c_str(), 0);
-    return a.size() == b.size() && detail::sameOwned(a.c_str(), b.c_str(), b.size());
+    return a.size() == b.size() && detail::sameOwned<N>(a.c_str(), b.c_str(), b.size());
 }
 template <std::uint64_t N>
 std::weak_ordering operator<=>(BufStr<N> const& a, BufStr<N> const& b) noexcept {
-    return detail::compareOwned(a.c_str(), a.size(), b.c_str(), b.size()) <=> 0;
+    return detail::compareOwned<N>(a.c_str(), a.size(), b.c_str(), b.size()) <=> 0;
 }
 
 /// The everyday string: names, extensions, small numbers.

@@ -38,11 +38,11 @@
 
 namespace ZOR_Basis::detail {
 
-/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read; for the order
-/// the terminator behind them too.
+/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read. For the order
+/// that is the size of the shorter one, and the terminator behind it may be read too.
 ZB_API_STRAIGHT void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
-ZB_API_STRAIGHT int compareOwnedTexts(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept;
+ZB_API_STRAIGHT int compareOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
 
 template <class Word>
 inline Word loadWord(char const* text) noexcept {
@@ -156,8 +156,11 @@ inline void copyGiven(char* target, char const* source, std::uint64_t length) no
     copyText(target, source, length);
 }
 
+/// Of strings with room for N bytes inside. Where that is little, their texts are mostly short and compared here; longer
+/// ones go straight into the library.
+template <std::uint64_t N>
 inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexcept {
-    if (WordsBeginLow && length >= 4 && length <= 16) {
+    if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
         if (length < 8) {
             WordPair const both(loadEnds(a, length), loadEnds(b, length));
             return both.different == 0 || both.endTogether();
@@ -170,10 +173,11 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
     return sameOwnedTexts(a, b, length);
 }
 
-/// -1, 0 or 1; both texts have a terminator at their size.
+/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size.
+template <std::uint64_t N>
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
     std::uint64_t const length = aSize < bSize ? aSize : bSize;
-    if (WordsBeginLow && length >= 4 && length <= 16) {
+    if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
         bool const one = length < 8;
         WordPair const head(one ? loadEnds(a, length) : loadWord<std::uint64_t>(a),
                             one ? loadEnds(b, length) : loadWord<std::uint64_t>(b));
@@ -186,7 +190,7 @@ inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::
         auto const right = static_cast<unsigned char>(b[length]);
         if (left != right || left == 0) return (left > right) - (left < right);
     }
-    int const order = compareOwnedTexts(a, aSize, b, bSize);
+    int const order = compareOwnedTexts(a, b, length);
     return (order > 0) - (order < 0);
 }
 

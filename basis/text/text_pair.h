@@ -1,0 +1,197 @@
+/// \file
+/// Two narrow texts side by side in vectors of 16 bytes, up to a common terminator. "May be read" says that all bytes of a
+/// length are readable, whatever lies among them.
+
+#ifndef BASIS_TEXT_TEXT_PAIR_H
+#define BASIS_TEXT_TEXT_PAIR_H
+
+#include "basis/text/vector_text.h"
+
+#include <algorithm>
+#include <bit>
+#include <cstdint>
+#include <cstring>
+
+namespace ZOR_Basis::detail {
+
+template <class Char>
+Char const* textOrEmpty(Char const* text) noexcept {
+    static constexpr Char Empty[1] = {};
+    return text != nullptr ? text : Empty;
+}
+
+#if ZB_VECTOR_TEXT
+
+ZB_COLD inline bool sameByRuntime(char const* a, char const* b, std::uint64_t length) noexcept {
+    return std::strncmp(textOrEmpty(a), textOrEmpty(b), length) == 0;
+}
+
+ZB_COLD inline int orderByRuntime(char const* a, char const* b) noexcept {
+    return std::strcmp(textOrEmpty(a), textOrEmpty(b));
+}
+
+inline int orderAt(char const* a, char const* b, std::uint64_t place) noexcept {
+    return static_cast<int>(static_cast<unsigned char>(a[place])) -
+           static_cast<int>(static_cast<unsigned char>(b[place]));
+}
+
+/// Of texts that are equal so far and have not ended.
+inline int orderAtTheEnd(char const* a, char const* b) noexcept {
+    if (*a == *b && *a != '\0') [[unlikely]]
+        return orderByRuntime(a, b);
+    return orderAt(a, b, 0);
+}
+
+/// Two texts side by side, a bit for each place: where they differ, and where they differ or end. The first bit of
+/// `decided` decides; places keep their order, though some may be there twice.
+template <class Bits>
+struct Places {
+    Bits different;
+    Bits decided;
+
+    bool same() const noexcept { return (decided & (0 - decided) & different) == 0; }
+    std::uint64_t first() const noexcept { return static_cast<std::uint64_t>(std::countr_zero(decided)); }
+};
+
+inline Places<std::uint32_t> placesOf(__m128i a, __m128i b) noexcept {
+    __m128i const equal = _mm_cmpeq_epi8(a, b);
+    return {static_cast<std::uint32_t>(_mm_movemask_epi8(equal)) ^ 0xFFFFU, zerosOf(_mm_min_epu8(equal, a))};
+}
+
+/// How much of two texts may be read before anything is known about their bytes.
+struct GivenPair {
+    static bool readable(char const* a, char const* b, std::uint64_t length) noexcept {
+        return inOnePage(a, length) && inOnePage(b, length);
+    }
+};
+struct OwnedPair {
+    static bool readable(char const*, char const*, std::uint64_t) noexcept { return true; }
+};
+
+// Both ends of a text in one vector. Where they do not fill it, the texts look as if they ended together.
+inline __m128i ends1To3(char const* text, std::uint64_t length) noexcept {
+    auto const byte = [text](std::uint64_t i) { return static_cast<int>(static_cast<unsigned char>(text[i])); };
+    return _mm_cvtsi32_si128(byte(0) | byte(length / 2) << 8 | byte(length - 1) << 16);
+}
+inline __m128i ends4To7(char const* text, std::uint64_t length) noexcept {
+    return _mm_unpacklo_epi32(_mm_cvtsi32_si128(static_cast<int>(load4(text))),
+                              _mm_cvtsi32_si128(static_cast<int>(load4(text + length - 4))));
+}
+inline __m128i ends8To16(char const* text, std::uint64_t length) noexcept {
+    return _mm_unpacklo_epi64(load8(text), load8(text + length - 8));
+}
+
+/// 1 to 16 bytes that may be read.
+ZB_INLINE bool sameShortTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    if (length >= 8) return placesOf(ends8To16(a, length), ends8To16(b, length)).same();
+    if (length >= 4) return placesOf(ends4To7(a, length), ends4To7(b, length)).same();
+    return placesOf(ends1To3(a, length), ends1To3(b, length)).same();
+}
+
+/// 4 to 16 bytes that may be read.
+ZB_INLINE int orderOfShortTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const front = length >= 8 ? 8 : 4; // places from the first end of the texts
+    auto places = front == 8 ? placesOf(ends8To16(a, length), ends8To16(b, length))
+                             : placesOf(ends4To7(a, length), ends4To7(b, length));
+    if (front == 4) places.decided &= 0xFFU;
+    if (places.decided == 0) return orderAtTheEnd(a + length, b + length);
+    std::uint64_t const first = places.first();
+    return orderAt(a, b, first < front ? first : length - 2 * front + first);
+}
+
+/// Of 32 places, a bit each.
+constexpr unsigned AllSame = 0xFFFFFFFF;
+
+/// Two texts of 17 to 64 bytes in four vectors, which overlap each other in shorter ones. They are compared as memory
+/// first. Only where they differ does it matter whether they ended before that; such texts are rare, and the runtime
+/// compares them.
+class MediumTexts {
+public:
+    ZB_INLINE MediumTexts(char const* a, char const* b, std::uint64_t length) noexcept
+        : second_(std::min<std::uint64_t>(16, length - 16)), last_(length - 16) {
+        compare(0, a, b, 0);
+        compare(1, a, b, second_);
+        compare(2, a, b, last_ - second_);
+        compare(3, a, b, last_);
+    }
+
+    ZB_INLINE bool same() const noexcept {
+        __m128i const all = _mm_and_si128(_mm_and_si128(same_[0], same_[1]), _mm_and_si128(same_[2], same_[3]));
+        return _mm_movemask_epi8(all) == 0xFFFF;
+    }
+    ZB_INLINE bool haveZero() const noexcept {
+        return zerosOf(_mm_min_epu8(_mm_min_epu8(bytes_[0], bytes_[1]), _mm_min_epu8(bytes_[2], bytes_[3]))) != 0;
+    }
+    /// The place of the first difference; where there is none, the length.
+    ZB_INLINE std::uint64_t difference() const noexcept {
+        unsigned const front = samePlaces(0) | samePlaces(1) << 16;
+        if (front != AllSame) {
+            auto const place = static_cast<std::uint64_t>(std::countr_one(front));
+            return place < 16 ? place : place - 16 + second_;
+        }
+        unsigned const back = samePlaces(2) | samePlaces(3) << 16;
+        auto const place = static_cast<std::uint64_t>(std::countr_one(back));
+        return place < 16 ? place + last_ - second_ : place - 16 + last_;
+    }
+
+private:
+    ZB_INLINE void compare(unsigned i, char const* a, char const* b, std::uint64_t place) noexcept {
+        bytes_[i] = load16(a + place);
+        same_[i] = _mm_cmpeq_epi8(bytes_[i], load16(b + place));
+    }
+    ZB_INLINE unsigned samePlaces(unsigned i) const noexcept {
+        return static_cast<unsigned>(_mm_movemask_epi8(same_[i]));
+    }
+
+    std::uint64_t second_;
+    std::uint64_t last_;
+    __m128i bytes_[4];
+    __m128i same_[4];
+};
+
+/// 17 to 64 bytes that may be read.
+ZB_INLINE bool sameMediumTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    MediumTexts const texts(a, b, length);
+    if (texts.same()) [[likely]]
+        return true;
+    return texts.haveZero() && sameByRuntime(a, b, length);
+}
+
+ZB_INLINE int orderOfMediumTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    MediumTexts const texts(a, b, length);
+    if (texts.haveZero()) [[unlikely]]
+        return orderByRuntime(a, b);
+    std::uint64_t const place = texts.difference();
+    return place == length ? orderAtTheEnd(a + length, b + length) : orderAt(a, b, place);
+}
+
+/// How many bytes can be passed over, as two texts are the same in them, may be read and do not end; at least 1 stays.
+template <class Text>
+std::uint64_t sameFront(char const* a, char const* b, std::uint64_t length) noexcept {
+    constexpr std::uint64_t Run = 64;
+    std::uint64_t done = 0;
+    for (; length - done > Run && Text::readable(a + done, b + done, Run); done += Run) {
+        MediumTexts const texts(a + done, b + done, Run);
+        if (!texts.same() || texts.haveZero()) break;
+    }
+    return done;
+}
+
+/// More than 64 bytes, on every processor.
+template <class Text>
+ZB_COLD bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const front = sameFront<Text>(a, b, length);
+    return sameByRuntime(a + front, b + front, length - front);
+}
+
+template <class Text>
+ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const front = sameFront<Text>(a, b, length);
+    return orderByRuntime(a + front, b + front);
+}
+
+#endif
+
+} // namespace ZOR_Basis::detail
+
+#endif

@@ -1,0 +1,75 @@
+// The ways in which processors without long vectors compare texts, on whatever processor this is.
+
+#include "basis/text/text_pair.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+using namespace ZOR_Basis::detail;
+
+namespace {
+
+constexpr std::size_t LongestMedium = 64;
+
+int sign(int order) { return (order > 0) - (order < 0); }
+
+bool same(std::string const& a, std::string const& b) {
+    return a.size() <= LongestMedium ? sameMediumTexts(a.data(), b.data(), a.size())
+                                     : sameLongTexts<OwnedPair>(a.data(), b.data(), a.size());
+}
+
+int order(std::string const& a, std::string const& b) {
+    return sign(a.size() <= LongestMedium ? orderOfMediumTexts(a.data(), b.data(), a.size())
+                                          : orderOfLongTexts<OwnedPair>(a.data(), b.data(), a.size()));
+}
+
+std::string makeText(std::size_t size) {
+    std::string text(size, '\0');
+    for (std::size_t i = 0; i < size; ++i) text[i] = static_cast<char>('a' + i % 26);
+    return text;
+}
+
+} // namespace
+
+TEST(CompareWays, find_a_difference_at_every_place) {
+    for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
+        std::string const a = makeText(size);
+        ASSERT_TRUE(same(a, a)) << size;
+        ASSERT_EQ(order(a, a), 0) << size;
+        for (std::size_t place = 0; place < size; ++place) {
+            std::string greater = a;
+            greater[place] = '\xE9';
+            ASSERT_FALSE(same(a, greater)) << size << ' ' << place;
+            ASSERT_EQ(order(a, greater), -1) << size << ' ' << place;
+            ASSERT_EQ(order(greater, a), 1) << size << ' ' << place;
+        }
+    }
+}
+
+TEST(CompareWays, look_no_further_than_a_common_zero) {
+    for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
+        for (std::size_t zero = 0; zero < size; ++zero) {
+            std::string a = makeText(size);
+            a[zero] = '\0';
+            std::string other = a;
+            for (std::size_t place = zero + 1; place < size; ++place) other[place] = '#';
+            ASSERT_TRUE(same(a, other)) << size << ' ' << zero;
+            ASSERT_EQ(order(a, other), 0) << size << ' ' << zero;
+            other[zero] = '#';
+            ASSERT_FALSE(same(a, other)) << size << ' ' << zero;
+            ASSERT_EQ(order(a, other), -1) << size << ' ' << zero;
+        }
+    }
+}
+
+TEST(CompareWays, go_on_behind_the_length_for_the_order_only) {
+    for (std::size_t size : {17U, 40U, 64U, 65U, 128U, 129U, 200U}) {
+        std::string const a = makeText(size) + "1";
+        std::string const b = makeText(size) + "2";
+        bool const isLong = size > LongestMedium;
+        EXPECT_TRUE((isLong ? sameLongTexts<OwnedPair> : sameMediumTexts)(a.data(), b.data(), size)) << size;
+        EXPECT_EQ(sign((isLong ? orderOfLongTexts<OwnedPair> : orderOfMediumTexts)(a.data(), b.data(), size)), -1)
+            << size;
+    }
+}

@@ -1,0 +1,36 @@
+/// \file
+/// Texts at the end of what can be read.
+
+#ifndef TESTS_TEXT_LAST_PAGE_POSIX_H
+#define TESTS_TEXT_LAST_PAGE_POSIX_H
+
+#include <sys/mman.h>
+
+#include <cstring>
+#include <string>
+
+/// Two pages, of which the second cannot be read.
+class LastPage {
+public:
+    LastPage() {
+        void* pages = mmap(nullptr, 2 * PageSize, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+        begin_ = static_cast<char*>(pages);
+        mprotect(begin_ + PageSize, PageSize, PROT_NONE);
+    }
+    ~LastPage() { munmap(begin_, 2 * PageSize); }
+    LastPage(LastPage const&) = delete;
+    LastPage& operator=(LastPage const&) = delete;
+
+    template <class Char>
+    Char const* textAtTheEnd(std::basic_string<Char> const& text) {
+        std::size_t const bytes = (text.size() + 1) * sizeof(Char);
+        return static_cast<Char const*>(std::memcpy(begin_ + PageSize - bytes, text.c_str(), bytes));
+    }
+
+private:
+    static constexpr std::size_t PageSize = 4096;
+
+    char* begin_;
+};
+
+#endif
