@@ -21,17 +21,9 @@ void copyUpToTerminator(Char* target, Char const* source, std::uint64_t length) 
 
 namespace {
 
-/// Whether a text goes on beyond the page in which it begins; then all of the next page may be read as well.
-ZB_COLD bool leavesItsPage(char const* text) noexcept {
-    std::uint64_t const inPage = PageSize - (reinterpret_cast<std::uintptr_t>(text) & (PageSize - 1));
-    return text != nullptr && textLengthUpTo(text, inPage) == inPage;
-}
-
 /// How much of a text may be read before anything is known about its bytes.
 struct Given {
-    static bool readable(char const* text, std::uint64_t length) noexcept {
-        return inOnePage(text, length) || leavesItsPage(text);
-    }
+    static bool readable(char const* text, std::uint64_t length) noexcept { return inOnePage(text, length); }
 };
 struct Owned {
     static bool readable(char const*, std::uint64_t) noexcept { return true; }
@@ -148,41 +140,59 @@ ZB_AVX2 ZB_INLINE bool copy129To256(char* target, char const* source, std::uint6
     return true;
 }
 
-/// More than 256 bytes: in runs of 128, then the rest.
+/// At most 256 bytes.
+ZB_AVX2 ZB_INLINE bool copyReadable(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length > 128) [[likely]]
+        return copy129To256(target, source, length);
+    if (length > 64) return copy65To128(target, source, length);
+    return copyShort(target, source, length);
+}
+
+/// At most 256 bytes, which may end in the page where they begin. Only a text that goes on can be read in the next one.
+ZB_AVX2 ZB_COLD bool copyAcrossPages(char* target, char const* source, std::uint64_t length) noexcept {
+    std::uint64_t const inPage = PageSize - (reinterpret_cast<std::uintptr_t>(source) & (PageSize - 1));
+    return source != nullptr && !overlap(target, source, length) && copyReadable(target, source, inPage) &&
+           copyReadable(target + inPage, source + inPage, length - inPage);
+}
+
+template <class Text>
+ZB_AVX2 ZB_INLINE bool copyPart(char* target, char const* source, std::uint64_t length) noexcept {
+    if (Text::readable(source, length)) [[likely]]
+        return copyReadable(target, source, length);
+    return copyAcrossPages(target, source, length);
+}
+
+/// In runs of 256 bytes, then the rest.
 template <class Text>
 ZB_AVX2 ZB_COLD void copyRuns(char* target, char const* source, std::uint64_t length) noexcept {
     if (overlap(target, source, length)) return copyOther(target, source, length);
-    for (; length > 256; target += 128, source += 128, length -= 128) {
-        if (!Text::readable(source, 128) || !copy65To128(target, source, 128)) return copyOther(target, source, length);
+    for (; length > 256; target += 256, source += 256, length -= 256) {
+        if (!copyPart<Text>(target, source, 256)) return copyOther(target, source, length);
     }
-    if (!Text::readable(source, length) || !copy129To256(target, source, length)) copyOther(target, source, length);
+    if (!copyPart<Text>(target, source, length)) copyOther(target, source, length);
 }
 
-/// More than 64 bytes.
+/// More than 64 bytes, or not all of them readable.
 template <class Text>
 ZB_AVX2 ZB_COLD void copyLong(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length <= 256 && Text::readable(source, length)) [[likely]] {
-        if (length > 128) [[likely]] {
-            if (copy129To256(target, source, length)) [[likely]]
-                return;
-        } else {
-            if (copy65To128(target, source, length)) [[likely]]
-                return;
-        }
-    }
-    if (length > 256) return copyRuns<Text>(target, source, length);
-    copyOther(target, source, length);
+    if (length > 256) [[unlikely]]
+        return copyRuns<Text>(target, source, length);
+    if (!copyPart<Text>(target, source, length)) [[unlikely]]
+        copyOther(target, source, length);
 }
 
 #endif
 
 template <class Text>
 ZB_INLINE void copyOf(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length <= 64 && Text::readable(source, length)) {
+        if (copyShort(target, source, length)) return;
+    } else {
 #if ZB_WIDE_VECTOR_TEXT
-    if (length > 64 && __builtin_cpu_supports("avx2")) [[likely]]
-        return copyLong<Text>(target, source, length);
+        if (__builtin_cpu_supports("avx2")) [[likely]]
+            return copyLong<Text>(target, source, length);
 #endif
-    if (length <= 64 && Text::readable(source, length) && copyShort(target, source, length)) return;
+    }
     copyOther(target, source, length);
 }
 

@@ -59,7 +59,8 @@ inline bool InlineText<Owner, Char, N>::copyIfTooLong(Owner& o, Char const* sour
 
 template <class Owner, class Char, std::uint64_t N>
 void InlineText<Owner, Char, N>::assignInNewBlock(Owner& o, Char const* source, std::uint64_t length) {
-    copyIfTooLong(o, source, length, length);
+    std::uint64_t const capacity = plus(length, 1);
+    adopt(o, makeBlock(o, source, capacity, length), capacity);
     o.size_ = length;
 }
 

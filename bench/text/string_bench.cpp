@@ -1,5 +1,5 @@
-// Strings beside std::string and llvm::SmallString. All sides get the same texts through pointers and lengths that the
-// compiler cannot see through.
+// Strings beside std::string and llvm::SmallString. All sides get the same texts, at the same place where strings are made
+// of them, through pointers and lengths that the compiler cannot see through.
 
 #include <zor_basis/text.h>
 
@@ -25,6 +25,17 @@ std::string makeText(std::size_t size) {
     benchmark::DoNotOptimize(text);
     return text;
 }
+
+constexpr std::size_t PageSize = 4096;
+
+/// A text that begins so many bytes before a page ends.
+char const* textBeforePageEnd(std::size_t size, std::size_t before) {
+    alignas(PageSize) static char room[2 * PageSize];
+    return static_cast<char const*>(std::memcpy(room + PageSize - before, makeText(size).c_str(), size + 1));
+}
+
+/// Where texts mostly lie: in one page, aligned as blocks of the heap are.
+constexpr std::size_t InOnePage = PageSize - 16;
 
 template <class String>
 struct Maker {
@@ -54,9 +65,8 @@ struct Maker<llvm::SmallString<N>> {
 #endif
 
 template <class String>
-void construct(benchmark::State& state, std::size_t size) {
-    std::string const text = makeText(size);
-    char const* source = text.data();
+void construct(benchmark::State& state, std::size_t size, std::size_t beforePageEnd) {
+    char const* source = textBeforePageEnd(size, beforePageEnd);
     std::size_t length = size;
     for (auto _ : state) {
         benchmark::DoNotOptimize(source);
@@ -129,8 +139,15 @@ void add(std::string const& row, char const* who, Arguments... arguments) {
 template <class String>
 void addMaking(std::string const& kind, char const* who, std::size_t size) {
     std::string const suffix = kind + "/" + std::to_string(size) + "B";
-    add("construct/" + suffix, who, [size](benchmark::State& state) { construct<String>(state, size); });
+    add("construct/" + suffix, who, [size](benchmark::State& state) { construct<String>(state, size, InOnePage); });
     add("copy/" + suffix, who, [size](benchmark::State& state) { copy<String>(state, size); });
+}
+
+/// The rare case: nothing may be read behind the page's end unless the text goes on.
+template <class String>
+void addMakingAcrossPages(char const* who, std::size_t size) {
+    add("construct-across-pages/" + std::to_string(size) + "B", who,
+        [size](benchmark::State& state) { construct<String>(state, size, size / 2); });
 }
 
 template <class String>
@@ -160,6 +177,11 @@ bool registerAll() {
         addMaking<llvm::SmallString<255>>("BufStr255", "llvm::SmallString", size);
 #endif
     }
+    addMakingAcrossPages<BufStr<255>>("ours", 200);
+    addMakingAcrossPages<std::string>("std::string", 200);
+#ifdef BENCH_HAS_LLVM
+    addMakingAcrossPages<llvm::SmallString<255>>("llvm::SmallString", 200);
+#endif
     for (std::size_t size : {5U, 12U, 14U, 400U}) {
         addMaking<BufStr<15>>("BufStr15", "ours", size);
         addMaking<std::string>("BufStr15", "std::string", size);

@@ -67,7 +67,7 @@ ZB_API WChar const* findText(WChar const* text, WChar const* wanted) noexcept;
 
 /// Copies the text before the terminator, at most `length` units, and pads with zeros to `length` units. Writes no
 /// terminator behind them. The source may overlap the target.
-ZB_API void copyText(char* target, char const* source, std::uint64_t length) noexcept;
+ZB_API_STRAIGHT void copyText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept;
 
 // The compiler cannot see that the wide moves are not reached for short texts.
