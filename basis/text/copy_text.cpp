@@ -2,6 +2,8 @@
 #include "zor_basis/text/char_ops.h"
 #include "zor_basis/text/word_ops.h"
 
+#include <algorithm>
+
 namespace ZOR_Basis::detail {
 
 namespace {
@@ -148,9 +150,10 @@ ZB_AVX2 ZB_INLINE bool copyReadable(char* target, char const* source, std::uint6
     return copyShort(target, source, length);
 }
 
-/// At most 256 bytes, which may end in the page where they begin. Only a text that goes on can be read in the next one.
+/// At most 256 bytes, of which some may lie in the next page. Only a text that goes on there can be read there.
 ZB_AVX2 ZB_COLD bool copyAcrossPages(char* target, char const* source, std::uint64_t length) noexcept {
-    std::uint64_t const inPage = PageSize - (reinterpret_cast<std::uintptr_t>(source) & (PageSize - 1));
+    std::uint64_t const inPage =
+        std::min(length, PageSize - (reinterpret_cast<std::uintptr_t>(source) & (PageSize - 1)));
     return source != nullptr && !overlap(target, source, length) && copyReadable(target, source, inPage) &&
            copyReadable(target + inPage, source + inPage, length - inPage);
 }

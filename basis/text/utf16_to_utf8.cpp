@@ -324,9 +324,10 @@ ZB_IN_CALLER Utf8Text takeRest(WChar const* text, std::uint64_t size, char* out,
     Progress progress{text, text + front, text + size, out + front, out + room, hasZero};
     while (progress.text != progress.end) {
         takeBlocks<Shuffle>(progress);
+        takeEnd<Shuffle>(progress);
+        if (progress.text == progress.end) break;
         takeThreeByteRun<Shuffle>(progress);
         takePairs(progress);
-        takeEnd<Shuffle>(progress);
         if (progress.text != progress.end && !takeCharacter(progress)) break;
     }
     return result(progress, out);

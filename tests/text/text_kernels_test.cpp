@@ -16,9 +16,10 @@ namespace {
 
 constexpr std::size_t PageSize = 4096;
 
-/// Room whose byte 0 begins a page.
+/// Room whose byte 0 begins a page. No byte is zero but the terminators of its texts.
 class Pages {
 public:
+    Pages() { std::memset(room_.get(), '~', 4 * PageSize); }
     char* at(std::size_t place) { return base() + place; }
     /// A terminated text of `size` different letters that ends `before` bytes before the second page.
     char* text(std::size_t size, std::size_t before) {
@@ -86,6 +87,24 @@ TEST(TextKernels, copies_across_a_page) {
             ASSERT_EQ(contentOf(BufStr<255>(source, size)), std::string(source, size)) << size << ' ' << before;
             ASSERT_EQ(contentOf(BufStr<255>(source, size + 40)), stopAndPad(source, size + 40))
                 << size << ' ' << before;
+        }
+    }
+}
+
+TEST(TextKernels, write_nothing_behind_the_text_wherever_the_source_lies) {
+    struct Guarded {
+        alignas(BufStr<255>) char string[sizeof(BufStr<255>)];
+        char behind[3 * PageSize];
+    };
+    auto const guarded = std::make_unique<Guarded>();
+    std::string const untouched(sizeof guarded->behind, '#');
+    Pages pages;
+    for (std::size_t size : {40U, 65U, 100U, 128U, 129U, 200U, 254U}) {
+        for (std::size_t before = 0; before <= size + 1; ++before) {
+            std::memcpy(guarded->behind, untouched.data(), untouched.size());
+            auto* made = new (guarded->string) BufStr<255>(pages.text(size, before), size);
+            ASSERT_EQ(std::string_view(guarded->behind, untouched.size()), untouched) << size << ' ' << before;
+            made->~BufStr();
         }
     }
 }
