@@ -154,7 +154,7 @@ ZB_AVX2 ZB_INLINE bool copyReadable(char* target, char const* source, std::uint6
 ZB_AVX2 ZB_COLD bool copyAcrossPages(char* target, char const* source, std::uint64_t length) noexcept {
     std::uint64_t const inPage =
         std::min(length, PageSize - (reinterpret_cast<std::uintptr_t>(source) & (PageSize - 1)));
-    return source != nullptr && !overlap(target, source, length) && copyReadable(target, source, inPage) &&
+    return !overlap(target, source, length) && copyReadable(target, source, inPage) &&
            copyReadable(target + inPage, source + inPage, length - inPage);
 }
 

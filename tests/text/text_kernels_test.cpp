@@ -121,6 +121,26 @@ TEST(TextKernels, copies_within_one_text_whatever_overlaps) {
     }
 }
 
+TEST(TextKernels, copy_to_either_side_of_an_overlapping_source) {
+    constexpr std::size_t Middle = 2000;
+    for (std::size_t size : {3U, 7U, 15U, 20U, 40U, 60U, 100U, 200U, 256U, 257U, 600U, 1500U}) {
+        for (std::size_t zero : {size / 2, size}) {
+            for (std::size_t distance = 1; distance < size; distance += 1 + distance / 3) {
+                for (bool down : {false, true}) {
+                    std::string text(3 * Middle, '~');
+                    char* source = text.data() + Middle;
+                    for (std::size_t i = 0; i < size; ++i) source[i] = static_cast<char>('a' + i % 23);
+                    source[zero] = '\0';
+                    std::string const expected = stopAndPad(source, size);
+                    char* target = down ? source - distance : source + distance;
+                    detail::copyText(target, source, size);
+                    ASSERT_EQ(std::string(target, size), expected) << size << ' ' << zero << ' ' << distance << down;
+                }
+            }
+        }
+    }
+}
+
 TEST(TextKernels, compare_every_length_with_a_difference_at_every_place) {
     Pages left;
     Pages right;
