@@ -78,14 +78,15 @@ public:
         assignOwned(o, source, length);
     }
     static void end(Owner& o) noexcept {
-        if (!isInline(o)) o.free();
+        if (!isInline(o)) [[unlikely]]
+            o.free();
     }
 
     /// Makes the text a copy of the source; a length of 0 is measured.
     static void assign(Owner& o, Char const* source, std::uint64_t length) {
-        if (isNothing(source)) {
+        if (isNothing(source)) [[unlikely]] {
             setSize(o, 0);
-        } else if (length != 0) {
+        } else if (length != 0) [[likely]] {
             assignSome<StopAtTerminator>(o, source, length);
         } else {
             assignSome<MoveMeasured>(o, source, textLength(source));
@@ -94,7 +95,7 @@ public:
 
     /// The same from a text that another string owns, so that all of its length may be read.
     static void assignOwned(Owner& o, Char const* source, std::uint64_t length) {
-        if (length == 0 || *source == Char()) {
+        if (length == 0 || *source == Char()) [[unlikely]] {
             assign(o, source, length);
         } else {
             assignSome<StopAtTerminatorOfOwned>(o, source, length);
@@ -161,7 +162,7 @@ private:
     template <class Copier>
     static void assignSome(Owner& o, Char const* source, std::uint64_t length) {
         // kept text-04: assigning asks for one unit more than it needs; capacities that callers see depend on it
-        if (length < N || length < capacity(o)) {
+        if (length < N || length < capacity(o)) [[likely]] {
             Char* target = text(o);
             o.size_ = length;
             Copier::copy(target, source, length);
