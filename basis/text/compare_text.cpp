@@ -42,7 +42,7 @@ ZB_INLINE bool same(char const* a, char const* b, std::uint64_t length) noexcept
     if (length > 64) [[unlikely]] {
 #if ZB_WIDE_VECTOR_TEXT
         if (__builtin_cpu_supports("avx512bw")) [[likely]]
-            return sameInWideRuns<Text>(a, b, length);
+            return askInWideRuns<Text, AreSame>(a, b, length);
 #endif
         return sameLongTexts<Text>(a, b, length);
     }
@@ -59,7 +59,7 @@ ZB_INLINE int order(char const* a, char const* b, std::uint64_t length) noexcept
     if (length > 64) [[unlikely]] {
 #if ZB_WIDE_VECTOR_TEXT
         if (__builtin_cpu_supports("avx512bw")) [[likely]]
-            return orderInWideRuns<Text>(a, b, length);
+            return askInWideRuns<Text, OrderOf>(a, b, length);
 #endif
         return orderOfLongTexts<Text>(a, b, length);
     }

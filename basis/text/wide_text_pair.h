@@ -7,7 +7,6 @@
 #include "basis/text/text_pair.h"
 
 #include <cstdint>
-#include <limits>
 
 #if ZB_WIDE_VECTOR_TEXT
 
@@ -31,64 +30,71 @@ ZB_AVX512 ZB_INLINE WidePlaces widePlaces(char const* a, char const* b, std::uin
     return placesOf(_mm512_maskz_loadu_epi8(bytes, a), _mm512_maskz_loadu_epi8(bytes, b));
 }
 
-/// Where two texts of more than 64 bytes are decided. They go in runs of 64, of which the last begins in the one before,
-/// with a branch for each: texts that differ mostly do so early.
-template <class Text>
+/// What two texts are asked: whether they are the same, or for their order. `at` answers where they differ or end.
+struct AreSame {
+    using Answer = bool;
+    static bool at(char const*, char const*, WidePlaces const& places) noexcept { return places.same(); }
+    static bool atTheEnd(char const*, char const*) noexcept { return true; }
+    static bool byRuntime(char const* a, char const* b, std::uint64_t length) noexcept {
+        return sameByRuntime(a, b, length);
+    }
+};
+struct OrderOf {
+    using Answer = int;
+    static int at(char const* a, char const* b, WidePlaces const& places) noexcept {
+        return orderAt(a, b, places.first());
+    }
+    static int atTheEnd(char const* a, char const* b) noexcept { return orderAtTheEnd(a, b); }
+    static int byRuntime(char const* a, char const* b, std::uint64_t) noexcept { return orderByRuntime(a, b); }
+};
+
+/// Two texts of more than 64 bytes. They go in runs of 64, of which the last begins in the one before, with a branch for
+/// each: texts that differ mostly do so early.
+template <class Text, class Question>
 class WideRuns {
 public:
-    // What the place is where they are the same and go on, or not all of them may be read.
-    static constexpr std::uint64_t Nowhere = std::numeric_limits<std::uint64_t>::max();
-    static constexpr std::uint64_t Unreadable = Nowhere - 1;
-
     ZB_AVX512 ZB_INLINE WideRuns(char const* a, char const* b, std::uint64_t length) noexcept
         : a_(a), b_(b), length_(length) {}
 
-    /// The first place where they differ or end.
-    ZB_AVX512 ZB_INLINE std::uint64_t decidedPlace() noexcept {
-        if (isDecidedAt(0)) return place_;
+    /// Whether there is an answer within the length.
+    ZB_AVX512 ZB_INLINE bool areDecided() noexcept {
+        if (isDecidedAt(0)) return true;
         if (length_ > 128) {
-            if (isDecidedAt(64)) return place_;
+            if (isDecidedAt(64)) return true;
             for (std::uint64_t done = 128; length_ - done > 128; done += 64) {
-                if (isDecidedAt(done)) return place_;
+                if (isDecidedAt(done)) return true;
             }
-            if (isDecidedAt(length_ - 128)) return place_;
+            if (isDecidedAt(length_ - 128)) return true;
         }
-        return isDecidedAt(length_ - 64) ? place_ : Nowhere;
+        return isDecidedAt(length_ - 64);
     }
+    typename Question::Answer answer() const noexcept { return answer_; }
 
 private:
     ZB_AVX512 ZB_INLINE bool isDecidedAt(std::uint64_t run) noexcept {
-        if (!Text::readable(a_ + run, b_ + run, 64)) {
-            place_ = Unreadable;
+        char const* const a = a_ + run;
+        char const* const b = b_ + run;
+        if (!Text::readable(a, b, 64)) {
+            answer_ = Question::byRuntime(a_, b_, length_);
             return true;
         }
-        WidePlaces const places = widePlaces(a_ + run, b_ + run);
+        WidePlaces const places = widePlaces(a, b);
         if (places.decided == 0) return false;
-        place_ = run + places.first();
+        answer_ = Question::at(a, b, places);
         return true;
     }
 
     char const* a_;
     char const* b_;
     std::uint64_t length_;
-    std::uint64_t place_ = Nowhere;
+    typename Question::Answer answer_ = {};
 };
 
 /// More than 64 bytes.
-template <class Text>
-ZB_AVX512 ZB_COLD bool sameInWideRuns(char const* a, char const* b, std::uint64_t length) noexcept {
-    std::uint64_t const place = WideRuns<Text>(a, b, length).decidedPlace();
-    if (place == WideRuns<Text>::Nowhere) return true;
-    if (place == WideRuns<Text>::Unreadable) return sameByRuntime(a, b, length);
-    return a[place] == b[place];
-}
-
-template <class Text>
-ZB_AVX512 ZB_COLD int orderInWideRuns(char const* a, char const* b, std::uint64_t length) noexcept {
-    std::uint64_t const place = WideRuns<Text>(a, b, length).decidedPlace();
-    if (place == WideRuns<Text>::Nowhere) return orderAtTheEnd(a + length, b + length);
-    if (place == WideRuns<Text>::Unreadable) return orderByRuntime(a, b);
-    return orderAt(a, b, place);
+template <class Text, class Question>
+ZB_AVX512 ZB_COLD typename Question::Answer askInWideRuns(char const* a, char const* b, std::uint64_t length) noexcept {
+    WideRuns<Text, Question> runs(a, b, length);
+    return runs.areDecided() ? runs.answer() : Question::atTheEnd(a + length, b + length);
 }
 
 /// 1 to 64 bytes that may be read.

@@ -173,22 +173,16 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
     return sameOwnedTexts(a, b, length);
 }
 
-/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size.
+/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size, so that the terminator of the shorter
+/// one decides at the latest.
 template <std::uint64_t N>
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
     std::uint64_t const length = aSize < bSize ? aSize : bSize;
-    if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
-        bool const one = length < 8;
-        WordPair const head(one ? loadEnds(a, length) : loadWord<std::uint64_t>(a),
-                            one ? loadEnds(b, length) : loadWord<std::uint64_t>(b));
+    if (N <= 16 && WordsBeginLow && length >= 4 && length < 16) {
+        if (length < 8) return WordPair(loadEnds(a, length + 1), loadEnds(b, length + 1)).order();
+        WordPair const head(loadWord<std::uint64_t>(a), loadWord<std::uint64_t>(b));
         if (head.decided != 0) return head.order();
-        if (!one) {
-            WordPair const tail(loadWord<std::uint64_t>(a + length - 8), loadWord<std::uint64_t>(b + length - 8));
-            if (tail.decided != 0) return tail.order();
-        }
-        auto const left = static_cast<unsigned char>(a[length]);
-        auto const right = static_cast<unsigned char>(b[length]);
-        if (left != right || left == 0) return (left > right) - (left < right);
+        return WordPair(loadWord<std::uint64_t>(a + length - 7), loadWord<std::uint64_t>(b + length - 7)).order();
     }
     int const order = compareOwnedTexts(a, b, length);
     return (order > 0) - (order < 0);
