@@ -46,6 +46,9 @@ std::uint64_t FileStdDir::write(void const* buffer, std::uint64_t n) {
 
 bool FileStdDir::flush() { return ::fsync(descriptor_) == 0; }
 
-std::int64_t FileStdDir::seek(int origin, int offset) { return ::lseek(descriptor_, offset, origin); }
+std::int64_t FileStdDir::seek(int origin, int offset) {
+    // The system knows further origins, which look for data and for holes.
+    return origin <= SEEK_END ? ::lseek(descriptor_, offset, origin) : -1;
+}
 
 } // namespace ZOR_Basis

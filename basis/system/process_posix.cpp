@@ -128,6 +128,19 @@ bool start(char const* application, char const* commandLine, pid_t& child) {
                                   : settings.start(line.words()[0], true, line.words(), child);
 }
 
+/// \param take  takes what is left of the child then; else that stays for the application, which made it
+bool awaitEnd(pid_t process, bool take) {
+    OpenProcess const open(process);
+    if (!open.isOpen()) {
+        // Children can be awaited without a descriptor.
+        siginfo_t end{};
+        return errno == ENOSYS && takeEnd(P_PID, process, take ? 0 : WNOWAIT, end);
+    }
+    if (!open.hasEnded(WITHOUT_LIMIT)) return false;
+    if (take) open.takeLeftovers();
+    return true;
+}
+
 } // namespace
 
 bool ProcessImpl::create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode) {
@@ -147,16 +160,11 @@ bool ProcessImpl::create(char const* application, unsigned long* processId, char
 bool ProcessImpl::wait(unsigned long processId) {
     pid_t const process = processOf(processId);
     if (process == 0) return false;
-    unawaited.remove(process);
-    OpenProcess const open(process);
-    if (!open.isOpen()) {
-        // Children can be awaited without a descriptor.
-        siginfo_t end{};
-        return errno == ENOSYS && takeEnd(P_PID, process, 0, end);
-    }
-    if (!open.hasEnded(WITHOUT_LIMIT)) return false;
-    open.takeLeftovers();
-    return true;
+    bool const isOurs = unawaited.remove(process);
+    bool const hasEnded = awaitEnd(process, isOurs);
+    bool const isGone = errno == ESRCH || errno == ECHILD;
+    if (isOurs && !hasEnded && !isGone) unawaited.add(process);
+    return hasEnded;
 }
 
 bool ProcessImpl::terminate(unsigned long processId) {

@@ -27,14 +27,15 @@ public:
         if (size_ < MOST) children_[size_++] = child;
     }
 
-    /// From now on the child is the caller's to await.
-    void remove(pid_t child) {
+    /// From now on the child is the caller's to await. \return false: it is none of these
+    bool remove(pid_t child) {
         std::lock_guard const lock(mutex_);
         auto* const end = children_.data() + size_;
         auto* const found = std::find(children_.data(), end, child);
-        if (found == end) return;
+        if (found == end) return false;
         std::copy(found + 1, end, found);
         --size_;
+        return true;
     }
 
 private:

@@ -56,6 +56,7 @@ void Blob::copy(std::uint64_t n, char const* bytes) {
         if (block == nullptr) return;
         // The source may lie in the old block.
         copyBytes(block, bytes, n);
+        size_ = 0;
         replaceBlock(block, n);
     }
     size_ = n;
@@ -81,8 +82,8 @@ void Blob::alloc(std::uint64_t n, bool keep) {
     if (capacity_ >= n) return;
     char* const block = makeBlock(n, keep ? size_ : 0);
     if (block == nullptr) return;
-    replaceBlock(block, n);
     if (!keep) size_ = 0;
+    replaceBlock(block, n);
 }
 
 bool Blob::operator==(Blob const& other) const {

@@ -5,18 +5,28 @@
 #include "basis/text/charset_posix.h"
 #include "basis/text/utf.h"
 
+#include <cstring>
+
 namespace ZOR_Basis::ConvertImpl {
 namespace {
 
 bool isUtf8(Convert::Encoding encoding) { return encoding == Convert::ENC_UTF8 || Charset::isUtf8(Charset::local()); }
 
+/// Grows the output for a text that may still turn out to be invalid; the output keeps its capacity then.
+std::uint64_t utf8ToGrownWide(char const* text, std::uint64_t size, WBStr& out) {
+    WBStr whole;
+    whole.extendBuf(Utf::utf16Length(text, size) + 1);
+    std::uint64_t const written = Utf::toUtf16(text, size, whole.getBuf(), whole.sizeBuf());
+    if (written == Utf::INVALID) return written;
+    out.extendBuf(written + 1);
+    std::memcpy(out.getBuf(), whole.wstr(), written * sizeof(WChar));
+    return written;
+}
+
 bool utf8ToWide(char const* text, std::uint64_t size, WBStr& out) {
     // Most results fit into what is there, and nothing is counted; one unit of the capacity stays free.
     std::uint64_t written = Utf::toUtf16(text, size, out.getBuf(), out.sizeBuf() - 1);
-    if (written == Utf::NO_ROOM) {
-        out.extendBuf(Utf::utf16Length(text, size) + 1);
-        written = Utf::toUtf16(text, size, out.getBuf(), out.sizeBuf());
-    }
+    if (written == Utf::NO_ROOM) written = utf8ToGrownWide(text, size, out);
     out.setSize(written != Utf::INVALID ? written : 0);
     return written != Utf::INVALID;
 }

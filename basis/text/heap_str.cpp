@@ -36,19 +36,19 @@ HeapStr& HeapStr::set(char const* text, std::uint64_t n) {
     return *this;
 }
 
-void HeapStr::clear() noexcept {
+HeapStr& HeapStr::clear() noexcept {
     if (hasBlock()) free();
     capacity_ = 0;
     setEmpty();
+    return *this;
 }
 
-void HeapStr::cut() noexcept {
-    if (size_ > 0) cut(size_ - 1);
-}
+HeapStr& HeapStr::cut() noexcept { return size_ > 0 ? cut(size_ - 1) : *this; }
 
-void HeapStr::cut(std::uint64_t n) noexcept {
+HeapStr& HeapStr::cut(std::uint64_t n) noexcept {
     if (n < size_) size_ = n;
     if (text_ != StrEmpty) buffer()[size_] = '\0';
+    return *this;
 }
 
 HeapStr& HeapStr::toLower() noexcept {
@@ -79,7 +79,10 @@ void HeapStr::copy(char const* text, std::uint64_t n) {
 }
 
 void HeapStr::reassign(char const* text, std::uint64_t n) {
-    if (n == 0 || text == nullptr) return clear();
+    if (n == 0 || text == nullptr) {
+        clear();
+        return;
+    }
     if (hasBlock() && capacity_ == n) {
         detail::copyText(buffer(), text, n);
         size_ = n;

@@ -127,4 +127,11 @@ ZB_EXTERN_C ZB_API void zbTimerMgrStop(zbTimerMgr* manager, zbPileTimer* timer);
 ZB_EXTERN_C ZB_API void zbTimerMgrSuspend(zbTimerMgr* manager, zbPileTimer* timer);
 ZB_EXTERN_C ZB_API void zbTimerMgrResume(zbTimerMgr* manager, zbPileTimer* timer);
 
+/* Further plain functions take paths and visitors: `zbFindFile`, `zbCheckRemoveFileDir`, `zbLinkOrCopy`. */
+#ifdef __cplusplus
+#include "zor_basis/walk/file_delete_visitor.h"
+#include "zor_basis/walk/find_file_visit.h"
+#include "zor_basis/walk/link_or_copy.h"
+#endif
+
 #endif

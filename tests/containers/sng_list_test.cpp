@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <iterator>
 #include <new>
 #include <string>
 #include <vector>
@@ -84,6 +85,18 @@ TEST(SngList, breathes) {
     EXPECT_EQ(list.last()->value.key, 3);
     EXPECT_EQ(list.begin()->key, 1);
     EXPECT_EQ(list.begin().unit(), list.first());
+}
+
+TEST(SngList, is_walked_by_the_standard_algorithms) {
+    SngList<int> list;
+    for (int value : {3, 1, 2}) list.insertBack(value);
+    EXPECT_EQ(std::distance(list.begin(), list.end()), 3);
+    EXPECT_EQ(std::vector<int>(list.begin(), list.end()), (std::vector<int>{3, 1, 2}));
+    auto place = std::find(list.begin(), list.end(), 1);
+    EXPECT_EQ(*place++, 1);
+    EXPECT_EQ(*place, 2);
+    list.remove(place);
+    EXPECT_EQ(std::vector<int>(list.begin(), list.end()), (std::vector<int>{3, 1}));
 }
 
 TEST(SngList, deletes_its_units) {

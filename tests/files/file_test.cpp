@@ -125,6 +125,7 @@ TYPED_TEST(FileTest, Kept_file_02_gives_three_kinds_of_results_of_seeking) {
     EXPECT_EQ(file->seek(2, -1), TypeParam::position(7));
     EXPECT_EQ(this->read(file, 5), "h");
     EXPECT_EQ(file->seek(0, -1), TypeParam::badSeek);
+    for (int origin : {3, 4, 5}) EXPECT_EQ(file->seek(origin, 0), TypeParam::badSeek) << "there are three origins";
     EXPECT_EQ(file->seek(0, 0), 0);
     EXPECT_EQ(this->read(file, 1), "a");
 }

@@ -40,6 +40,11 @@ struct RunCommand : testing::Test {
 /// Takes the place of the platform's, so that no test waits.
 extern "C" void xos_TaskSleep(std::uint32_t ms) { rests.push_back(ms); }
 
+TEST(Flat, has_the_plain_functions_of_walks_for_cplusplus) {
+    ZOR_Basis::FPath found;
+    EXPECT_FALSE(zbFindFile("no such folder", "*", ZOR_Basis::LOOK_FILES, found, true, true));
+}
+
 TEST_F(RunCommand, breathes) {
     Scratch const scratch;
     EXPECT_TRUE(ZB_runCommand("echo x>made", scratch.path().c_str(), false));

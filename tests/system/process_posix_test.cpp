@@ -17,6 +17,7 @@
 #include <fcntl.h>
 #include <string>
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <thread>
 #include <unistd.h>
 #include <vector>
@@ -63,7 +64,7 @@ using ProcessPosixFaults = ProcessPosix;
 
 /* Calls that fail */
 
-int noDescriptor(pid_t) { return errno = ESRCH, -1; }
+int noDescriptor(pid_t) { return errno = EMFILE, -1; }
 int noSuchCall(pid_t) { return errno = ENOSYS, -1; }
 int noPoll(pollfd*, nfds_t, int) { return errno = ENOMEM, -1; }
 int noSignal(int, int) { return errno = EPERM, -1; }
@@ -223,6 +224,15 @@ TEST_F(ProcessPosix, leaves_children_of_others_alone) {
     EXPECT_TRUE(Process::Wait(other));
 }
 
+TEST_F(ProcessPosix, leaves_the_exit_status_of_the_applications_own_child) {
+    pid_t const child = fork();
+    if (child == 0) _exit(7);
+    EXPECT_TRUE(Process::Wait(static_cast<unsigned long>(child)));
+    int status = 0;
+    EXPECT_EQ(waitpid(child, &status, WNOHANG), child);
+    EXPECT_EQ(WEXITSTATUS(status), 7);
+}
+
 TEST_F(ProcessPosix, has_no_exit_code_where_children_are_ignored) {
     auto* const before = std::signal(SIGCHLD, SIG_IGN);
     EXPECT_EQ(shell("exit 3"), 0) << "nobody can know";
@@ -259,6 +269,7 @@ TEST_F(ProcessPosixFaults, a_process_that_cannot_be_opened) {
     EXPECT_FALSE(Process::Terminate(id));
     processCalls = real;
     EXPECT_TRUE(Process::Wait(id));
+    EXPECT_FALSE(hasChildren()) << "it was remembered";
 }
 
 TEST_F(ProcessPosixFaults, a_wait_that_fails_leaves_nothing_open) {

@@ -63,6 +63,28 @@ TEST(Blob, has_a_virtual_destructor_and_no_moves_of_its_own) {
     EXPECT_EQ(target.size(), 3u);
 }
 
+TEST(Blob, is_empty_while_a_block_is_released_whose_bytes_do_not_stay) {
+    struct Watching : Blob {
+        void freeBuf() override {
+            sizeAtRelease = size();
+            Blob::freeBuf();
+        }
+        std::uint64_t sizeAtRelease = 99;
+    };
+    Watching blob;
+    blob.copy(3, "abc");
+    blob.copy(5, "abcde");
+    EXPECT_EQ(blob.sizeAtRelease, 0U);
+    blob.alloc(8, true);
+    EXPECT_EQ(blob.sizeAtRelease, 5U) << "these bytes stay";
+    blob.alloc(9, false);
+    EXPECT_EQ(blob.sizeAtRelease, 0U);
+    blob.copy(2, "xy");
+    MemoryFile file(std::string("\x0A\0\0\0", 4) + "0123456789");
+    EXPECT_TRUE(blob.read(&file));
+    EXPECT_EQ(blob.sizeAtRelease, 0U);
+}
+
 TYPED_TEST(BlobTest, is_copied_with_blocks_of_their_own_of_exactly_the_size) {
     TypeParam blob = this->make("abcdef");
     blob.alloc(100, true);

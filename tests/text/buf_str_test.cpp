@@ -1,4 +1,4 @@
-#include "zor_basis/text/buf_str.h"
+#include "zor_basis/text.h"
 
 #include "tests/support/table.h"
 #include "tests/text/string_kinds.h"
@@ -73,6 +73,31 @@ TYPED_TEST(BufStrOf, appends_bytes_of_every_integer_type) {
     EXPECT_EQ(s, "abcdef");
     s.add('\xE9');
     EXPECT_EQ(s.last(), '\xE9');
+}
+
+TYPED_TEST(BufStrOf, takes_enumerators_as_their_numbers) {
+    enum Letter { LETTER_A = 'A' };
+    TypeParam s;
+    s.add(LETTER_A) += LETTER_A;
+    s << LETTER_A;
+    EXPECT_STREQ(s, "AA65");
+}
+
+TYPED_TEST(BufStrOf, chains_what_cuts_and_clears) {
+    TypeParam s("abcdef");
+    s.cut().cut(2).add("x").extendBuf(40).resize().add("y");
+    EXPECT_STREQ(s, "abxy");
+    EXPECT_STREQ(s.clear().add("z"), "z");
+    HeapStr h("abc");
+    EXPECT_STREQ(h.cut().cut(1), "a");
+    EXPECT_STREQ(h.clear().set("x"), "x");
+    WBStr w(ZB_W("abcdef"));
+    w.cut().cut(2).add(ZB_W("x")).extendBuf(40).resize().setSize(2).add(ZB_W("y"));
+    EXPECT_TRUE(w == ZB_W("aby"));
+    EXPECT_TRUE(w.clear().add(ZB_W("z")) == ZB_W("z"));
+    WFxStr view;
+    EXPECT_EQ(view.set(ZB_W("abc")).size(), 3U);
+    EXPECT_TRUE(view.clear().empty());
 }
 
 TYPED_TEST(BufStrOf, streams_texts_and_numbers) {

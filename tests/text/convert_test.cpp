@@ -310,6 +310,18 @@ TEST(Convert, grows_its_output_by_exactly_what_is_needed) {
     EXPECT_EQ(grown.sizeBuf(), 751u);
 }
 
+TEST(Convert, leaves_its_output_as_small_as_it_was_where_a_long_text_is_invalid) {
+    for (std::size_t size : {200U, 254U, 255U, 300U, 5000U}) {
+        WBStr out;
+        EXPECT_FALSE(Convert::Utf8ToWide(std::string(size, 'a') + "\xC3", out)) << size;
+        EXPECT_EQ(out.size(), 0U) << size;
+        EXPECT_EQ(out.sizeBuf(), 255U) << size;
+        out.extendBuf(280);
+        EXPECT_FALSE(Convert::Utf8ToWide(std::string(size, 'a') + "\xC3", out)) << size;
+        EXPECT_EQ(out.sizeBuf(), 280U) << size;
+    }
+}
+
 TEST(Convert, keeps_a_large_enough_buffer) {
     WBStr wide = filled<WBStr>();
     std::uint64_t const capacity = wide.sizeBuf();

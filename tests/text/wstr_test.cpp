@@ -101,6 +101,15 @@ TEST(WStr, the_right_hand_size_decides_how_equality_compares) {
     EXPECT_TRUE(WStr(same, 1) == WStr(same, 3));
 }
 
+TEST(WStr, is_compared_from_the_other_side_too) {
+    WChar const text[] = ZB_W("abcdef");
+    WStr const part(text, 3);
+    EXPECT_TRUE(ZB_W("abc") == part) << "the size of the right-hand side decides";
+    EXPECT_FALSE(ZB_W("abc") != part);
+    EXPECT_TRUE(ZB_W("abd") != part);
+    EXPECT_FALSE(ZB_W("abcdef") == part);
+}
+
 TEST(WStr, equality_reads_nothing_behind_a_terminator) {
     ExactText const a(WText(2, WChar('a')));
     ExactText const b(WText(2, WChar('a')));

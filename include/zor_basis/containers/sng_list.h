@@ -15,8 +15,10 @@
 #define ZOR_BASIS_CONTAINERS_SNG_LIST_H
 
 #include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <cstdlib>
+#include <iterator>
 #include <utility>
 
 namespace ZOR_Basis {
@@ -31,6 +33,12 @@ public:
 
     class iterator {
     public:
+        using iterator_category = std::forward_iterator_tag;
+        using value_type = T;
+        using difference_type = std::ptrdiff_t;
+        using pointer = T*;
+        using reference = T&;
+
         iterator() = default;
         T& operator*() const { return current_->value; }
         T* operator->() const { return &current_->value; }
@@ -40,6 +48,11 @@ public:
             previous_ = current_;
             current_ = current_->next;
             return *this;
+        }
+        iterator operator++(int) {
+            iterator const before = *this;
+            ++*this;
+            return before;
         }
         bool operator==(iterator const& other) const { return current_ == other.current_; }
         bool operator!=(iterator const& other) const { return current_ != other.current_; }

@@ -20,6 +20,11 @@
 
 namespace ZOR_Basis {
 
+#if defined(__GNUC__)
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor" // as for a WBStr
+#endif
+
 class ZB_API WcPath : public WBStr {
 public:
     static constexpr WChar BACK_SLASH = ZB_W('\\');
@@ -108,6 +113,10 @@ public:
     void split(WcPath& dir, WcPath& name) const { split(text_, dir, name, size_); }
     static void split(WChar const* text, WcPath& dir, WcPath& name, std::uint64_t len = 0);
 };
+
+#if defined(__GNUC__)
+#pragma GCC diagnostic pop
+#endif
 
 static_assert(sizeof(WcPath) == sizeof(WBStr));
 

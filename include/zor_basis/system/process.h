@@ -38,7 +38,8 @@ public:
     /// \return whether the program was started; false with neither a program nor a command line
     static bool Create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode);
 
-    /// Waits without limit until a process has ended, a child or any other.
+    /// Waits without limit until a process has ended, a child or any other. On Linux the exit status of a child that the
+    /// application made without `Create` stays for the application to take.
     /// \return false where there is no such process, or none that may be awaited
     static bool Wait(unsigned long processId);
 

@@ -36,8 +36,8 @@ public:
 
     /// The root folder: the one that the platform layer is configured with, else the current folder at the first call.
     /// One slash at its end is taken away, and then a last component "system", so that the parent of that is the root.
-    /// \kept root-01: a current folder of 512 bytes or more gives the empty path at the first call; later ones, which
-    ///     know how much room it needs, find it
+    /// \kept root-01: a current folder of 512 bytes or more gives the empty path at the first call. Each call that fails
+    ///     doubles the room for the next one: 512 to 1,023 bytes are found by the second call, up to 2,047 by the third
     /// \return a path that lives as long as the process and never changes; the empty path while there is none. On Linux
     ///         a root of "/" is the empty path too; what is made from it is absolute nonetheless ("/tmp", "/timer")
     /// \cost the system is asked once, or, while the root is empty, at each call

@@ -88,7 +88,7 @@ public:
     }
     /// Appends one byte.
     /// \kept text-09: the byte 0 appends nothing
-    template <std::integral C>
+    template <detail::Index C>
     BufStr& add(C c) {
         Text::append(*this, static_cast<char>(c));
         return *this;
@@ -96,14 +96,14 @@ public:
     BufStr& operator+=(std::string const& text) { return add(text); }
     BufStr& operator+=(Str const& text) { return add(text); }
     BufStr& operator+=(char const* text) { return add(text); }
-    template <std::integral C>
+    template <detail::Index C>
     BufStr& operator+=(C c) {
         return add(c);
     }
     BufStr& operator<<(Str const& text) { return add(text); }
     BufStr& operator<<(char const* text) { return add(text); }
     /// Appends the decimal digits of a number, taken as an `int`, characters included.
-    template <std::integral I>
+    template <detail::Index I>
     BufStr& operator<<(I number) {
         return addNumber(static_cast<int>(number));
     }
@@ -125,17 +125,32 @@ public:
     /// The capacity: N inside the object, else the block's; the terminator is not counted.
     std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
     /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
-    void extendBuf(std::uint64_t n) { CopyIfTooLong(text_, n, size_); }
+    BufStr& extendBuf(std::uint64_t n) {
+        CopyIfTooLong(text_, n, size_);
+        return *this;
+    }
     /// Measures the text again after direct writes, at most n bytes of it; n = 0 sets no bound.
     /// \kept text-10: first stores a terminator at the index of the capacity, so that the last byte of a buffer filled to
     ///       the brim is lost rather than the end of the text
-    void resize(std::uint64_t n = 0) noexcept { Text::resize(*this, n); }
+    BufStr& resize(std::uint64_t n = 0) noexcept {
+        Text::resize(*this, n);
+        return *this;
+    }
     /// Empties the text; a block is kept.
-    void clear() noexcept { Text::setSize(*this, 0); }
+    BufStr& clear() noexcept {
+        Text::setSize(*this, 0);
+        return *this;
+    }
     /// Takes away the last byte, if there is one.
-    void cut() noexcept { Text::cutLast(*this); }
+    BufStr& cut() noexcept {
+        Text::cutLast(*this);
+        return *this;
+    }
     /// Cuts the text to n bytes; a shorter text is only terminated again at its size.
-    void cut(std::uint64_t n) noexcept { Text::cutTo(*this, n); }
+    BufStr& cut(std::uint64_t n) noexcept {
+        Text::cutTo(*this, n);
+        return *this;
+    }
 
     /// Inserts a text; behind the size nothing happens. What follows moves byte for byte, inner zeros included.
     BufStr& insert(std::uint64_t pos, char const* text, std::uint64_t n = 0) {

@@ -44,11 +44,11 @@ public:
     /// For n = 0 and for null the block is released.
     HeapStr& set(char const* text, std::uint64_t n);
     /// Releases the block and views the shared empty text.
-    void clear() noexcept;
+    HeapStr& clear() noexcept;
     /// Takes away the last byte, if there is one; the block stays as it is.
-    void cut() noexcept;
+    HeapStr& cut() noexcept;
     /// Cuts the text to n bytes; a shorter text is only terminated again at its size. The block stays as it is.
-    void cut(std::uint64_t n) noexcept;
+    HeapStr& cut(std::uint64_t n) noexcept;
     /// Changes all bytes by the runtime's `tolower` and `toupper`.
     HeapStr& toLower() noexcept;
     HeapStr& toUpper() noexcept;

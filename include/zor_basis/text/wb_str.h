@@ -65,7 +65,7 @@ public:
     WBStr& operator+=(WStr const& text) { return add(text); }
     WBStr& operator+=(WChar const* text) { return add(text); }
     /// Appends one code unit; 0 appends nothing.
-    template <std::integral C>
+    template <detail::Index C>
     WBStr& operator+=(C c) {
         Text::append(*this, static_cast<WChar>(c));
         return *this;
@@ -104,19 +104,37 @@ public:
     /// The capacity in code units: 255 inside the object, else the block's; the terminator is not counted.
     std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
     /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
-    void extendBuf(std::uint64_t n) { CopyIfTooLong(text_, n, size_); }
+    WBStr& extendBuf(std::uint64_t n) {
+        CopyIfTooLong(text_, n, size_);
+        return *this;
+    }
     /// Measures the text again after direct writes, then cuts it to n units; n = 0 sets no bound. A terminator is first
     /// stored at the index of the capacity, as text-10 has it.
-    void resize(std::uint64_t n = 0) noexcept { Text::resize(*this, n); }
+    WBStr& resize(std::uint64_t n = 0) noexcept {
+        Text::resize(*this, n);
+        return *this;
+    }
     /// The size becomes n, and a terminator is stored there.
     /// \pre n is at most the capacity; nothing is checked
-    void setSize(std::uint64_t n) noexcept { Text::setSize(*this, n); }
+    WBStr& setSize(std::uint64_t n) noexcept {
+        Text::setSize(*this, n);
+        return *this;
+    }
     /// Empties the text; a block is kept.
-    void clear() noexcept { Text::setSize(*this, 0); }
+    WBStr& clear() noexcept {
+        Text::setSize(*this, 0);
+        return *this;
+    }
     /// Takes away the last unit, if there is one.
-    void cut() noexcept { Text::cutLast(*this); }
+    WBStr& cut() noexcept {
+        Text::cutLast(*this);
+        return *this;
+    }
     /// Cuts the text to n units; a shorter text is only terminated again at its size.
-    void cut(std::uint64_t n) noexcept { Text::cutTo(*this, n); }
+    WBStr& cut(std::uint64_t n) noexcept {
+        Text::cutTo(*this, n);
+        return *this;
+    }
 
     /// Changes all units up to the terminator by the runtime's `towlower` and `towupper`.
     WBStr& toLower() noexcept {

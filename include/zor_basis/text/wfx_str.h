@@ -21,14 +21,15 @@ public:
 
     /// Views a zero-terminated text and measures it.
     /// \pre not null
-    void set(WChar const* text) noexcept { set(text, Len(text)); }
+    WFxStr& set(WChar const* text) noexcept { return set(text, Len(text)); }
     /// Stores both words as given; nothing is measured.
-    void set(WChar const* text, std::uint64_t n) noexcept {
+    WFxStr& set(WChar const* text, std::uint64_t n) noexcept {
         text_ = text;
         size_ = n;
+        return *this;
     }
     /// Views the shared empty text.
-    void clear() noexcept { set(StrEmpty, 0); }
+    WFxStr& clear() noexcept { return set(StrEmpty, 0); }
     /// Whether this is the very text that is viewed.
     /// \kept wide-02: addresses are compared, never texts
     bool equal(WChar const* text) const noexcept {

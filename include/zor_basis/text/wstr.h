@@ -66,6 +66,9 @@ public:
     bool operator==(WChar const* other) const noexcept { return eq(other, 0); }
     bool operator!=(WStr const& other) const noexcept { return !(*this == other); }
     bool operator!=(WChar const* other) const noexcept { return !(*this == other); }
+    // The same from the other side; here the `WStr` is the right-hand operand, whose size decides.
+    friend bool operator==(WChar const* a, WStr const& b) noexcept { return WStr(a) == b; }
+    friend bool operator!=(WChar const* a, WStr const& b) noexcept { return !(a == b); }
 
     /// -1 where the argument's text sorts before this one, 1 where behind, by unsigned code units up to the terminators.
     /// \kept wide-01: this is the reverse of `Str::compare`, and `<` and `>` follow it: `a < b` holds where b's text

@@ -113,6 +113,35 @@ public:
     static void stop(TimerMgr* manager, std::uint64_t id);
     static void suspend(TimerMgr* manager, std::uint64_t id);
     static void resume(TimerMgr* manager, std::uint64_t id);
+    template <detail::Index I>
+    static void start(TimerMgr* manager, I id) {
+        start(manager, static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    static void stop(TimerMgr* manager, I id) {
+        stop(manager, static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    static void suspend(TimerMgr* manager, I id) {
+        suspend(manager, static_cast<std::uint64_t>(id));
+    }
+    template <detail::Index I>
+    static void resume(TimerMgr* manager, I id) {
+        resume(manager, static_cast<std::uint64_t>(id));
+    }
+    /// The same of a timer given directly; both may be null.
+    static void start(TimerMgr* manager, PileTimer* timer) {
+        if (manager != nullptr) manager->start(timer);
+    }
+    static void stop(TimerMgr* manager, PileTimer* timer) {
+        if (manager != nullptr) manager->stop(timer);
+    }
+    static void suspend(TimerMgr* manager, PileTimer* timer) {
+        if (manager != nullptr) manager->suspend(timer);
+    }
+    static void resume(TimerMgr* manager, PileTimer* timer) {
+        if (manager != nullptr) manager->resume(timer);
+    }
 
     /// `resetTimers`, unless the manager is inactive.
     void reset(bool print);
