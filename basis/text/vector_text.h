@@ -27,8 +27,8 @@
 #endif
 #endif
 
-// Vectors of more than 16 bytes never lie on the stack in optimised code, which mingw would not align for them.
-#if ZB_VECTOR_TEXT && defined(__GNUC__) && (defined(__OPTIMIZE__) || !defined(_WIN32))
+// Without optimisation the longer vectors would lie on the stack, which not every compiler aligns for them.
+#if ZB_VECTOR_TEXT && defined(__GNUC__) && defined(__OPTIMIZE__)
 #define ZB_WIDE_VECTOR_TEXT 1
 #include <immintrin.h>
 #else
