@@ -70,19 +70,6 @@ void TimerMgr::resume(PileTimer* timer) {
     if (active()) PileTimer::resume(timer);
 }
 
-void TimerMgr::start(TimerMgr* manager, std::uint64_t id) {
-    if (manager != nullptr) manager->start(id);
-}
-void TimerMgr::stop(TimerMgr* manager, std::uint64_t id) {
-    if (manager != nullptr) manager->stop(id);
-}
-void TimerMgr::suspend(TimerMgr* manager, std::uint64_t id) {
-    if (manager != nullptr) manager->suspend(id);
-}
-void TimerMgr::resume(TimerMgr* manager, std::uint64_t id) {
-    if (manager != nullptr) manager->resume(id);
-}
-
 void TimerMgr::reset(bool print) {
     if (active()) resetTimers(print);
 }

@@ -108,38 +108,21 @@ public:
     void stop(PileTimer* timer);
     void suspend(PileTimer* timer);
     void resume(PileTimer* timer);
-    /// The same by id, for a manager that may be null.
-    static void start(TimerMgr* manager, std::uint64_t id);
-    static void stop(TimerMgr* manager, std::uint64_t id);
-    static void suspend(TimerMgr* manager, std::uint64_t id);
-    static void resume(TimerMgr* manager, std::uint64_t id);
-    template <detail::Index I>
-    static void start(TimerMgr* manager, I id) {
-        start(manager, static_cast<std::uint64_t>(id));
-    }
-    template <detail::Index I>
-    static void stop(TimerMgr* manager, I id) {
-        stop(manager, static_cast<std::uint64_t>(id));
-    }
-    template <detail::Index I>
-    static void suspend(TimerMgr* manager, I id) {
-        suspend(manager, static_cast<std::uint64_t>(id));
-    }
-    template <detail::Index I>
-    static void resume(TimerMgr* manager, I id) {
-        resume(manager, static_cast<std::uint64_t>(id));
-    }
-    /// The same of a timer given directly; both may be null.
-    static void start(TimerMgr* manager, PileTimer* timer) {
+    /// The same by id or of a timer given directly, for a manager that may be null.
+    template <class Timer>
+    static void start(TimerMgr* manager, Timer timer) {
         if (manager != nullptr) manager->start(timer);
     }
-    static void stop(TimerMgr* manager, PileTimer* timer) {
+    template <class Timer>
+    static void stop(TimerMgr* manager, Timer timer) {
         if (manager != nullptr) manager->stop(timer);
     }
-    static void suspend(TimerMgr* manager, PileTimer* timer) {
+    template <class Timer>
+    static void suspend(TimerMgr* manager, Timer timer) {
         if (manager != nullptr) manager->suspend(timer);
     }
-    static void resume(TimerMgr* manager, PileTimer* timer) {
+    template <class Timer>
+    static void resume(TimerMgr* manager, Timer timer) {
         if (manager != nullptr) manager->resume(timer);
     }
 
