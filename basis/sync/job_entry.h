@@ -27,9 +27,6 @@ public:
     using MTQ_Dat::finish;
     using MTQ_Dat::queue;
     using MTQ_Dat::removesWhenDone;
-
-    /// Among the jobs whose end has been reported and not yet been looked at.
-    JobEntry* nextReported = nullptr;
 };
 
 /// At an entry, between the one before it and it, or nowhere. One word, so that it can be read while others change it.

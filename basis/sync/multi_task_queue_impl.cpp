@@ -23,7 +23,7 @@ MTQ_Impl::MTQ_Impl(ErrPolicy policy, int limit)
     : policy_(policy), limit_(limit), mutex_(xos_SemMCreate()), completion_(xos_SemBCreate(0)) {}
 
 MTQ_Impl::~MTQ_Impl() {
-    // Who waits for the jobs may come here before the last of them has given its signal.
+    // `wait` may have returned before the last job has given its signal.
     while (ending() != 0) std::this_thread::yield();
     xos_SemDestroy(completion_);
     xos_SemDestroy(mutex_);
@@ -94,45 +94,16 @@ void MTQ_Impl::run(JobEntry& job) {
     ending_.fetch_sub(1, std::memory_order_release);
 }
 
-/// A job that finds the end of another waiting to be looked at leaves its own to that one's task: tasks that queued up at
-/// the mutex, which is held while others are created, would be slower than the jobs.
 void MTQ_Impl::done(MTQ_Dat& job) {
-    auto& entry = static_cast<JobEntry&>(job);
-    JobEntry* before = reports_.load(std::memory_order_relaxed);
-    do {
-        entry.nextReported = before;
-    } while (!reports_.compare_exchange_weak(before, &entry, std::memory_order_acq_rel, std::memory_order_relaxed));
-    if (before != nullptr) return; // the job may be gone already
-    std::uint32_t ended = 0;
     {
         HeldSemaphore const held(mutex_);
-        for (JobEntry* next = takeReports(); next != nullptr; ++ended) {
-            JobEntry& one = *next;
-            next = one.nextReported;
-            end(one);
-        }
+        if (!job.result()) failed_.store(true, std::memory_order_release);
+        auto& entry = static_cast<JobEntry&>(job);
+        if (entry.removesWhenDone()) drop(&entry);
+        // Last, as `wait` returns as soon as it reads 0, without the mutex.
+        running_.fetch_sub(1, std::memory_order_release);
     }
-    for (; ended != 0; --ended) xos_SemGive(completion_);
-}
-
-/// \return the jobs in the order of their ends
-JobEntry* MTQ_Impl::takeReports() {
-    JobEntry* inOrder = nullptr;
-    for (JobEntry* job = reports_.exchange(nullptr, std::memory_order_acq_rel); job != nullptr;) {
-        JobEntry* const earlier = job->nextReported;
-        job->nextReported = inOrder;
-        inOrder = job;
-        job = earlier;
-    }
-    return inOrder;
-}
-
-/// \pre the mutex is held
-void MTQ_Impl::end(JobEntry& job) {
-    if (!job.result()) failed_.store(true, std::memory_order_release);
-    if (job.removesWhenDone()) drop(&job);
-    // The last, as who waits looks at the count alone.
-    running_.fetch_sub(1, std::memory_order_release);
+    xos_SemGive(completion_);
 }
 
 /// \pre the mutex is held

@@ -34,7 +34,7 @@ public:
     void run(JobEntry& job);
 
     std::int32_t running() const { return running_.load(std::memory_order_acquire); }
-    /// Jobs whose function has returned and that still report it.
+    /// Jobs whose function has returned and whose `done` has not.
     std::uint32_t ending() const { return ending_.load(std::memory_order_acquire); }
 
 private:
@@ -42,8 +42,6 @@ private:
     bool start(JobEntry& job);
     void startAllThatWait();
     void awaitCompletion();
-    JobEntry* takeReports();
-    void end(JobEntry& job);
     void drop(JobEntry* job);
 
     ErrPolicy const policy_;
@@ -58,8 +56,6 @@ private:
     /// No job before this one waits to be started; null: none at all.
     JobEntry* firstWaiting_ = nullptr;
     std::atomic<std::uint32_t> ending_{0};
-    /// Finished jobs, the last one first, that somebody is about to look at.
-    std::atomic<JobEntry*> reports_{nullptr};
 };
 
 } // namespace ZOR_Basis

@@ -32,6 +32,42 @@ bool isQuiet(MTQ_Impl const& queue, std::int32_t running) {
 
 bool succeed(void*) { return true; }
 
+/// What became of the arguments that a queue owned.
+struct Ends {
+    std::atomic<int> onOwnTask{0};
+    std::atomic<int> elsewhere{0};
+};
+
+/// Knows the thread of its job.
+class TaskArgument : public MTQ_Arg {
+public:
+    explicit TaskArgument(Ends& ends) : ends_(ends) {}
+    ~TaskArgument() override {
+        ++(std::this_thread::get_id() == task_ ? ends_.onOwnTask : ends_.elsewhere);
+        if (gate_ != nullptr) gate_->run(gate_->argument());
+    }
+    TaskArgument(TaskArgument const&) = delete;
+    TaskArgument& operator=(TaskArgument const&) = delete;
+
+    /// Keeps the destructor, and with it the queue's mutex, until the gate opens.
+    void endBehind(GatedJob& gate) { gate_ = &gate; }
+    void* argument() { return static_cast<MTQ_Arg*>(this); }
+
+    static bool run(void* argument) {
+        static_cast<TaskArgument*>(static_cast<MTQ_Arg*>(argument))->task_ = std::this_thread::get_id();
+        return true;
+    }
+
+private:
+    Ends& ends_;
+    GatedJob* gate_ = nullptr;
+    std::thread::id task_;
+};
+
+bool addOwned(MultiTaskQueue& queue, TaskArgument* argument) {
+    return queue.add(TaskArgument::run, argument->argument(), true, true, true);
+}
+
 } // namespace
 
 TEST_F(MTQ_ImplTest, makes_a_mutex_and_an_empty_signal_and_destroys_them) {
@@ -207,6 +243,51 @@ TEST_F(MTQ_ImplTest, goes_on_without_semaphores) {
         EXPECT_EQ(xos_HostCalls("xos_TaskSleep") > sleeps, std::string(function) == "xos_SemBCreate")
             << "rests where there is no signal to wait for";
     }
+}
+
+TEST_F(MTQ_ImplTest, ends_each_job_under_its_mutex_on_the_jobs_own_task) {
+    constexpr int JOBS = 400;
+    constexpr int TAKES_OF_A_JOB = 3; // to add it, to start it, to report its end
+    Ends ends;
+    MTQ_Impl queue(MultiTaskQueue::Continue, 0);
+    xos_HostCallsReset();
+    for (int i = 0; i < JOBS; ++i) EXPECT_TRUE(addOwned(queue, new TaskArgument(ends)));
+    EXPECT_TRUE(isQuiet(queue, 0));
+    EXPECT_EQ(ends.onOwnTask, JOBS);
+    EXPECT_EQ(ends.elsewhere, 0);
+    EXPECT_EQ(xos_HostCalls("xos_SemTake"), std::uint64_t{TAKES_OF_A_JOB} * JOBS);
+    EXPECT_EQ(xos_HostCalls("xos_SemGive"), std::uint64_t{TAKES_OF_A_JOB + 1} * JOBS) << "the signal, too";
+}
+
+TEST_F(MTQ_ImplTest, leaves_no_job_to_the_task_of_another_that_waits_for_the_mutex) {
+    Ends ends;
+    GatedJob gate;
+    MTQ_Impl queue(MultiTaskQueue::Continue, 0);
+    GatedJob first, second;
+    struct Gated : TaskArgument {
+        Gated(Ends& all, GatedJob& own) : TaskArgument(all), job(own) {}
+        GatedJob& job;
+        static bool run(void* argument) {
+            TaskArgument::run(argument);
+            return GatedJob::run(static_cast<Gated*>(static_cast<MTQ_Arg*>(argument))->job.argument());
+        }
+    };
+    for (GatedJob* job : {&first, &second}) {
+        EXPECT_TRUE(queue.add(Gated::run, (new Gated(ends, *job))->argument(), true, true, true));
+    }
+    auto* const keeper = new TaskArgument(ends);
+    keeper->endBehind(gate);
+    EXPECT_TRUE(addOwned(queue, keeper));
+    EXPECT_TRUE(soon([&] { return gate.runs(); })) << "the mutex is held";
+    first.open();
+    EXPECT_TRUE(soon([&] { return queue.ending() == 2; }));
+    second.open();
+    EXPECT_TRUE(soon([&] { return queue.ending() == 3; }));
+    EXPECT_TRUE(notInAMoment([&] { return queue.ending() != 3; })) << "each waits for the mutex itself";
+    gate.open();
+    EXPECT_TRUE(isQuiet(queue, 0));
+    EXPECT_EQ(ends.onOwnTask, 3);
+    EXPECT_EQ(ends.elsewhere, 0);
 }
 
 TEST_F(MTQ_ImplTest, drops_its_jobs_where_its_semaphores_cannot_be_destroyed) {
