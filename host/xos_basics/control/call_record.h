@@ -61,6 +61,9 @@ struct ThreadCalls {
     /// The thread's store of semaphore blocks.
     Semaphore* freeSemaphores;
     std::uint32_t freeSemaphoreCount;
+    /// Mutexes that the thread holds; see tasks/deferred_threads.h.
+    std::uint32_t heldMutexes;
+    bool hasDeferredThreads;
     ThreadCalls* next;
     bool inUse;
     /// The text that `xos_HostLastCall` handed to this thread; null before.

@@ -46,6 +46,8 @@ ThreadCalls* adoptThreadCalls() {
     calls->time.store(commonTime.load(std::memory_order_relaxed), std::memory_order_relaxed);
     static constinit std::atomic<std::uint64_t> lastSerial{0};
     calls->threadSerial = lastSerial.fetch_add(1, std::memory_order_relaxed) + 1;
+    calls->heldMutexes = 0;
+    calls->hasDeferredThreads = false;
     currentThreadCalls = calls;
     releaseAtThreadEnd(calls);
     return calls;

@@ -2,6 +2,7 @@
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/semaphores/named_mutex.h"
 #include "host/xos_basics/semaphores/semaphore.h"
+#include "host/xos_basics/tasks/deferred_threads.h"
 #include "host/xos_basics/wait/lock_word.h"
 
 using host::failsNow;
@@ -15,7 +16,10 @@ int failWith(host::Error error) {
 }
 
 inline void takeState(host::Semaphore& semaphore, host::ThreadCalls& mine) {
-    host::takeWord(semaphore.lock);
+    if (!host::isTakenAtOnce(semaphore.lock)) {
+        host::provideDeferredThreads(mine);
+        host::takeContended(semaphore.lock);
+    }
     host::learnTime(mine, semaphore.time);
 }
 
@@ -37,18 +41,27 @@ int takeMutex(host::Semaphore& mutex) {
     takeState(mutex, mine);
     mutex.owner.store(self, std::memory_order_relaxed);
     mutex.depth = 1;
+    ++mine.heldMutexes;
     return 0;
 }
 
 int giveMutex(host::Semaphore& mutex) {
-    host::ThreadCalls const& mine = host::threadCalls();
+    host::ThreadCalls& mine = host::threadCalls();
     std::uint64_t const self = mine.threadSerial;
     if (self == 0 || mutex.owner.load(std::memory_order_relaxed) != self) { return failWith(host::Error::notOwner); }
     if (--mutex.depth == 0) {
         mutex.owner.store(0, std::memory_order_relaxed);
         giveState(mutex, mine);
+        if (--mine.heldMutexes == 0) { host::provideDeferredThreads(mine); }
     }
     return 0;
+}
+
+/// A mutex that ends while its owner holds it is held no longer.
+void leaveMutex(host::Semaphore const& mutex) {
+    host::ThreadCalls& mine = host::threadCalls();
+    std::uint64_t const self = mine.threadSerial;
+    if (self != 0 && mutex.owner.load(std::memory_order_relaxed) == self) { --mine.heldMutexes; }
 }
 
 int takeBinary(host::Semaphore& semaphore) {
@@ -110,6 +123,7 @@ int xos_SemDestroy(xos_Sem sem) {
     if (failsNow(Function::xos_SemDestroy, sem)) { return host::FAILED; }
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
     if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
+    if (semaphore->kind == host::SemaphoreKind::mutex) { leaveMutex(*semaphore); }
     // A named mutex is the process's, not the caller's: others hold the same handle.
     if (semaphore->kind != host::SemaphoreKind::named) { host::freeSemaphore(semaphore); }
     return 0;

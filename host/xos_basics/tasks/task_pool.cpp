@@ -2,6 +2,7 @@
 
 #include "host/xos_basics/control/call_order.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/tasks/deferred_threads.h"
 #include "host/xos_basics/tasks/job_queue.h"
 #include "host/xos_basics/tasks/task_thread.h"
 #include "host/xos_basics/wait/pause.h"
@@ -15,6 +16,7 @@
 #include <mutex>
 #include <new>
 #include <thread>
+#include <utility>
 
 namespace host {
 
@@ -58,6 +60,12 @@ bool areEnoughReady() {
     return waitingJobs.load(std::memory_order_relaxed) <= readyWorkers.load(std::memory_order_relaxed);
 }
 
+/// Sees all jobs of those who have read a word that this thread wrote before.
+unsigned jobsWithoutThread() {
+    std::lock_guard const lock{mutex};
+    return areEnoughReady() ? 0 : waitingJobs.load(std::memory_order_relaxed);
+}
+
 /// One processor is left to the others.
 unsigned mostAwake() {
     static unsigned const most = std::max(std::thread::hardware_concurrency(), 1U) - 1;
@@ -98,10 +106,15 @@ Need countOnOneMore(Worker*& sleeper) {
     return Need::wakeUp;
 }
 
+/// The thread that was counted on could not be had.
+void countOnOneLess() {
+    std::lock_guard const lock{mutex};
+    change(readyWorkers, -1);
+}
+
 /// \return whether it was still waiting
 bool takeBack(QueuedJob const* job) {
     std::lock_guard const lock{mutex};
-    change(readyWorkers, -1);
     bool const isWaiting = queue.remove(job);
     change(waitingJobs, isWaiting ? -1 : 0);
     return isWaiting;
@@ -225,20 +238,33 @@ bool runOnOwnThread(std::unique_ptr<QueuedJob> job) {
     return true;
 }
 
-bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
-    QueuedJob* const job = owned.release(); // the queue's, and then its thread's
-    enqueue(job);
-    giveBusyWorkersAMoment();
+/// Makes one more thread ready if there are not enough. \return false: the system gives no new one
+bool makeOneMoreReady() {
     Worker* sleeper = nullptr;
     Need const need = countOnOneMore(sleeper);
     if (need == Need::wakeUp) {
         sleeper->isWoken.store(1, std::memory_order_release);
         wakeOne(sleeper->isWoken);
-    } else if (need == Need::newThread && !startThread(runReadyWorker, nullptr, 0) && takeBack(job)) {
-        owned.reset(job);
+    } else if (need == Need::newThread && !startThread(runReadyWorker, nullptr, 0)) {
+        countOnOneLess();
         return false;
     }
     return true;
+}
+
+/// Somebody runs who takes the next job, unless there are others that have to run at the same time.
+bool isAnyoneAtWork() {
+    return busyWorkers.load(std::memory_order_relaxed) + readyWorkers.load(std::memory_order_relaxed) != 0;
+}
+
+bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
+    QueuedJob* const job = owned.release(); // the queue's, and then its thread's
+    enqueue(job);
+    if (isAnyoneAtWork() && deferThreads()) { return true; }
+    giveBusyWorkersAMoment();
+    if (makeOneMoreReady() || !takeBack(job)) { return true; }
+    owned.reset(job);
+    return false;
 }
 
 } // namespace
@@ -250,6 +276,15 @@ bool runTask(TaskJob const& job) {
         return false;
     }
     return job.stackSize == 0 ? runOnAnyThread(std::move(queued)) : runOnOwnThread(std::move(queued));
+}
+
+void provideThreads() {
+    for (unsigned waiting = jobsWithoutThread(); waiting != 0;) {
+        giveBusyWorkersAMoment();
+        // While jobs are being taken, another thread would only be in the way.
+        unsigned const before = std::exchange(waiting, jobsWithoutThread());
+        if (waiting >= before && !makeOneMoreReady()) { return; }
+    }
 }
 
 } // namespace host
