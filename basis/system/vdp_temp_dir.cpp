@@ -1,12 +1,15 @@
 #include "zor_basis/system/vdp_temp_dir.h"
 
 #include "basis/files/platform_flags.h"
+#include "basis/memory/never_destroyed.h"
 #include "basis/platform/xos_basics.h"
 #include "basis/sync/held_semaphore.h"
 #include "basis/system/decimal_text.h"
 #include "zor_basis/files/dir.h"
 #include "zor_basis/files/f_stat.h"
 #include "zor_basis/system/sys.h"
+
+#include <mutex>
 
 namespace ZOR_Basis {
 namespace {
@@ -21,10 +24,17 @@ xos_Sem mutexOfAllProcesses() {
     return xos_SemNamedMutexCreate(NAMED_MUTEX, 0, 0, &word);
 }
 
+/// Guards what the names are made of while `Init` changes it. Never held over a call of the platform layer.
+constinit std::mutex parts;
+
+NeverDestroyed<FPath> commonFolder;
+NeverDestroyed<BufStr<15>> lastNumber("0");
+NeverDestroyed<BufStr<15>> suffix(".r");
+
 /// Whether the path is a directory now.
 bool becomesDirectory(FPath const& path) {
     FStat const entry(path.c_str());
-    // kept temp-02: what an earlier run has left is as good as new; who wants the folder empty starts as number 1.
+    // kept temp-02: what an earlier run left is used as it is; instance 1 begins with an empty common folder.
     if (entry.isDir()) return true;
     return !entry.isFile() && Dir::NewFor(path) && xos_DirCreateEx(path, 0) == 0;
 }
@@ -33,43 +43,48 @@ bool becomesDirectory(FPath const& path) {
 
 static_assert(sizeof(xos_Sem) == sizeof(std::uint64_t));
 
-FPath VDPTempDir::_GlbTmp;
-BufStr<15> VDPTempDir::_CurName("0");
-BufStr<15> VDPTempDir::_ExtRip(".r");
+FPath& VDPTempDir::_GlbTmp = *commonFolder;
+BufStr<15>& VDPTempDir::_CurName = *lastNumber;
+BufStr<15>& VDPTempDir::_ExtRip = *suffix;
 constinit std::atomic<std::uint64_t> VDPTempDir::_Sem{0};
 constinit std::atomic<std::int32_t> VDPTempDir::_Level{0};
 
 void VDPTempDir::Init(int n) {
     if (_Sem != 0 && (n == 0 || _Level > 0)) return;
+    // `_Sem` is not taken here: a `Create` that tries in vain keeps it, and would stop the user's other processes.
     HeldSemaphore const all(mutexOfAllProcesses());
     // kept temp-01: folders that jobs have already stay beneath the root.
     if (_Level > 0 || (n == 0 && _GlbTmp.some())) return;
-    if (xos_Sem const naming = _Sem) {
-        HeldSemaphore const held(naming);
-        choose(n);
-    } else {
-        choose(n);
-        _Sem = xos_SemMCreate();
-    }
+    choose(n);
+    if (_Sem == 0) _Sem = xos_SemMCreate();
     if (n > 0) _Level = n;
 }
 
 /// Sets the common folder and the suffix.
 void VDPTempDir::choose(int n) {
-    _GlbTmp = Sys::temp();
-    if (n <= 0) return;
-    _GlbTmp.add(SHARED_FOLDER);
-    _ExtRip << n;
-    if (n != CLEARS_THE_FOLDER) return;
-    Dir::Rem(_GlbTmp, true, false);
-    Dir::New(_GlbTmp, true);
+    FPath folder = Sys::temp();
+    if (n > 0) folder.add(SHARED_FOLDER);
+    if (n == CLEARS_THE_FOLDER) {
+        Dir::Rem(folder, true, false);
+        Dir::New(folder, true);
+    }
+    std::lock_guard const held(parts);
+    _GlbTmp = folder;
+    if (n > 0) _ExtRip << n;
 }
 
 /// What `Init` would have done.
 void VDPTempDir::prepare() {
     HeldSemaphore const all(mutexOfAllProcesses());
-    if (_Level <= 0 && _GlbTmp.empty()) _GlbTmp = Sys::temp();
+    if (_Level <= 0 && _GlbTmp.empty()) choose(0);
     if (_Sem == 0) _Sem = xos_SemMCreate();
+}
+
+/// \pre `_Sem` is held
+void VDPTempDir::nextPath(FPath& path) {
+    incrementDecimal(_CurName);
+    std::lock_guard const held(parts);
+    path.assign(_GlbTmp, _CurName).addExt(_ExtRip, false);
 }
 
 void VDPTempDir::Create(FPath& path) {
@@ -77,8 +92,7 @@ void VDPTempDir::Create(FPath& path) {
     HeldSemaphore const naming(_Sem);
     // kept temp-03: a job cannot go on without its folder, and a root that is full or away comes back.
     do {
-        incrementDecimal(_CurName);
-        path.assign(_GlbTmp, _CurName).addExt(_ExtRip, false);
+        nextPath(path);
     } while (!becomesDirectory(path));
 }
 

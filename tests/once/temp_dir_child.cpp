@@ -15,6 +15,9 @@
 //   fail=FUNCTION    lets its next call fail
 //   touch=FILE       makes an empty file
 //   wait=FILE        waits until there is such a file, a minute at most
+//   background       another thread makes one with Create; tried=COUNT waits until it has tried so many names
+//   join             waits for that thread: prints its path
+//   remove=FILE      removes a file
 //   unblock=FILE     removes that file as soon as a hundred names have been tried in vain
 //   threads=COUNT    so many threads make 25 folders each, put a file into each and keep half of them until all threads are
 //                    done: prints the paths
@@ -25,6 +28,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -44,6 +48,7 @@ constexpr int EACH = 25;
 
 std::list<VDPTempDir> folders;
 std::thread helper;
+FPath madeByHelper;
 
 void print(char const* text) { std::printf("%s\n", text != nullptr ? text : "none"); }
 
@@ -65,12 +70,21 @@ void assign() {
     print(other.path() == folders.back().path() ? before.c_str() : "another path");
 }
 
+/// Each attempt asks the platform layer for the status of the new name.
+bool awaitAttempts(std::uint64_t count) {
+    return waitUntil([count] { return xos_HostCalls("xos_FileStatByNameEx") >= count; });
+}
+
 void unblock(std::string const& path) {
     helper = std::thread([path] {
-        // Each attempt asks the platform layer for the status of the new name.
-        if (!waitUntil([] { return xos_HostCalls("xos_FileStatByNameEx") >= 100; })) std::abort();
+        if (!awaitAttempts(100)) std::abort();
         fs::remove(path);
     });
+}
+
+void joinHelper() {
+    helper.join();
+    print(madeByHelper.c_str());
 }
 
 void makeMany(std::vector<VDPTempDir>& kept, std::string& paths) {
@@ -135,6 +149,14 @@ bool perform(std::string const& name, std::string const& value) {
         std::ofstream(value.c_str()).flush();
     } else if (name == "wait") {
         return waitUntil([&value] { return fs::exists(value); });
+    } else if (name == "background") {
+        helper = std::thread([] { VDPTempDir::Create(madeByHelper); });
+    } else if (name == "tried") {
+        return awaitAttempts(std::stoul(value));
+    } else if (name == "join") {
+        joinHelper();
+    } else if (name == "remove") {
+        fs::remove(value);
     } else if (name == "unblock") {
         unblock(value);
     } else if (name == "threads") {

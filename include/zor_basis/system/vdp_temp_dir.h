@@ -6,9 +6,11 @@
 /// with others calls `Init` with a number of its own first: from then on its folders lie in "vdp_tmp" there and have that
 /// number behind the suffix, as "12.r3".
 ///
-/// \thread  names are given and folders made by one thread at a time, whichever calls; choosing the common folder is one
-///     step among all processes of a user. Where the platform layer makes no mutex for that, one thread at a time may call.
-///     An object belongs to one thread at a time
+/// The class may be used until the process ends, in static destructors too.
+///
+/// \thread  thread-safe: one thread at a time makes a folder, and one process of a user at a time chooses its common
+///     folder. `Init` does not wait for a `Create` that still tries; from then on that one tries names of the new kind.
+///     Where the platform layer makes no mutex, one thread at a time may call. An object belongs to one thread at a time
 
 #ifndef ZOR_BASIS_SYSTEM_VDP_TEMP_DIR_H
 #define ZOR_BASIS_SYSTEM_VDP_TEMP_DIR_H
@@ -61,10 +63,11 @@ public:
 private:
     static void choose(int n);
     static void prepare();
+    static void nextPath(FPath& path);
 
-    static FPath _GlbTmp;
-    static BufStr<15> _CurName;
-    static BufStr<15> _ExtRip;
+    static FPath& _GlbTmp;
+    static BufStr<15>& _CurName;
+    static BufStr<15>& _ExtRip;
     static std::atomic<std::uint64_t> _Sem;
     static std::atomic<std::int32_t> _Level;
 
