@@ -70,6 +70,31 @@ void TimerMgr::resume(PileTimer* timer) {
     if (active()) PileTimer::resume(timer);
 }
 
+void TimerMgr::start(TimerMgr* manager, std::uint64_t id) {
+    if (manager != nullptr) manager->start(id);
+}
+void TimerMgr::start(TimerMgr* manager, PileTimer* timer) {
+    if (manager != nullptr) manager->start(timer);
+}
+void TimerMgr::stop(TimerMgr* manager, std::uint64_t id) {
+    if (manager != nullptr) manager->stop(id);
+}
+void TimerMgr::stop(TimerMgr* manager, PileTimer* timer) {
+    if (manager != nullptr) manager->stop(timer);
+}
+void TimerMgr::suspend(TimerMgr* manager, std::uint64_t id) {
+    if (manager != nullptr) manager->suspend(id);
+}
+void TimerMgr::suspend(TimerMgr* manager, PileTimer* timer) {
+    if (manager != nullptr) manager->suspend(timer);
+}
+void TimerMgr::resume(TimerMgr* manager, std::uint64_t id) {
+    if (manager != nullptr) manager->resume(id);
+}
+void TimerMgr::resume(TimerMgr* manager, PileTimer* timer) {
+    if (manager != nullptr) manager->resume(timer);
+}
+
 void TimerMgr::reset(bool print) {
     if (active()) resetTimers(print);
 }

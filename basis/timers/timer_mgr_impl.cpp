@@ -46,13 +46,13 @@ void TimerMgrImpl::add(PileTimer* timer, std::uint64_t id) {
         timer->setId(timers_.insertBack(timer));
         return;
     }
-    if (timers_[id] != nullptr) complain(356, "TimerMgr::add() - already registered!");
-    // kept timers-09: whoever holds the timer that was here may go on using it.
+    if (timers_.find(id) != nullptr) complain(356, "TimerMgr::add() - already registered!");
+    // kept timers-09: a holder of the timer that was here may go on using it.
     timer->setId(id);
-    timers_.set(timer, id);
+    timers_.put(timer, id);
 }
 
-PileTimer* TimerMgrImpl::getTimer(std::uint64_t id) { return timers_[id]; }
+PileTimer* TimerMgrImpl::getTimer(std::uint64_t id) { return timers_.find(id); }
 
 void TimerMgrImpl::resetTimers(bool print) {
     HeldSemaphore const held(lock_);

@@ -5,7 +5,7 @@
 #define BASIS_TIMERS_TIMER_MGR_IMPL_H
 
 #include "basis/platform/xos_basics.h"
-#include "zor_basis/containers/ptr_array.h"
+#include "basis/timers/timer_slots.h"
 #include "zor_basis/text/heap_str.h"
 #include "zor_basis/timers/timer_mgr.h"
 
@@ -28,7 +28,7 @@ private:
     template <class Act>
     void forEach(Act act);
 
-    PtrArray<PileTimer> timers_{8}; ///< by id; some slots are null
+    TimerSlots timers_{8};
     xos_Sem const lock_;
     HeapStr name_;
 };

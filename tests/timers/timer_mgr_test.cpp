@@ -246,6 +246,60 @@ TEST_F(TimerMgrTest, works_without_semaphores_and_gives_back_only_what_it_took) 
     EXPECT_EQ(xos_HostCalls("xos_SemGive"), 1u);
 }
 
+TEST_F(TimerMgrTest, takes_whatever_converts_to_an_id_or_a_timer_for_managers_that_may_be_null) {
+    void (*const stated)(TimerMgr*, std::uint64_t) = TimerMgr::start;
+    TimerMgr* const manager = TimerMgr::New("converting", 5);
+    manager->setActive(true);
+    PileTimer* const timer = TimerMgr::create(manager, "stage", 3, false);
+    std::atomic<std::uint64_t> const sharedId{3};
+    std::atomic<int> const sharedNumber{3};
+    enum Stage { LOAD, PARSE, RENDER, PRINT };
+    PileTimerAuto driver(timer, manager, false, false);
+    for (TimerMgr* which : {manager, static_cast<TimerMgr*>(nullptr)}) {
+        auto const measure = [which](auto&& stage) {
+            TimerMgr::start(which, stage);
+            TimerMgr::suspend(which, stage);
+            TimerMgr::resume(which, stage);
+            TimerMgr::stop(which, stage);
+        };
+        measure(sharedId);
+        measure(sharedNumber);
+        measure(driver);
+        measure(PRINT);
+        measure(3);
+        measure(3u);
+        measure(std::uint64_t{3});
+        measure(std::int8_t{3});
+        measure(timer);
+        measure(nullptr);
+        EXPECT_EQ(count(timer), "9") << "for no manager nothing happens";
+    }
+    TimerMgr::start(manager, 0);
+    EXPECT_EQ(count(timer), "9") << "a literal 0 is an id";
+    stated(manager, 3);
+    TimerMgr::stop(manager, 3);
+    EXPECT_EQ(count(timer), "10");
+}
+
+TEST_F(TimerMgrTest, finds_timers_that_another_thread_creates_in_reserved_slots) {
+    constexpr std::uint64_t LAST = 500;
+    TimerMgr* const manager = TimerMgr::New("growing within", LAST);
+    std::vector<std::thread> finders;
+    std::atomic<int> found{0};
+    for (int i = 0; i < 3; ++i) {
+        finders.emplace_back([&] {
+            for (std::uint64_t id = 1; id <= LAST; ++id) {
+                PileTimer* timer = nullptr;
+                while ((timer = TimerMgr::get(manager, id)) == nullptr) std::this_thread::yield();
+                found += timer->id() == id && timer->name() == std::to_string(id) ? 1 : 0;
+            }
+        });
+    }
+    for (std::uint64_t id = 1; id <= LAST; ++id) manager->createTimer(std::to_string(id).c_str(), id, false);
+    for (std::thread& finder : finders) finder.join();
+    EXPECT_EQ(found, 3 * int{LAST});
+}
+
 TEST_F(TimerMgrTest, serves_many_threads) {
     constexpr int THREADS = 4, EACH = 50;
     TimerMgr* const manager = TimerMgr::New("threads", THREADS);

@@ -11,8 +11,10 @@
 ///     1700000000_render_0.timer
 ///
 /// \kept timers-08: reports of one manager within one second go into one file, each with its own head
-/// \thread  thread-safe, except that lookups by id take no lock: while other threads look timers up, no timer is created
-///     at a new highest id
+/// \thread  thread-safe: `Mgr`, `New`, `Get`, `setRip`, `setActive`, `active`; with each other `createTimer`, `create`,
+///     `reset` and `resetTimers`. Lookups by id (`get`, `getTimer`, `start(id)` and its siblings) take no lock: they are safe
+///     while another thread creates a timer in a slot that exists (`New` reserves slots), but not while one is created at
+///     a higher id or at the end, which may move all slots. One timer is driven by one thread at a time, as `PileTimer` says
 
 #ifndef ZOR_BASIS_TIMERS_TIMER_MGR_H
 #define ZOR_BASIS_TIMERS_TIMER_MGR_H
@@ -108,23 +110,35 @@ public:
     void stop(PileTimer* timer);
     void suspend(PileTimer* timer);
     void resume(PileTimer* timer);
-    /// The same by id or of a timer given directly, for a manager that may be null.
-    template <class Timer>
-    static void start(TimerMgr* manager, Timer timer) {
-        if (manager != nullptr) manager->start(timer);
+    /// The same for a manager that may be null; then they do nothing.
+    static void start(TimerMgr* manager, std::uint64_t id);
+    static void start(TimerMgr* manager, int id) { start(manager, static_cast<std::uint64_t>(id)); }
+    template <detail::Index I>
+    static void start(TimerMgr* manager, I id) {
+        start(manager, static_cast<std::uint64_t>(id));
     }
-    template <class Timer>
-    static void stop(TimerMgr* manager, Timer timer) {
-        if (manager != nullptr) manager->stop(timer);
+    static void start(TimerMgr* manager, PileTimer* timer);
+    static void stop(TimerMgr* manager, std::uint64_t id);
+    static void stop(TimerMgr* manager, int id) { stop(manager, static_cast<std::uint64_t>(id)); }
+    template <detail::Index I>
+    static void stop(TimerMgr* manager, I id) {
+        stop(manager, static_cast<std::uint64_t>(id));
     }
-    template <class Timer>
-    static void suspend(TimerMgr* manager, Timer timer) {
-        if (manager != nullptr) manager->suspend(timer);
+    static void stop(TimerMgr* manager, PileTimer* timer);
+    static void suspend(TimerMgr* manager, std::uint64_t id);
+    static void suspend(TimerMgr* manager, int id) { suspend(manager, static_cast<std::uint64_t>(id)); }
+    template <detail::Index I>
+    static void suspend(TimerMgr* manager, I id) {
+        suspend(manager, static_cast<std::uint64_t>(id));
     }
-    template <class Timer>
-    static void resume(TimerMgr* manager, Timer timer) {
-        if (manager != nullptr) manager->resume(timer);
+    static void suspend(TimerMgr* manager, PileTimer* timer);
+    static void resume(TimerMgr* manager, std::uint64_t id);
+    static void resume(TimerMgr* manager, int id) { resume(manager, static_cast<std::uint64_t>(id)); }
+    template <detail::Index I>
+    static void resume(TimerMgr* manager, I id) {
+        resume(manager, static_cast<std::uint64_t>(id));
     }
+    static void resume(TimerMgr* manager, PileTimer* timer);
 
     /// `resetTimers`, unless the manager is inactive.
     void reset(bool print);
