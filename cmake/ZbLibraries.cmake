@@ -23,7 +23,8 @@ function(zb_shared_library target)
       target_link_options(${target} PRIVATE -Wl,--image-base=${ARG_IMAGE_BASE})
     endif()
   else()
-    target_link_options(${target} PRIVATE -Wl,--version-script=${exports}.map)
+    # Threads go on in it when its last user has unloaded it; on Windows it pins itself.
+    target_link_options(${target} PRIVATE -Wl,--version-script=${exports}.map -Wl,-z,nodelete)
     if(NOT ZB_SANITIZE) # a sanitizer's functions are in the program
       target_link_options(${target} PRIVATE -Wl,--no-undefined)
     endif()

@@ -35,12 +35,13 @@ void Log::out(char const* format, ...) const {
         end = writeAnyLineText(line, LINE_ROOM - RESERVED, format, arguments);
         va_end(arguments.list);
     }
-    // A log's logger is of this kind; its `out` would measure the line first.
-    static_cast<LoggerImpl*>(logger_)->out(line, end);
+    logger_->out(line, end);
 }
 
 void Log::newSession() {
     if (logger_ != nullptr) logger_->newSession();
 }
+
+bool Log::flush() const { return logger_ == nullptr || logger_->flush(); }
 
 } // namespace ZOR_Basis

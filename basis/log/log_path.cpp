@@ -15,13 +15,24 @@ constexpr int MOST_DIGITS = 20;
 
 } // namespace
 
-FPath logPath(Str const& log, std::uint64_t session, bool makeFolders) {
+FPath logFolder(Str const& log) {
     FPath path(FOLDER, TranslPath());
-    if (makeFolders) Dir::New(path.c_str(), WITH_PARENTS);
     path.add(log);
-    if (makeFolders) Dir::New(path.c_str(), WITH_PARENTS);
+    return path;
+}
+
+FPath makeLogFolder(Str const& log) {
+    FPath path(FOLDER, TranslPath());
+    Dir::New(path.c_str(), WITH_PARENTS);
+    path.add(log);
+    Dir::New(path.c_str(), WITH_PARENTS);
+    return path;
+}
+
+FPath sessionFile(FPath const& folder, std::uint64_t session) {
     char digits[MOST_DIGITS];
     char const* const end = std::to_chars(std::begin(digits), std::end(digits), session).ptr;
+    FPath path(folder);
     path.add(digits, static_cast<std::uint64_t>(end - digits));
     path.addExt("log", WITH_DOT);
     return path;

@@ -10,8 +10,12 @@
 
 namespace ZOR_Basis {
 
-/// The file of a session of a log. \param makeFolders  make sure of the folders on the way
-FPath logPath(Str const& log, std::uint64_t session, bool makeFolders);
+/// The folder of a log.
+FPath logFolder(Str const& log);
+/// The same, and makes it, with its parents, if it can.
+FPath makeLogFolder(Str const& log);
+/// The file of a session in the folder of its log.
+FPath sessionFile(FPath const& folder, std::uint64_t session);
 
 } // namespace ZOR_Basis
 

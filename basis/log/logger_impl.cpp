@@ -2,49 +2,43 @@
 
 #include "basis/files/system_calls.h"
 #include "basis/log/log_path.h"
+#include "basis/log/loggers.h"
+#include "basis/memory/never_destroyed.h"
 #include "basis/memory/node_memory.h"
 #include "basis/platform/xos_basics.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cstdlib>
 #include <cstring>
 #include <mutex>
 #include <new>
+#include <thread>
 
 namespace ZOR_Basis {
 namespace {
 
 using HQ_Basis::AlertTimer;
 
-/// Deleting an alert reports no failure: one may come once more when its logger is gone.
-struct Loggers {
-    std::mutex mutex;
-    LinkedList<LoggerImpl> list;
-
-    static Loggers& all() {
-        // Never destroyed: alerts go on while the process ends.
-        alignas(Loggers) static unsigned char memory[sizeof(Loggers)];
-        static auto* const kept = new (memory) Loggers;
-        return *kept;
-    }
-};
-
-/// \error what cannot be written is lost
-void appendToFile(char const* path, char const* text, std::uint64_t size) {
+bool appendToFile(char const* path, char const* text, std::uint64_t size) {
     std::FILE* const file = systemCalls.openStream(path, "a");
-    if (file == nullptr) return;
-    std::fwrite(text, 1, size, file);
-    std::fclose(file);
+    if (file == nullptr) return false;
+    bool const isWritten = std::fwrite(text, 1, size, file) == size;
+    return std::fclose(file) == 0 && isWritten;
 }
 
 } // namespace
 
+Loggers& loggers() {
+    static NeverDestroyed<Loggers> all;
+    return *all;
+}
+
 Logger::~Logger() = default;
 
 LoggerImpl::LoggerImpl(char const* name) : name_(name) {
-    Loggers& all = Loggers::all();
-    std::lock_guard const held(all.mutex);
-    all.list.append(this);
+    std::lock_guard const held(loggers().mutex);
+    loggers().list.append(this);
 }
 
 LoggerImpl* LoggerImpl::start(char const* name) {
@@ -56,18 +50,17 @@ LoggerImpl* LoggerImpl::start(char const* name) {
         return nullptr;
     }
     {
-        std::lock_guard const held(Loggers::all().mutex);
+        std::lock_guard const held(loggers().mutex);
         logger->alertId_ = id;
     }
-    logPath(logger->name_, logger->session_, true);
+    logger->folder_ = makeLogFolder(logger->name_);
     return logger;
 }
 
 LoggerImpl::~LoggerImpl() {
     {
-        Loggers& all = Loggers::all();
-        std::lock_guard const held(all.mutex);
-        all.list.unlink(this);
+        std::lock_guard const held(loggers().mutex);
+        loggers().list.unlink(this);
     }
     while (Buffer* const buffer = buffers_.takeFirst()) deleteBuffer(buffer);
 }
@@ -100,6 +93,8 @@ void LoggerImpl::append(char const* text, std::uint64_t size) {
     std::uint64_t const room = BLOCK_SIZE - current_->used;
     std::uint64_t const here = room <= size ? room : size;
     std::memcpy(current_->data + current_->used, text, here);
+    // The end of the process may stop this thread anywhere; whatever `used` counts is there then.
+    std::atomic_signal_fence(std::memory_order_release);
     current_->used += here;
     if (room > size) return;
     newBuffer();
@@ -125,11 +120,11 @@ void LoggerImpl::deleteBuffer(Buffer* buffer) {
     deleteNode(nodeMgr_, buffer);
 }
 
+/// Deleting an alert reports no failure: one may come once more when its logger is gone.
 /// \return null when the alert's logger is gone, also where another one lies in its place
 LoggerImpl* LoggerImpl::ownerOf(AlertTimer::Alert const& alert) {
-    Loggers& all = Loggers::all();
-    std::lock_guard const held(all.mutex);
-    LoggerImpl* logger = all.list.first();
+    std::lock_guard const held(loggers().mutex);
+    LoggerImpl* logger = loggers().list.first();
     while (logger != nullptr && logger != alert.context) logger = logger->next;
     // An alert may come before the logger knows its id.
     bool const isOwner = logger != nullptr && (logger->alertId_ == alert.id || logger->alertId_ == 0);
@@ -138,7 +133,7 @@ LoggerImpl* LoggerImpl::ownerOf(AlertTimer::Alert const& alert) {
 
 std::uint32_t LoggerImpl::tick(AlertTimer::Alert const& alert) {
     LoggerImpl* const logger = ownerOf(alert);
-    if (logger == nullptr || logger->flush()) {
+    if (logger == nullptr || logger->writeWhatIsDue()) {
         delete logger;
         AlertTimer::Delete(alert.id);
     }
@@ -146,20 +141,61 @@ std::uint32_t LoggerImpl::tick(AlertTimer::Alert const& alert) {
 }
 
 /// \return whether the logger has come to its end
-bool LoggerImpl::flush() {
+bool LoggerImpl::writeWhatIsDue() {
     std::lock_guard const held(lock_);
     bool const ends = closing_;
     // kept log-01: nothing keeps back the current buffer of a closed logger, so it is always the next to be written.
     for (Buffer* buffer = buffers_.first(); buffer != nullptr && !mustWait(buffer);) {
+        awaitWriter();
+        // What cannot be written is lost.
         writeOut(*buffer);
-        // Lines may have come meanwhile, and this may have become or ceased to be the current buffer.
-        if (buffer == current_ || buffer->flushed < buffer->used) continue;
+        // Lines may have come meanwhile, this may have become or ceased to be the current buffer, and be written by `flush`.
+        if (buffer == current_ || buffer->flushed < buffer->used || buffer == claim_.buffer) continue;
         Buffer* const written = buffer;
         buffer = buffer->next;
         buffers_.unlink(written);
         deleteBuffer(written);
     }
     return ends;
+}
+
+bool LoggerImpl::flush() {
+    std::lock_guard const held(lock_);
+    awaitWriter();
+    for (std::uint64_t left = unwritten(); left != 0; awaitWriter()) {
+        Buffer* const buffer = firstUnwritten();
+        if (buffer == nullptr) break; // the alert was faster
+        std::uint64_t const from = buffer->flushed;
+        left -= std::min(left, buffer->used - from);
+        if (writeOut(*buffer)) continue;
+        buffer->flushed = from;
+        return false;
+    }
+    return true;
+}
+
+/// Releases the lock while another thread writes.
+/// \pre the lock is held
+void LoggerImpl::awaitWriter() {
+    while (claim_.buffer != nullptr) {
+        lock_.unlock();
+        std::this_thread::yield();
+        lock_.lock();
+    }
+}
+
+LoggerImpl::Buffer* LoggerImpl::firstUnwritten() const {
+    Buffer* buffer = buffers_.first();
+    while (buffer != nullptr && buffer->flushed == buffer->used) buffer = buffer->next;
+    return buffer;
+}
+
+std::uint64_t LoggerImpl::unwritten() const {
+    std::uint64_t size = 0;
+    for (Buffer const* buffer = buffers_.first(); buffer != nullptr; buffer = buffer->next) {
+        size += buffer->used - buffer->flushed;
+    }
+    return size;
 }
 
 /// Whether the buffer is still being filled.
@@ -169,16 +205,30 @@ bool LoggerImpl::mustWait(Buffer const* buffer) const {
 }
 
 /// Releases the lock while it writes.
+/// \pre nobody else writes
 // kept log-02: also where there is nothing to write.
-void LoggerImpl::writeOut(Buffer& buffer) {
+bool LoggerImpl::writeOut(Buffer& buffer) {
     char const* const text = buffer.data + buffer.flushed;
     std::uint64_t const size = buffer.used - buffer.flushed;
     std::uint64_t const session = buffer.session;
+    bool const claims = size != 0;
+    if (claims) claim_ = {&buffer, buffer.flushed};
     buffer.flushed = buffer.used;
     lock_.unlock();
-    appendToFile(logPath(name_, session, false).c_str(), text, size);
+    bool const isWritten = appendToFile(sessionFile(logFolder(name_), session).c_str(), text, size);
     lock_.lock();
+    if (claims) claim_ = {};
     lastWrite_ = xos_MsCount();
+    return isWritten;
+}
+
+// Text that a thread was writing may be written twice: better so than never.
+void LoggerImpl::writeRest(void (*write)(char const* path, char const* text, std::uint64_t size)) const {
+    for (Buffer const* buffer = buffers_.first(); buffer != nullptr; buffer = buffer->next) {
+        std::uint64_t const from = buffer == claim_.buffer ? claim_.from : buffer->flushed;
+        if (from == buffer->used) continue;
+        write(sessionFile(folder_, buffer->session).c_str(), buffer->data + from, buffer->used - from);
+    }
 }
 
 } // namespace ZOR_Basis

@@ -6,6 +6,7 @@
 
 #include "basis/containers/linked_list.h"
 #include "basis/platform/hq_basis.h"
+#include "zor_basis/files/f_path.h"
 #include "zor_basis/log/logger.h"
 #include "zor_basis/sync/lock.h"
 #include "zor_basis/text/heap_str.h"
@@ -34,7 +35,22 @@ public:
     /// What has not been written is lost.
     ~LoggerImpl() override;
 
+    /// Writes out what there is at the time of the call.
+    /// \return false: the rest of it is kept, and the last error says why
+    bool flush();
+
+    /// Hands over the text that has not been written, without a lock.
+    /// \pre no other thread exists
+    void writeRest(void (*write)(char const* path, char const* text, std::uint64_t size)) const;
+
     std::uint32_t alertId() const { return alertId_; }
+    /// A logger in the copy of the process that made it: its lines are the original's to write.
+    bool isCopy() const { return isCopy_; }
+    void becomeCopy() { isCopy_ = true; }
+
+    /// The neighbours among all loggers.
+    LoggerImpl* previous = nullptr;
+    LoggerImpl* next = nullptr;
 
 private:
     struct Buffer {
@@ -46,13 +62,22 @@ private:
         char* data;
     };
 
+    /// Text that a thread is writing to its file, without the lock.
+    struct Claim {
+        Buffer* buffer = nullptr;
+        std::uint64_t from = 0;
+    };
+
     explicit LoggerImpl(char const* name);
 
     static LoggerImpl* ownerOf(HQ_Basis::AlertTimer::Alert const& alert);
     static std::uint32_t tick(HQ_Basis::AlertTimer::Alert const& alert);
-    bool flush();
+    bool writeWhatIsDue();
     bool mustWait(Buffer const* buffer) const;
-    void writeOut(Buffer& buffer);
+    void awaitWriter();
+    bool writeOut(Buffer& buffer);
+    Buffer* firstUnwritten() const;
+    std::uint64_t unwritten() const;
     void append(char const* text, std::uint64_t size);
     void newBuffer();
     Buffer* makeBuffer();
@@ -67,11 +92,10 @@ private:
     bool closing_ = false;
     std::uint32_t alertId_ = 0;
     std::uint32_t lastWrite_ = 0;
-
-    friend class LinkedList<LoggerImpl>;
-    /// The neighbours among all loggers.
-    LoggerImpl* previous = nullptr;
-    LoggerImpl* next = nullptr;
+    Claim claim_;
+    bool isCopy_ = false;
+    /// As it was made at the start, for the end of the process, when nobody can be asked for it.
+    FPath folder_;
 };
 
 } // namespace ZOR_Basis

@@ -25,7 +25,7 @@ xos_Sem mutexOfAllProcesses() {
 }
 
 /// Guards what the names are made of while `Init` changes it. Never held over a call of the platform layer.
-constinit std::mutex parts;
+NeverDestroyed<std::mutex> parts;
 
 NeverDestroyed<FPath> commonFolder;
 NeverDestroyed<BufStr<15>> lastNumber("0");
@@ -68,7 +68,7 @@ void VDPTempDir::choose(int n) {
         Dir::Rem(folder, true, false);
         Dir::New(folder, true);
     }
-    std::lock_guard const held(parts);
+    std::lock_guard const held(*parts);
     _GlbTmp = folder;
     if (n > 0) _ExtRip << n;
 }
@@ -83,7 +83,7 @@ void VDPTempDir::prepare() {
 /// \pre `_Sem` is held
 void VDPTempDir::nextPath(FPath& path) {
     incrementDecimal(_CurName);
-    std::lock_guard const held(parts);
+    std::lock_guard const held(*parts);
     path.assign(_GlbTmp, _CurName).addExt(_ExtRip, false);
 }
 
@@ -91,9 +91,7 @@ void VDPTempDir::Create(FPath& path) {
     if (_Sem == 0) prepare();
     HeldSemaphore const naming(_Sem);
     // kept temp-03: a job cannot go on without its folder, and a root that is full or away comes back.
-    do {
-        nextPath(path);
-    } while (!becomesDirectory(path));
+    do { nextPath(path); } while (!becomesDirectory(path));
 }
 
 FPath const& VDPTempDir::Root() { return _GlbTmp; }

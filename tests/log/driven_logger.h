@@ -15,6 +15,7 @@
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <mutex>
 #include <string>
 #include <vector>
 
@@ -75,7 +76,10 @@ protected:
 
 private:
     static std::FILE* open(char const* path, char const* mode) {
-        self->opened.push_back(std::string(mode) + " " + path);
+        {
+            std::lock_guard const held(self->openedMutex_);
+            self->opened.push_back(std::string(mode) + " " + path);
+        }
         if (self->whileOpening) self->whileOpening();
         return self->failsToOpen ? nullptr : self->realOpen_(path, mode);
     }
@@ -83,6 +87,7 @@ private:
     static inline DrivenLoggers* self = nullptr;
     decltype(ZOR_Basis::systemCalls.openStream) const realOpen_ = ZOR_Basis::systemCalls.openStream;
     std::vector<ZOR_Basis::LoggerImpl*> loggers_;
+    std::mutex openedMutex_;
 };
 
 #endif

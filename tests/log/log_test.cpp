@@ -17,6 +17,7 @@ TEST(Log, without_a_name_drops_everything) {
     for (Log* log : {&byDefault, &byNull}) {
         log->out("%s %d", "text", 5);
         log->newSession();
+        EXPECT_TRUE(log->flush());
         log->init(nullptr);
         log->out("again");
     }

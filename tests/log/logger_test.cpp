@@ -356,3 +356,61 @@ TEST_F(LoggerTest, needs_its_alert) {
     EXPECT_EQ(LoggerImpl::start(name().c_str()), nullptr);
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), xos_HostCalls("xos_SemMCreate"));
 }
+
+/* Written on demand */
+
+TEST_F(LoggerTest, writes_all_that_it_holds_when_it_is_flushed) {
+    LoggerImpl& logger = start();
+    EXPECT_TRUE(logger.flush());
+    EXPECT_THAT(opened, ElementsAre()) << "there is nothing to write";
+    std::string const filler = lineOf(BLOCK - 10);
+    write(logger, filler);
+    write(logger, "goes on in the second block");
+    logger.newSession();
+    write(logger, "next session");
+    EXPECT_TRUE(logger.flush());
+    EXPECT_EQ(content(0), filler + "\ngoes on in the second block\n");
+    EXPECT_EQ(content(1), "next session\n");
+    write(logger, "later");
+    EXPECT_TRUE(logger.flush());
+    EXPECT_TRUE(logger.flush());
+    EXPECT_EQ(content(1), "next session\nlater\n");
+    EXPECT_EQ(opened.size(), 4u);
+}
+
+TEST_F(LoggerTest, goes_on_as_ever_after_a_flush) {
+    LoggerImpl& logger = start();
+    write(logger, "flushed");
+    logger.flush();
+    write(logger, "waits");
+    tick(logger);
+    EXPECT_EQ(content(0), "flushed\n") << "is being filled still";
+    tickAfter(PERIOD, logger);
+    EXPECT_EQ(content(0), "flushed\nwaits\n");
+}
+
+TEST_F(LoggerTest, keeps_what_it_cannot_flush) {
+    LoggerImpl& logger = start();
+    write(logger, "first");
+    logger.newSession();
+    write(logger, "second");
+    failsToOpen = true;
+    EXPECT_FALSE(logger.flush());
+    EXPECT_EQ(opened.size(), 1u) << "stops at the first failure, so that lines keep their order";
+    failsToOpen = false;
+    EXPECT_TRUE(logger.flush());
+    EXPECT_EQ(content(0), "first\n");
+    EXPECT_EQ(content(1), "second\n");
+}
+
+TEST_F(LoggerTest, flushes_what_was_there_and_ends_although_lines_come_meanwhile) {
+    LoggerImpl& logger = start();
+    write(logger, "there");
+    whileOpening = [&] { write(logger, "meanwhile"); };
+    EXPECT_TRUE(logger.flush());
+    whileOpening = nullptr;
+    EXPECT_EQ(opened.size(), 1u);
+    EXPECT_EQ(content(0), "there\n");
+    EXPECT_TRUE(logger.flush());
+    EXPECT_EQ(content(0), "there\nmeanwhile\n");
+}

@@ -55,3 +55,24 @@ TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
     for (int session = 0; exists(file(session)) || exists(file(session + 1)); ++session) all += content(session);
     expectAllLines(all, lines);
 }
+
+TEST_F(LoggerThreads, flush_each_line_once_and_in_order_while_the_alert_writes_too) {
+    LoggerImpl& logger = start();
+    std::uint64_t const lines = randomSteps(2000);
+    std::atomic<int> writing{WRITERS};
+    std::vector<std::thread> threads;
+    for (int writer = 0; writer < WRITERS; ++writer) {
+        threads.emplace_back([&, writer] {
+            std::string const who = "writer " + std::to_string(writer) + " line ";
+            for (std::uint64_t i = 0; i < lines; ++i) {
+                write(logger, who + std::to_string(i) + " ends");
+                if (i % 100 == 99) { EXPECT_TRUE(logger.flush()); }
+            }
+            --writing;
+        });
+    }
+    while (writing != 0) tickAfter(PERIOD, logger);
+    for (std::thread& thread : threads) thread.join();
+    EXPECT_TRUE(logger.flush());
+    expectAllLines(content(0), lines);
+}

@@ -140,6 +140,39 @@ TEST(MultiTaskQueue, Kept_queue_02_waiting_starts_all_that_are_left_when_a_job_f
     EXPECT_EQ(startedOnes(queue), "sssss");
 }
 
+/// What the header shows.
+TEST(MultiTaskQueue, runs_no_more_at_a_time_than_jobs_that_share_the_work) {
+    struct Page {
+        std::atomic<int>* running;
+        std::atomic<int>* most;
+        bool render() const {
+            int const now = ++*running;
+            for (int before = *most; now > before && !most->compare_exchange_weak(before, now);) {}
+            std::this_thread::sleep_for(std::chrono::microseconds(200));
+            --*running;
+            return true;
+        }
+    };
+    struct Pages {
+        std::vector<Page> all;
+        std::atomic<std::size_t> next{0};
+        static bool render(void* argument) {
+            auto& pages = *static_cast<Pages*>(argument);
+            bool good = true;
+            for (std::size_t i; (i = pages.next++) < pages.all.size();) good = pages.all[i].render() && good;
+            return good;
+        }
+    } pages;
+    std::atomic<int> running{0}, most{0};
+    pages.all.assign(74, Page{&running, &most});
+    Queue const queue = make(MultiTaskQueue::Continue, 4);
+    for (int i = 0; i < 4; ++i) queue->add(Pages::render, &pages, false, true, false);
+    queue->wait();
+    EXPECT_FALSE(queue->failed());
+    EXPECT_GE(pages.next, 74u);
+    EXPECT_LE(most, 4);
+}
+
 TEST(MultiTaskQueue, remembers_failures_and_results) {
     Queue const queue = make(MultiTaskQueue::Continue, 100);
     EXPECT_TRUE(queue->add(succeed, nullptr, false, false, false));

@@ -8,16 +8,22 @@
 /// log, and in it a file for each session, "0.log" for the first. Files are appended to. They hold the texts, one a line,
 /// and nothing else: no time, no level. On Windows lines end as in every text file there.
 ///
-/// **When.** A line goes into memory, in blocks of 4,096 bytes; no caller ever waits for a disk. Every 8,192 ms an alert of
-/// the platform layer writes out the blocks that are full or belong to an earlier session. The block that is being filled is
-/// written once no line has come for 8,192 ms, and when the log is closed. Files are open only while they are written, so
-/// they may be read, moved and removed meanwhile.
+/// **When.** A line goes into memory, in blocks of 4,096 bytes; no caller of `out` ever waits for a disk. Every 8,192 ms an
+/// alert of the platform layer writes out the blocks that are full or belong to an earlier session. The block that is being
+/// filled is written once no line has come for 8,192 ms, when the log is closed, and by `flush`. Files are open only while
+/// they are written, so they may be read, moved and removed meanwhile.
 ///
-/// **Failures** are not reported. What cannot be written, or finds no memory, is lost. Without an alert, which alone
-/// could write, a log is switched off.
+/// **At the end of the process.** A process that ends normally, by a return from `main`, `exit` or on Windows
+/// `ExitProcess`, has all its lines in the files, those of static destructors included. A process that ends by a crash, a
+/// signal, `TerminateProcess` or on Linux `_exit` loses what was added since the alert last wrote: the lines of the last 8,192 ms,
+/// and those before them that still followed each other within 8,192 ms in a block that is not full. Call `flush` where
+/// lines must survive that.
 ///
-/// \thread  `out` and `newSession` are thread-safe; making, `init` and destruction belong to one thread, while nobody else
-///     uses the log
+/// **Failures** are reported by `flush` alone. Lines that the alert cannot write, or that find no memory, are lost. Without
+/// an alert a log is switched off.
+///
+/// \thread  `out`, `newSession` and `flush` are thread-safe; construction, `init` and destruction belong to one thread, while
+///     no other uses the log
 
 #ifndef ZOR_BASIS_LOG_LOG_H
 #define ZOR_BASIS_LOG_LOG_H
@@ -35,7 +41,7 @@
 
 namespace ZOR_Basis {
 
-class Logger;
+class LoggerImpl;
 
 class ZB_API Log {
 public:
@@ -64,8 +70,16 @@ public:
     /// \kept log-02: a session without a line has its file too, an empty one, unless it is the first
     void newSession();
 
+    /// Writes all lines to their files that have been added so far, and returns when the system has them. Lines that other
+    /// threads add meanwhile may be written, too.
+    /// \return true also where there is nothing to write, and where the log is switched off. False: a file could not be
+    ///     written; its lines stay in memory for the next attempt, part of them may then stand in the file twice
+    /// \error the last error says why
+    /// \cost the caller waits for the files
+    bool flush() const;
+
 private:
-    Logger* logger_ = nullptr;
+    LoggerImpl* logger_ = nullptr;
 };
 
 static_assert(sizeof(Log) == sizeof(void*));

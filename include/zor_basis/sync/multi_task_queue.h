@@ -1,16 +1,32 @@
 /// \file
-/// `MultiTaskQueue`: runs jobs, each in a task of its own, and lists them with their results.
+/// `MultiTaskQueue`: runs each job in a task of its own, and lists the jobs with their results. Its limit is the number of
+/// jobs that `add` starts before it lets others wait; it does not bound how many run, as `wait` starts all that are left.
 ///
-///     std::unique_ptr<MultiTaskQueue> queue(MultiTaskQueue::New(MultiTaskQueue::StopOnError, 4));
-///     for (Page& page : pages) queue->add(renderPage, &page, false, true, false);
-///     queue->wait();
+/// To bound how many run, start that many jobs and have each take one piece of work after the other:
+///
+///     struct Pages {
+///         std::vector<Page> all;
+///         std::atomic<std::size_t> next{0};
+///         static bool render(void* argument) {
+///             auto& pages = *static_cast<Pages*>(argument);
+///             bool good = true;
+///             for (std::size_t i; (i = pages.next++) < pages.all.size();) good = pages.all[i].render() && good;
+///             return good;
+///         }
+///     } pages;
+///     std::unique_ptr<MultiTaskQueue> queue(MultiTaskQueue::New(MultiTaskQueue::Continue, 4));
+///     for (int i = 0; i < 4; ++i) queue->add(Pages::render, &pages, false, true, false);
+///     queue->wait(); // never more than four pages at a time
 ///     if (queue->failed()) ...
 ///
-/// A job waits in the queue until a task is asked for; it runs then, at the same time as everything else, and finishes
-/// when its function returns. The limit says how many jobs `add` starts at once; it is no limit of what runs: jobs that are
-/// forced start whatever it says, and `wait` starts all that are left, provided that a job runs when it is called: a job
-/// that waits in a queue where none runs is started by nobody. The first failure marks the queue for good; what follows
-/// from it is the policy's.
+/// A job that is added waits, is started (a task was created for it) and finishes when its function returns. It waits
+/// where `add` finds as many running as the limit says, unless it is forced; `wait` starts all waiting jobs as soon as one
+/// job finishes. `wait` returns at once where none runs: a job that waits then is never started. The first failure marks
+/// the queue for good; the policy decides what follows from it.
+///
+/// A job's task does all that its end asks for, under the queue's mutex: it counts the job as finished, and removes its
+/// record and deletes an owned argument where that was wanted. The destructor of such an argument therefore runs on the
+/// thread of its job and must not wait for another job of the queue.
 ///
 /// \thread  one thread adds, waits and walks while jobs run in their tasks; jobs may add to their queue, too. One walk at a
 ///     time. A queue whose mutex the platform layer could not make is not guarded.
@@ -28,11 +44,11 @@ namespace ZOR_Basis {
 class ZB_API MultiTaskQueue {
 public:
     enum ErrPolicy : std::uint32_t {
-        Continue = 0,    ///< a failure is remembered, and that is all
-        StopOnError = 1, ///< after a failure no job is accepted and none started; so is any other value
+        Continue = 0,    ///< a failure is recorded and changes nothing else
+        StopOnError = 1, ///< after a failure no job is accepted and none is started; any other value means the same
     };
 
-    /// \param limit  jobs that run before `add` lets others wait; 0 and less: all wait that are not forced
+    /// \param limit  how many jobs run when `add` begins to let others wait; 0 or less: every job waits that is not forced
     /// \return owned by the caller; null where memory is short
     static MultiTaskQueue* New(ErrPolicy policy, int limit);
 
