@@ -15,7 +15,8 @@
 //   fail=FUNCTION    lets its next call fail
 //   touch=FILE       makes an empty file
 //   wait=FILE        waits until there is such a file, a minute at most
-//   background       another thread makes one with Create; tried=COUNT waits until it has tried so many names
+//   background       another thread makes one with Create; tried=COUNT waits until it has tried so many
+//                    more names
 //   join             waits for that thread: prints its path
 //   remove=FILE      removes a file
 //   unblock=FILE     removes that file as soon as a hundred names have been tried in vain
@@ -152,7 +153,7 @@ bool perform(std::string const& name, std::string const& value) {
     } else if (name == "background") {
         helper = std::thread([] { VDPTempDir::Create(madeByHelper); });
     } else if (name == "tried") {
-        return awaitAttempts(std::stoul(value));
+        return awaitAttempts(xos_HostCalls("xos_FileStatByNameEx") + std::stoul(value));
     } else if (name == "join") {
         joinHelper();
     } else if (name == "remove") {

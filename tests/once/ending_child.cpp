@@ -1,0 +1,86 @@
+// ending_child HOW: what holds before and after main.
+//   begin   prints which functions of the platform layer were called before main
+//   end     four threads use the library while main returns and a static object uses it in its destructor
+
+#include "host/xos_basics/control/functions.h"
+
+#include <zor_basis/log.h>
+#include <zor_basis/memory.h>
+#include <zor_basis/system.h>
+#include <zor_basis/timers.h>
+
+#include <xos_host.h>
+
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <thread>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+/// Used by threads that nobody waits for, so never destroyed.
+struct Tools {
+    Log log{"ending"};
+    TimerMgr* timers = TimerMgr::New("ending", 4);
+};
+Tools* tools = nullptr;
+
+void useAll(std::uint64_t timer) {
+    tools->log.out("line of %d", static_cast<int>(timer));
+    TimerMgr::start(tools->timers, timer);
+    FPath const temp = Sys::temp();
+    {
+        VDPTempDir const folder;
+        if (!folder.status() || folder.path().size() <= temp.size()) std::_Exit(3);
+    }
+    MemMgr* const small = MemMgr::makeSmlBlk(16, 4, 64, 8);
+    small->free(small->alloc());
+    delete small;
+    MemMgr* const standard = MemMgr::makeStd();
+    standard->free(standard->alloc(100), 100);
+    TimerMgr::stop(tools->timers, timer);
+}
+
+/// In the destructor of a static object.
+struct LastUser {
+    ~LastUser() {
+        if (tools == nullptr) return;
+        auto const end = std::chrono::steady_clock::now() + std::chrono::milliseconds(100);
+        while (std::chrono::steady_clock::now() < end) useAll(4);
+        std::puts("used to the end");
+        std::fflush(stdout);
+    }
+} const lastUser;
+
+void useInThreads() {
+    tools = new Tools;
+    tools->timers->setActive(true);
+    for (std::uint64_t timer : {1, 2, 3, 4}) TimerMgr::create(tools->timers, "stage", timer, true);
+    for (std::uint64_t timer : {1, 2, 3}) {
+        std::thread([timer] {
+            for (;;) useAll(timer);
+        }).detach();
+    }
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+}
+
+void printCalls() {
+    for (host::FunctionFacts const& function : host::FUNCTIONS) {
+        if (xos_HostCalls(function.name) != 0) std::puts(function.name);
+    }
+    std::puts("no other");
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    if (argc > 1 && argv[1] == std::string("end")) {
+        useInThreads();
+    } else {
+        printCalls();
+    }
+    return 0;
+}
