@@ -1,6 +1,7 @@
 // ending_child HOW: what holds before and after main.
 //   begin   prints which functions of the platform layer were called before main
-//   end     four threads use the library while main returns and a static object uses it in its destructor
+//   end     three threads use the library while main returns and a static object uses it in its destructor
+//   pause   the same, but the threads end before the static object does
 
 #include "host/xos_basics/control/functions.h"
 
@@ -11,6 +12,7 @@
 
 #include <xos_host.h>
 
+#include <atomic>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
@@ -27,6 +29,10 @@ struct Tools {
     TimerMgr* timers = TimerMgr::New("ending", 4);
 };
 Tools* tools = nullptr;
+constexpr int THREADS = 3;
+std::atomic<bool> mustEnd{false};
+std::atomic<int> ended{0};
+bool threadsEnd = false;
 
 void useAll(std::uint64_t timer) {
     tools->log.out("line of %d", static_cast<int>(timer));
@@ -50,6 +56,8 @@ struct LastUser {
         if (tools == nullptr) return;
         auto const end = std::chrono::steady_clock::now() + std::chrono::milliseconds(100);
         while (std::chrono::steady_clock::now() < end) useAll(4);
+        mustEnd = threadsEnd;
+        while (mustEnd && ended != THREADS) std::this_thread::yield();
         std::puts("used to the end");
         std::fflush(stdout);
     }
@@ -59,9 +67,10 @@ void useInThreads() {
     tools = new Tools;
     tools->timers->setActive(true);
     for (std::uint64_t timer : {1, 2, 3, 4}) TimerMgr::create(tools->timers, "stage", timer, true);
-    for (std::uint64_t timer : {1, 2, 3}) {
+    for (std::uint64_t timer = 1; timer <= THREADS; ++timer) {
         std::thread([timer] {
-            for (;;) useAll(timer);
+            while (!mustEnd) useAll(timer);
+            ++ended;
         }).detach();
     }
     std::this_thread::sleep_for(std::chrono::milliseconds(50));
@@ -77,10 +86,12 @@ void printCalls() {
 } // namespace
 
 int main(int argc, char** argv) {
-    if (argc > 1 && argv[1] == std::string("end")) {
-        useInThreads();
-    } else {
+    std::string const how = argc > 1 ? argv[1] : "";
+    threadsEnd = how == "pause";
+    if (how == "begin") {
         printCalls();
+    } else {
+        useInThreads();
     }
     return 0;
 }
