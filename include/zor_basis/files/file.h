@@ -26,6 +26,8 @@
 #include "zor_basis/files/i_file.h"
 #include "zor_basis/wide_char.h"
 
+#include <utility>
+
 namespace ZOR_Basis {
 
 class ZB_API File {
@@ -50,6 +52,15 @@ public:
     File(WChar const* path, int mode) { openW(path, mode); }
     File(File const&) = delete;
     File& operator=(File const&) = delete;
+    /// Takes over what the other holds, open or not; the other then holds nothing and may be opened again.
+    File(File&& other) noexcept : file_(std::exchange(other.file_, nullptr)) {}
+    /// The same, after closing what is held. Moving an object onto itself changes nothing.
+    File& operator=(File&& other) noexcept {
+        if (this == &other) return *this;
+        close();
+        file_ = std::exchange(other.file_, nullptr);
+        return *this;
+    }
     ~File() { close(); }
 
     /// Opens a file, after closing the one that is held. The backend stays attached where that fails; its own `isOpen()`
@@ -67,6 +78,11 @@ public:
 
     /// Whether something is held and open.
     bool isOpen() const { return file_ != nullptr && file_->isOpen(); }
+    /// The same in a condition: `if (file)`, `if (!file)`, `file && other`. Only a condition asks this. Initialising a
+    /// `bool` from a file (`bool held = file;`) and comparing one with null go by way of the pointer, and that is not null
+    /// for a file that could not be opened.
+    explicit operator bool() const { return isOpen(); }
+    bool operator!() const { return !isOpen(); }
     /// What is held, owned by this object; null if nothing is.
     IFile* ptr() const { return file_; }
     operator IFile*() const { return file_; }
