@@ -2,6 +2,8 @@
 
 #include "basis/containers/dict_index.h"
 #include "basis/containers/dict_records.h"
+#include "basis/files/replacement.h"
+#include "basis/files/system_calls.h"
 #include "zor_basis/files/file.h"
 
 #include <cstring>
@@ -13,18 +15,29 @@ constexpr int LOAD = File::FILE_READ | File::FILE_BINARY | File::FILE_SEQUENTIAL
 constexpr int SAVE = File::FILE_WRITE | File::FILE_TRUNC | File::FILE_BINARY | File::FILE_SEQUENTIAL;
 /// Leaves out the platform layer's flag 0x40.
 constexpr bool WITHOUT_CREATE_FLAG = true;
+constexpr int SAVE_BESIDE = SAVE | File::FILE_NOCREATEFLAG;
 
 bool isValue(Blob const& blob, RecordBytes bytes) {
     return blob.size() == bytes.size && (bytes.size == 0 || std::memcmp(blob.val(), bytes.place, bytes.size) == 0);
 }
 
-/// Puts the records of a file into an empty list.
-void load(IFile& file, SngList<DictEntry<Blob, Blob>>& list) {
+/// The size of a file as the system gives it; 0 where it gives none.
+std::uint64_t sizeOf(char const* path) {
+    xos_Stat status{};
+    return systemCalls.statusOfTarget(path, status) ? static_cast<std::uint64_t>(status.st_size_) : 0;
+}
+
+/// Whether the records are the whole file. A failing read looks like the file's end, so its size is asked for too.
+bool isWhole(RecordReader const& records, char const* path) {
+    return records.position() == records.arrived() && records.arrived() >= sizeOf(path);
+}
+
+/// Puts the records into an empty list.
+void load(RecordReader& records, SngList<DictEntry<Blob, Blob>>& list) {
     using Entry = DictEntry<Blob, Blob>;
     using Unit = SngList<Entry>::Unit;
     Blob const empty;
     DictIndex index;
-    RecordReader records(file);
     while (records.next()) {
         RecordBytes const key = records.key();
         RecordBytes const value = records.value();
@@ -109,9 +122,32 @@ void Dict<K, V>::intersect(Dict const& other) {
 template <class K, class V>
 bool Dict<K, V>::read() {
     clean();
+    found_ = DICT_NOT_READ;
+    understood_ = 0;
     File file;
     if (!file.open(path_, LOAD, WITHOUT_CREATE_FLAG)) return false;
-    load(*file.ptr(), *this);
+    RecordReader records(*file.ptr());
+    load(records, *this);
+    found_ = isWhole(records, path_) ? DICT_WHOLE : DICT_PART;
+    understood_ = records.position();
+    modified_ = false;
+    return true;
+}
+
+template <class K, class V>
+bool Dict<K, V>::put(IFile& file) const {
+    RecordWriter records(file);
+    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
+        if (!records.add(unit->value.key) || !records.add(unit->value.value)) return false;
+    }
+    return records.finish();
+}
+
+template <class K, class V>
+bool Dict<K, V>::save() {
+    Replacement replacement;
+    if (!replacement.open(path_, SAVE_BESIDE)) return false;
+    if (!put(replacement.content()) || !replacement.putInPlace()) return false;
     modified_ = false;
     return true;
 }
@@ -121,11 +157,7 @@ bool Dict<K, V>::write() {
     if (!modified_) return true;
     File file;
     if (!file.open(path_, SAVE, WITHOUT_CREATE_FLAG)) return false;
-    RecordWriter records(*file.ptr());
-    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
-        if (!records.add(unit->value.key) || !records.add(unit->value.value)) return false;
-    }
-    if (!records.finish()) return false;
+    if (!put(*file.ptr())) return false;
     modified_ = false;
     return true;
 }

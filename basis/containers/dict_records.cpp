@@ -14,6 +14,7 @@ constexpr std::uint64_t LENGTH_SIZE = 4;
 
 bool RecordReader::next() {
     at_ += length_;
+    position_ += length_;
     length_ = 0;
     return readField(fields_[0]) && readField(fields_[1]);
 }
@@ -41,6 +42,7 @@ bool RecordReader::fill() {
     ended_ = come != room;
     if (come > room) return false;
     buffer_.setSize(buffer_.size() + come);
+    arrived_ += come;
     return come != 0;
 }
 

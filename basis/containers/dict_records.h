@@ -30,6 +30,11 @@ public:
     RecordBytes key() const { return bytes(0); }
     RecordBytes value() const { return bytes(1); }
 
+    /// Where in the file the record begins, once `next` has failed the end of all complete ones.
+    std::uint64_t position() const { return position_; }
+    /// The bytes that the file has given.
+    std::uint64_t arrived() const { return arrived_; }
+
 private:
     struct Field {
         std::uint64_t offset; // from the record's begin
@@ -44,8 +49,10 @@ private:
 
     IFile& file_;
     Blob buffer_;
-    std::uint64_t at_ = 0;     // where the record begins
+    std::uint64_t at_ = 0;     // where the record begins in the buffer
     std::uint64_t length_ = 0; // what is known of it
+    std::uint64_t position_ = 0;
+    std::uint64_t arrived_ = 0;
     Field fields_[2] = {};
     bool ended_ = false;
 };

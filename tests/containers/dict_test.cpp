@@ -1,5 +1,6 @@
 #include <zor_basis/containers/dict.h>
 
+#include "tests/containers/dict_files.h"
 #include "tests/support/random_steps.h"
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"
@@ -9,29 +10,13 @@
 
 #include <algorithm>
 #include <chrono>
+#include <cstring>
 #include <map>
 #include <type_traits>
-#include <vector>
 
 using namespace ZOR_Basis;
 
 namespace {
-
-using BlobDict = Dict<Blob, Blob>;
-using BlobEntry = DictEntry<Blob, Blob>;
-using Pair = std::pair<std::string, std::string>;
-using Pairs = std::vector<Pair>;
-
-Blob blob(std::string const& bytes) { return {bytes.size(), bytes.data()}; }
-std::string text(Blob const& bytes) { return bytes.size() != 0 ? std::string(bytes.val(), bytes.size()) : ""; }
-
-std::string length(std::uint32_t n) { return std::string(reinterpret_cast<char const*>(&n), 4); }
-std::string field(std::string const& bytes) { return length(static_cast<std::uint32_t>(bytes.size())) + bytes; }
-std::string fileOf(Pairs const& pairs) {
-    std::string bytes;
-    for (Pair const& pair : pairs) bytes += field(pair.first) + field(pair.second);
-    return bytes;
-}
 
 /// A plain reading of a file: the complete records, as the list then has them.
 Pairs plainReading(std::string const& bytes) {
@@ -58,6 +43,24 @@ Pairs plainReading(std::string const& bytes) {
         }
     }
     return pairs;
+}
+
+/// How far a file is understood, read plainly.
+std::size_t plainEnd(std::string const& bytes) {
+    std::size_t end = 0;
+    for (std::size_t at = 0, fields = 1;; ++fields) {
+        std::uint32_t n = 0;
+        if (bytes.size() - at < 4) return end;
+        std::memcpy(&n, bytes.data() + at, 4);
+        if (bytes.size() - at - 4 < n) return end;
+        at += 4 + n;
+        if (fields % 2 == 0) end = at;
+    }
+}
+
+void expectFound(BlobDict const& dict, std::string const& bytes) {
+    EXPECT_EQ(dict.understood(), plainEnd(bytes));
+    EXPECT_EQ(dict.found(), plainEnd(bytes) == bytes.size() ? DICT_WHOLE : DICT_PART);
 }
 
 Pairs content(BlobDict& dict) {
@@ -256,6 +259,7 @@ TEST_F(DictTest, loads_all_complete_records_of_a_cut_file) {
         BlobDict dict{Str(path)};
         EXPECT_EQ(content(dict), plainReading(whole.substr(0, n)));
         EXPECT_TRUE(dict.read());
+        expectFound(dict, whole.substr(0, n));
         EXPECT_FALSE(needsSaving(dict));
     }
 }
@@ -326,6 +330,95 @@ TEST_F(DictTest, still_needs_saving_after_each_failure_to_write) {
         EXPECT_EQ(xos_HostCalls("xos_FileWriteEx"), skip + 1) << "nothing more is tried";
     }
     EXPECT_FALSE(needsSaving(dict));
+}
+
+TEST_F(DictTest, tells_what_it_found) {
+    struct Case {
+        Row row;
+        std::string bytes;
+        DictFile found;
+        std::uint64_t understood;
+    };
+    for (Case const& c : {
+             Case{{}, "", DICT_WHOLE, 0},
+             Case{{}, fileOf({{"A", "1"}}), DICT_WHOLE, 10},
+             Case{{}, fileOf({{"", ""}}), DICT_WHOLE, 8},
+             Case{{}, fileOf({{"A", "1"}, {"A", "2"}}), DICT_WHOLE, 20},
+             Case{{}, "x", DICT_PART, 0},
+             Case{{}, std::string(3, '\0'), DICT_PART, 0},
+             Case{{}, std::string(4, '\0'), DICT_PART, 0},
+             Case{{}, std::string(12, '\0'), DICT_PART, 8},
+             Case{{}, fileOf({{"A", "1"}}) + "x", DICT_PART, 10},
+             Case{{}, fileOf({{"A", "1"}}) + length(0xFFFFFFFF), DICT_PART, 10},
+             Case{{}, fileOf({{"A", "1"}}) + field("B") + length(2) + "1", DICT_PART, 10},
+             Case{{}, "PK\x03\x04 is no dictionary, but much longer than the lengths in it\n", DICT_PART, 0},
+         }) {
+        SCOPED_TRACE(c.row);
+        put(path, c.bytes);
+        BlobDict dict{Str(path)};
+        EXPECT_EQ(dict.found(), c.found);
+        EXPECT_EQ(dict.understood(), c.understood);
+        EXPECT_EQ(dict.size() != 0, c.understood != 0);
+        EXPECT_FALSE(needsSaving(dict)) << "as ever";
+        expectFound(dict, c.bytes);
+    }
+}
+
+TEST_F(DictTest, tells_what_the_last_reading_found) {
+    BlobDict dict;
+    EXPECT_EQ(dict.found(), DICT_NOT_READ);
+    EXPECT_EQ(dict.understood(), 0u);
+    EXPECT_FALSE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_NOT_READ);
+    put(path, fileOf({{"A", "1"}}) + "x");
+    dict.setPath(Str(path));
+    EXPECT_EQ(dict.found(), DICT_NOT_READ) << "another path is not read yet";
+    EXPECT_TRUE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_PART);
+    dict.set(blob("B"), blob("2"));
+    EXPECT_TRUE(dict.write());
+    EXPECT_EQ(dict.found(), DICT_PART) << "writing reads nothing";
+    EXPECT_TRUE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_WHOLE);
+    EXPECT_EQ(dict.understood(), 20u);
+    dict.clean();
+    EXPECT_EQ(dict.understood(), 20u);
+    dict.setPath(Str(scratch / "missing"));
+    EXPECT_FALSE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_NOT_READ);
+    EXPECT_EQ(dict.understood(), 0u);
+    EXPECT_EQ(BlobDict(Str(scratch / "missing")).found(), DICT_NOT_READ);
+}
+
+TEST_F(DictTest, tells_a_failure_to_read_from_the_end) {
+    // Records that end where pieces do: what has come looks like a whole file.
+    Pairs pairs;
+    for (std::uint32_t i = 0; i < 12'288; ++i) pairs.emplace_back(length(i), "1234");
+    std::string const whole = fileOf(pairs);
+    ASSERT_EQ(whole.size(), 3u * 65'536);
+    put(path, whole);
+    for (std::uint32_t skip : {0u, 1u, 2u, 3u, 4u}) {
+        SCOPED_TRACE(skip);
+        xos_HostFail("xos_FileReadEx", skip, 1);
+        BlobDict dict{Str(path)};
+        xos_HostFailClear();
+        EXPECT_EQ(dict.understood(), std::min(whole.size(), std::size_t{65'536} * skip));
+        EXPECT_EQ(dict.size(), dict.understood() / 16);
+        EXPECT_EQ(dict.found(), skip < 3 ? DICT_PART : DICT_WHOLE);
+    }
+}
+
+TEST_F(DictTest, asks_the_platform_for_nothing_more_to_tell_it) {
+    put(path, std::string(100'000, 'x'));
+    xos_HostCallsReset();
+    BlobDict const dict{Str(path)};
+    EXPECT_EQ(dict.found(), DICT_PART);
+    for (char const* function : {"xos_FileSeekEx", "xos_FileTellEx", "xos_FileStatByNameEx", "xos_FileGetsEx"}) {
+        EXPECT_EQ(xos_HostCalls(function), 0u) << function;
+    }
+    EXPECT_EQ(xos_HostCalls("xos_FileOpen"), 1u);
+    EXPECT_EQ(xos_HostCalls("xos_FileReadEx"), 2u);
+    EXPECT_EQ(xos_HostCalls("xos_FileCloseEx"), 1u);
 }
 
 TEST_F(DictTest, takes_a_failure_to_read_for_the_end) {
@@ -426,6 +519,7 @@ TEST_F(DictTest, survives_damaged_files) {
         put(path, bytes);
         BlobDict dict{Str(path)};
         ASSERT_EQ(content(dict), plainReading(bytes)) << "step " << step;
+        expectFound(dict, bytes);
     }
 }
 
