@@ -1,5 +1,7 @@
 #include "basis/timers/report_file.h"
 
+#include "basis/timers/complaint.h"
+#include "zor_basis/files/dir.h"
 #include "zor_basis/timers/pile_timer.h"
 
 #include <ctime>
@@ -12,6 +14,7 @@ namespace {
 constexpr int MODE = File::FILE_WRITE | File::FILE_APPEND | File::FILE_SEQUENTIAL | File::FILE_PLATFORM_EXTRA;
 static_assert(MODE == 0x226);
 
+constexpr bool WITHOUT_PARENTS = false;
 constexpr int MICROSECONDS = 1'000'000;
 
 struct Title {
@@ -24,6 +27,11 @@ constexpr Title TITLES[] = {
     {"Maximum count", 15}, {"Minimum", 15}, {"Suspend total", 15}, {"Suspend Max", 15}, {"Notes", 24},
 };
 
+void complainOf(FPath const& path) {
+    BufStr<255> message("TimerMgr::reset() - cannot open the report ");
+    complain(__LINE__, message.add(path));
+}
+
 std::int64_t secondsNow() { return std::time(nullptr); }
 
 } // namespace
@@ -35,7 +43,9 @@ ReportFile::ReportFile(FPath const& folder, Str const& manager, std::int32_t rip
     line_ << seconds << "_" << manager << "_" << rip << ".timer";
     FPath path(folder);
     path.add(line_);
-    file_.open(path.c_str(), MODE, true);
+    // The folder was made with the registry. A server that cleans up its root takes it away again.
+    Dir::New(folder.c_str(), WITHOUT_PARENTS);
+    if (!file_.open(path.c_str(), MODE, true)) complainOf(path);
     writeHead(seconds);
 }
 

@@ -14,10 +14,10 @@ namespace ZOR_Basis {
 
 class PileTimer;
 
-/// \error a file that cannot be opened swallows what is written
+/// \error a file that cannot be opened raises an assertion and swallows what is written
 class ReportFile {
 public:
-    /// Opens the file of this second and writes the head.
+    /// Makes the folder where it is missing, opens the file of this second and writes the head.
     ReportFile(FPath const& folder, Str const& manager, std::int32_t rip);
     /// Writes the row of a timer.
     void write(PileTimer const& timer);

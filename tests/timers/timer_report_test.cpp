@@ -5,6 +5,7 @@
 
 #include <xos_host.h>
 
+#include "tests/timers/assertions.h"
 #include "tests/timers/opened.h"
 #include "tests/timers/report_model.h"
 #include "tests/timers/scratch_root.h"
@@ -174,6 +175,51 @@ TEST_F(TimerReport, Kept_timers_10_resets_also_where_nothing_can_be_written) {
         EXPECT_EQ(content(std::to_string(secondsToTell) + "_fails_0.timer").substr(sizeof HEAD - 1),
                   modelRow("timer", {1, 7, 7, 7, 1, 7, 0, 0}, ',') + "\n");
     }
+}
+
+TEST_F(TimerReport, makes_its_folder_again_where_it_was_removed) {
+    Assertions heard;
+    TimerMgrImpl manager("again", 0);
+    fs::remove_all(folder());
+    manager.resetTimers(true);
+    EXPECT_EQ(content("1700000000_again_0.timer"), HEAD);
+    EXPECT_EQ(heard.take(), "");
+    xos_HostCallsReset();
+    manager.resetTimers(true);
+    EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 0u) << "one that is there is not made";
+    fs::remove_all(folder());
+    manager.resetTimers(false);
+    EXPECT_FALSE(fs::exists(folder())) << "only for a report";
+    fs::create_directories(folder());
+}
+
+TEST_F(TimerReport, tells_that_it_cannot_be_opened) {
+    Assertions heard;
+    TimerMgrImpl manager("lost", 0);
+    PileTimer* const timer = manager.createTimer("timer", 0, false);
+    pileMicroseconds(timer, 5);
+    std::string const message = "zor_basis TimerMgr::reset() - cannot open the report " +
+                                (folder() / "1700000000_lost_0.timer").generic_string();
+    auto const expectTold = [&](char const* how) {
+        manager.resetTimers(true);
+        std::string const told = heard.take();
+        EXPECT_EQ(told.substr(told.find(' ') + 1), message + ";") << how;
+    };
+    xos_HostFail("xos_FileOpen", 0, 1);
+    xos_HostCallsReset();
+    expectTold("a file that cannot be opened");
+    EXPECT_EQ(xos_HostCalls("xos_FileOpen"), 1u) << "it is not tried again";
+    EXPECT_NE(content("1700000000_lost_0.timer").find("Log"), 0u);
+    fs::remove_all(folder());
+    xos_HostFail("xos_DirCreateEx", 0, 1);
+    expectTold("a folder that cannot be made");
+    std::ofstream(folder()) << "no folder";
+    expectTold("a file in the folder's place");
+    fs::remove(folder());
+    fs::create_directories(folder());
+    manager.resetTimers(true);
+    EXPECT_EQ(heard.take(), "");
+    EXPECT_EQ(content("1700000000_lost_0.timer"), HEAD + modelRow("timer", {}, ',') + "\n") << "the timers were reset";
 }
 
 TEST_F(TimerReport, lacks_just_the_row_whose_write_fails) {

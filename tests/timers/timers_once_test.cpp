@@ -67,8 +67,11 @@ TEST_F(TimersOnce, takes_a_negative_rip_number) {
 
 TEST_F(TimersOnce, goes_on_without_a_folder) {
     std::string const root = root_.generic_string();
-    EXPECT_EQ(after({"new", "report", "get"}, root, "xos_DirCreateEx:0:1"), "report\nfound\n");
+    EXPECT_EQ(after({"new", "report", "get"}, root, "xos_DirCreateEx:0:2"), "report\nfound\n");
     EXPECT_FALSE(fs::exists(root_ / "timer"));
+    EXPECT_EQ(after({"new", "report", "get"}, root, "xos_DirCreateEx:0:1"), "report\nfound\n");
+    EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_0.timer"}))
+        << "made for the report, when it was not with the registry";
     EXPECT_EQ(after({"new", "report", "get"}, (root_ / "missing").generic_string()), "report\nfound\n");
     EXPECT_FALSE(fs::exists(root_ / "missing")) << "parents are not made";
 }

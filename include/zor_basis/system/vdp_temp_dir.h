@@ -6,6 +6,11 @@
 /// with others calls `Init` with a number of its own first: from then on its folders lie in "vdp_tmp" there and have that
 /// number behind the suffix, as "12.r3".
 ///
+/// Two programs with one root share their folders unless each calls `Init` with a number of its own: both then begin with
+/// "tmp/1.r", the second uses the first one's folder with all that lies in it (`temp-02`), and whichever job ends first
+/// removes it under the other. That holds for two runs of one program, too, and for programs without a root that are started
+/// in one folder.
+///
 /// The class may be used until the process ends, in static destructors too.
 ///
 /// \thread  thread-safe: one thread at a time makes a folder, and one process of a user at a time chooses its common

@@ -49,6 +49,8 @@ public:
     /// Resets all timers, as `PileTimer::reset` does.
     /// \param print  writes a report first
     /// \kept timers-10: the timers are reset also where the report cannot be written
+    /// \error a report that cannot be opened: assertion "TimerMgr::reset() - cannot open the report PATH". The folder "timer"
+    ///     is made first where it is missing, the root is not
     virtual void resetTimers(bool print) = 0;
 
     /// The registry of all managers, made at the first use of any manager together with the report folder.
