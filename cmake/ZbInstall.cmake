@@ -9,6 +9,12 @@ install(TARGETS ${zb_libraries} EXPORT zor_basis
   RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR}
   LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
   ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR})
+if(MINGW)
+  # With -static the linker takes -lNAME from libNAME.a alone, and an import library serves as one.
+  foreach(library IN LISTS zb_libraries)
+    install(FILES $<TARGET_LINKER_FILE:${library}> DESTINATION ${CMAKE_INSTALL_LIBDIR} RENAME lib${library}.a)
+  endforeach()
+endif()
 install(EXPORT zor_basis NAMESPACE zor_basis:: DESTINATION ${zb_package_dir})
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} FILES_MATCHING PATTERN "*.h")
 install(FILES ${PROJECT_SOURCE_DIR}/host/include/xos_host.h DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
