@@ -3,26 +3,17 @@
 #include "basis/crypto/cr_hash_impl.h"
 #include "zor_basis/text/blob.h"
 
-#include <algorithm>
-#include <limits>
-
 namespace ZOR_Basis {
 namespace {
 
 /// The service counts with 32 bits.
 constexpr std::uint64_t LARGEST_PIECE = std::uint64_t{1} << 30;
 
-std::uint32_t roomOf(Blob const& blob) {
-    return static_cast<std::uint32_t>(
-        std::min<std::uint64_t>(blob.sizeBuf(), std::numeric_limits<std::uint32_t>::max()));
-}
-
 bool exportTo(Blob& out, CryptService::Handle key) {
     std::uint32_t n = 0;
     if (!cryptService.exportKey(key, nullptr, n)) return false;
     out.alloc(n, false);
     if (out.sizeBuf() < n) return false;
-    n = roomOf(out);
     if (!cryptService.exportKey(key, out.buf(), n)) return false;
     out.setSize(n);
     return true;

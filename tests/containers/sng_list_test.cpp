@@ -115,6 +115,48 @@ TEST(SngList, deletes_its_units) {
     EXPECT_EQ(Item::living, 0);
 }
 
+namespace {
+
+/// A value that tells when it ends.
+struct Teller {
+    explicit Teller(int n) : number(n) {}
+    Teller(Teller const&) = default;
+    Teller& operator=(Teller const&) = default;
+    ~Teller() { told.push_back(number); }
+
+    int number;
+    static std::vector<int> told;
+};
+std::vector<int> Teller::told;
+
+void fill(SngList<Teller>& list) {
+    for (int i : {3, 1, 2}) list.insertBack(Teller(i));
+    Teller::told.clear();
+}
+
+} // namespace
+
+TEST(SngList, deletes_its_units_from_the_front) {
+    SngList<Teller> list;
+    fill(list);
+    list.clear();
+    EXPECT_EQ(Teller::told, (std::vector<int>{3, 1, 2}));
+    fill(list);
+    list.reverse();
+    list.insertFront(new SngList<Teller>::Unit{nullptr, Teller(4)});
+    Teller::told.clear();
+    list.clear();
+    EXPECT_EQ(Teller::told, (std::vector<int>{4, 2, 1, 3})) << "as they stand, not as they came";
+    {
+        SngList<Teller> other;
+        fill(other);
+    }
+    EXPECT_EQ(Teller::told, (std::vector<int>{3, 1, 2})) << "at the end of its life";
+    fill(list);
+    list = SngList<Teller>();
+    EXPECT_EQ(Teller::told, (std::vector<int>{3, 1, 2})) << "before others are assigned";
+}
+
 TEST(SngList, copies_values_into_units_of_its_own) {
     List list = make({{1, 0}, {2, 0}});
     List copy(list);

@@ -11,6 +11,7 @@
 #include <cstring>
 #include <map>
 #include <set>
+#include <utility>
 #include <vector>
 
 using namespace ZOR_Basis;
@@ -28,6 +29,8 @@ struct Record {
     std::vector<bool> newKeySets;
     std::vector<bool> exportables;
     std::vector<std::uint32_t> pieces;
+    /// Whether an export had a block, and the length that it was given.
+    std::vector<std::pair<bool, std::uint32_t>> exported;
     bool readsData = true;
     std::set<Handle> hashes, keys;
     std::size_t wronglyDestroyed = 0;
@@ -69,6 +72,7 @@ bool deriveKey(Handle provider, Handle hash, bool exportable, Handle& key) {
     return true;
 }
 bool exportKey(Handle key, char* blob, std::uint32_t& n) {
+    record->exported.emplace_back(blob != nullptr, n);
     return record->goesOn(blob == nullptr ? "exportLength" : "exportKey") && record->real.exportKey(key, blob, n);
 }
 bool encrypt(Handle key, char* data, std::uint32_t& n, std::uint32_t room) {
@@ -212,6 +216,38 @@ TEST_F(CryptServiceTest, may_refuse_to_export) {
             EXPECT_TRUE(record_.keys.empty());
         }
     }
+}
+
+TEST_F(CryptServiceTest, is_asked_to_export_by_the_length_that_it_told) {
+    CryptUser const user;
+    for (std::uint64_t room : {0, 5, 27, 28, 29, 100}) {
+        SCOPED_TRACE(room);
+        SecretBlob out;
+        out.alloc(room, false);
+        record_.exported.clear();
+        EXPECT_TRUE(user.hash("secret")->exportKey(out));
+        EXPECT_EQ(record_.exported, (std::vector<std::pair<bool, std::uint32_t>>{{false, 0}, {true, 28}}))
+            << "whatever room there is";
+        EXPECT_EQ(out.size(), 28u);
+    }
+}
+
+TEST_F(CryptServiceTest, may_export_less_than_it_told) {
+    CryptUser const user;
+    static bool (*real)(Handle, char*, std::uint32_t&);
+    real = cryptService.exportKey;
+    cryptService.exportKey = [](Handle key, char* blob, std::uint32_t& n) {
+        if (blob == nullptr) {
+            n = 40;
+            return true;
+        }
+        EXPECT_EQ(n, 40u);
+        return real(key, blob, n);
+    };
+    SecretBlob out;
+    EXPECT_TRUE(user.hash("secret")->exportKey(out));
+    EXPECT_EQ(out.size(), 28u);
+    EXPECT_EQ(out.sizeBuf(), 40u);
 }
 
 TEST_F(CryptServiceTest, Kept_crypto_04_may_refuse_to_encrypt_and_leaves_the_message) {

@@ -117,10 +117,13 @@ TEST_F(LocalDisks, are_fixed_optical_or_in_memory) {
         EXPECT_EQ(volumeRoom, 256u);
     }
     kind = DRIVE_FIXED;
-    std::string const longPath = "V:\\" + std::string(1000, 'x');
-    EXPECT_TRUE(Sys::isLocalDisk(longPath));
-    EXPECT_GE(volumeRoom, longPath.size());
-    EXPECT_EQ(askedVolume, longPath);
+    for (std::size_t size : {3u, 254u, 255u, 256u, 257u, 300u, 1000u, 40'000u}) {
+        std::string const longPath = "V:\\" + std::string(size - 3, 'x');
+        EXPECT_TRUE(Sys::isLocalDisk(longPath));
+        EXPECT_EQ(volumeRoom, std::max<std::size_t>(256, size + 1))
+            << "the path with its terminator, 256 bytes at least";
+        EXPECT_EQ(askedVolume, longPath);
+    }
     EXPECT_TRUE(Sys::isLocalDisk(Str("V:\\x\\y", 4)));
     EXPECT_EQ(askedVolume, "V:\\x") << "a view ends where it ends";
 }
