@@ -23,7 +23,8 @@ public:
     /// \param entry  never null; valid during the call
     /// \return false is a failure; it ends a walk with `stopOnFalse`
     virtual bool perform(FileEntry* entry) = 0;
-    /// Asked before every entry and every directory. True ends the walk at all its levels and leaves its result as it is.
+    /// Asked before every name of a listing, also before the end of it is found, and once more in each directory when its
+    /// own entries are done. True ends the walk at all its levels, each of which asks again, and leaves its result as it is.
     /// \return false in this class
     virtual bool stop();
     virtual ~FileVisitor();
