@@ -26,7 +26,8 @@ bool isPassedOver(char const* name) {
 FileEntry entryOf(FPath const& dir, char const* name, bool platformFallback) {
     FStat const status(FPath(dir, name), platformFallback);
     // kept walk-02: visitors handle two kinds, and removing or copying a tree is what suits the rest.
-    return {status.isFile() ? FStat::ST_FILE : FStat::ST_DIR, dir, name, status.size(), status.modified()};
+    if (status.isFile()) return {FStat::ST_FILE, dir, name, status.size(), status.modified()};
+    return {FStat::ST_DIR, dir, name, 0, status.modified()};
 }
 
 } // namespace

@@ -40,7 +40,7 @@ public:
     /// Takes a new snapshot.
     /// \param platformFallback  asks the platform layer where the system finds nothing: it may reach shares with other
     ///        credentials
-    /// \return whether there is an entry; a null path has none
+    /// \return whether there is an entry; a null path is the empty one, which has none
     /// \cost one system call for an entry that is there
     bool update(char const* path) { return update(path, true); }
     bool update(char const* path, bool platformFallback);

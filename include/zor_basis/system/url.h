@@ -22,7 +22,7 @@ public:
     /// \param first  handed on to the platform layer with `second`; stand-alone they are user name and password, or null
     /// \param overwrite  may replace what is at the target
     /// \param makeDirectory  first makes the directory that is to hold the target, with its parents; stays also when fetching
-    ///        fails
+    ///        fails. A bare name ("page.ps") has no directory in it that could be made, and fails: write "./page.ps"
     /// \return false, with nothing fetched, where that cannot be made, or something is there that may not be replaced; else
     ///         whether the platform layer has fetched it
     /// \thread any

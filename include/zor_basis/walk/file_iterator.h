@@ -24,7 +24,7 @@
 ///
 /// \kept walk-01: the two uses differ for `LOOK_ALL`, as tabled above
 /// \kept walk-02: an entry of a walk is a file where its status says regular file; all else is reported as a directory:
-///     links, devices, and what has gone meanwhile
+///     links, devices, and what has gone meanwhile. Only files have a size
 /// \kept walk-03: walks neither report nor enter an entry of the exact name "__MACOS"; the flat listing gives it
 /// \kept walk-04: sub-directories are entered whatever the wildcard and the condition say of them
 /// \kept walk-05: the result is that of the last `perform`, so that without `stopOnFalse` a later success hides a failure; a
