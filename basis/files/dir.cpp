@@ -1,5 +1,6 @@
 #include "zor_basis/files/dir.h"
 
+#include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
 #include "basis/files/system_calls.h"
@@ -49,7 +50,7 @@ struct Wide {
 
 template <class Kind>
 bool isOrBecomesDirectory(typename Kind::Path const& path, Place place) {
-    if (place == Place::BLOCKED) return false;
+    if (place == Place::BLOCKED) return refuse(Reason::NOT_DIRECTORY);
     return place == Place::DIRECTORY || Kind::make(path);
 }
 
@@ -82,7 +83,7 @@ bool ensure(typename Kind::Path const& whole) {
 template <class Kind>
 bool newFor(typename Kind::Path parent) {
     std::uint64_t const name = parent.offsetName();
-    if (name == 0) return false;
+    if (name == 0) return refuse(Reason::BAD_ARGUMENT);
     // kept dir-02: cutting before the first character is read as not cutting.
     if (name > 1) parent.cut(name - 1);
     return ensure<Kind>(parent);
@@ -92,7 +93,7 @@ template <class Kind>
 bool makeNew(typename Kind::Path const& path, bool makeParents) {
     Place const place = Kind::look(path);
     if (place == Place::DIRECTORY) return true;
-    if (place == Place::BLOCKED) return false;
+    if (place == Place::BLOCKED) return refuse(Reason::ALREADY_THERE);
     // kept dir-01: the parent of a bare name is the current directory, which nobody can make.
     return (!makeParents || newFor<Kind>(path)) && Kind::make(path);
 }
@@ -109,7 +110,7 @@ bool Dir::NewForW(WChar const* path) { return newFor<Wide>(path); }
 bool Dir::Rem(char const* path, bool recursive, bool flagB) {
     FStat const entry(path);
     if (!entry.exist()) return true;
-    if (entry.isFile()) return false;
+    if (entry.isFile()) return refuse(Reason::NOT_DIRECTORY);
     return xos_DirRemove(orEmpty(path), REMOVE_ALWAYS | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
 }
 
@@ -124,6 +125,7 @@ bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
     if (xos_DirMove(orEmpty(dst), orEmpty(src), flags) == 0) return true;
     bool const copied = xos_DirCopy(orEmpty(dst), orEmpty(src), flags | RECURSIVE) == 0;
     // kept dir-03: who moves wants the source gone, and jobs are sent again rather than found twice.
+    KeepLastError const whyNotCopied;
     Rem(src, true, flagB);
     return copied;
 }
@@ -136,7 +138,7 @@ bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
     existing.clear();
     rest.clear();
     FPath const whole(path);
-    if (whole.size() < 3) return false;
+    if (whole.size() < 3) return refuse(Reason::BAD_ARGUMENT);
 
     auto const exists = [&](std::uint64_t length) { return FStat::exist(existing.copy(whole.c_str(), length)); };
     existing = whole;

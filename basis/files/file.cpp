@@ -1,6 +1,7 @@
 #include "zor_basis/files/file.h"
 
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
 #include "zor_basis/files/dir.h"
@@ -38,7 +39,7 @@ bool touch(char const* path) {
 
 bool isFileNow(char const* path) {
     FStat const entry(path);
-    if (entry.exist() && !entry.isFile()) return false;
+    if (entry.exist() && !entry.isFile()) return refuse(Reason::ALREADY_THERE);
     return entry.isFile();
 }
 
@@ -72,10 +73,11 @@ void File::close() {
 
 bool File::New(char const* path, bool makeDirs) {
     FStat const entry(path);
-    if (entry.isDir()) return false;
+    if (entry.isDir()) return refuse(Reason::IS_DIRECTORY);
     if (entry.isFile()) return true;
     if (makeDirs && !Dir::NewFor(path)) return false;
     if (touch(path)) return isFileNow(path);
+    KeepLastError const whyNotMade;
     return FStat::isFile(path);
 }
 
@@ -94,6 +96,7 @@ bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs)
     bool const hasPlace = !makeDirs || Dir::NewFor(dst);
     bool const copied = hasPlace && copy(dst, src, overwrite);
     // kept file-04: who moves wants the source gone, and jobs are sent again rather than found twice.
+    KeepLastError const whyNotCopied;
     remove(src);
     return copied;
 }
@@ -101,7 +104,7 @@ bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs)
 bool File::LinkOrCopy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     FStat const entry(dst);
     if (entry.exist()) {
-        if (!overwrite) return false;
+        if (!overwrite) return refuse(Reason::ALREADY_THERE);
         if (!removeEntry(dst, entry)) return false;
     } else if (makeDirs && !Dir::NewFor(dst)) {
         return false;

@@ -1,4 +1,5 @@
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
 #include "zor_basis/files/file.h"
 
@@ -26,6 +27,7 @@ FileXosBasics::FileXosBasics(char const* path, int mode)
 
 FileXosBasics::~FileXosBasics() {
     if (handle_ == 0) return;
+    KeepLastError const keep;
     xos_FileCloseEx(handle_, 0);
 }
 

@@ -11,6 +11,7 @@
 /// The members of the list are there too. What is changed through them `write` does not notice, and keys must stay
 /// different.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_CONTAINERS_DICT_H

@@ -7,6 +7,7 @@
 ///
 /// On Linux a symbolic link is neither a file nor a directory, except where a function says otherwise.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  thread-safe as far as the file system is
 
 #ifndef ZOR_BASIS_FILES_DIR_H

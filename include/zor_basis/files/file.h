@@ -20,6 +20,7 @@
 /// **`makeDirs` wants a slash.** A bare name ("page.ps") has no folder in it that could be made, so that `makeDirs` fails for
 /// it, also where the file could be made in the current folder. Write "./page.ps" (dir-01).
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time for each object; the static operations are thread-safe as far as the file system is
 
 #ifndef ZOR_BASIS_FILES_FILE_H

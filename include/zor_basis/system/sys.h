@@ -15,6 +15,7 @@
 ///
 /// A registry value longer than 512 bytes, or of a type that is no text, counts as missing unless told otherwise.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  thread-safe. Acting as a user is a matter of the calling thread alone; on Linux threads that it starts
 ///     meanwhile inherit it
 

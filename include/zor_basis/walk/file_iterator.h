@@ -31,6 +31,7 @@
 ///     deep walk's is that of its last sub-directory, true without one: it is true unless `stopOnFalse` or `stop` ends it
 /// \kept walk-06: a directory that cannot be opened is empty: a walk of it is true, and calls the visitor never
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_WALK_FILE_ITERATOR_H
