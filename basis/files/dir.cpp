@@ -1,5 +1,6 @@
 #include "zor_basis/files/dir.h"
 
+#include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
 #include "basis/files/system_calls.h"
@@ -8,6 +9,8 @@
 
 namespace ZOR_Basis {
 namespace {
+
+using PathRules::orEmpty;
 
 /// What stands in the way of a directory, or is one.
 enum class Place { FREE, DIRECTORY, BLOCKED };
@@ -47,7 +50,8 @@ struct Wide {
 
 template <class Kind>
 bool isOrBecomesDirectory(typename Kind::Path const& path, Place place) {
-    return place == Place::DIRECTORY || (place == Place::FREE && Kind::make(path));
+    if (place == Place::BLOCKED) return refuse(Reason::NOT_DIRECTORY);
+    return place == Place::DIRECTORY || Kind::make(path);
 }
 
 /// The end of the component behind the one that ends at `end`.
@@ -79,7 +83,7 @@ bool ensure(typename Kind::Path const& whole) {
 template <class Kind>
 bool newFor(typename Kind::Path parent) {
     std::uint64_t const name = parent.offsetName();
-    if (name == 0) return false;
+    if (name == 0) return refuse(Reason::BAD_ARGUMENT);
     // kept dir-02: cutting before the first character is read as not cutting.
     if (name > 1) parent.cut(name - 1);
     return ensure<Kind>(parent);
@@ -88,7 +92,8 @@ bool newFor(typename Kind::Path parent) {
 template <class Kind>
 bool makeNew(typename Kind::Path const& path, bool makeParents) {
     Place const place = Kind::look(path);
-    if (place != Place::FREE) return place == Place::DIRECTORY;
+    if (place == Place::DIRECTORY) return true;
+    if (place == Place::BLOCKED) return refuse(Reason::ALREADY_THERE);
     // kept dir-01: the parent of a bare name is the current directory, which nobody can make.
     return (!makeParents || newFor<Kind>(path)) && Kind::make(path);
 }
@@ -105,25 +110,27 @@ bool Dir::NewForW(WChar const* path) { return newFor<Wide>(path); }
 bool Dir::Rem(char const* path, bool recursive, bool flagB) {
     FStat const entry(path);
     if (!entry.exist()) return true;
-    if (entry.isFile()) return false;
-    return xos_DirRemove(path, REMOVE_ALWAYS | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
+    if (entry.isFile()) return refuse(Reason::NOT_DIRECTORY);
+    return xos_DirRemove(orEmpty(path), REMOVE_ALWAYS | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
 }
 
 bool Dir::Copy(char const* dst, char const* src, bool recursive, bool overwrite, bool flagB) {
-    return xos_DirCopy(dst, src,
-                       flagIf(overwrite, OVERWRITE) | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG)) == 0;
+    std::uint32_t const flags =
+        flagIf(overwrite, OVERWRITE) | flagIf(recursive, RECURSIVE) | flagIf(flagB, SECOND_FLAG);
+    return xos_DirCopy(orEmpty(dst), orEmpty(src), flags) == 0;
 }
 
 bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
     std::uint32_t const flags = flagIf(overwrite, OVERWRITE) | flagIf(flagB, SECOND_FLAG);
-    if (xos_DirMove(dst, src, flags) == 0) return true;
-    bool const copied = xos_DirCopy(dst, src, flags | RECURSIVE) == 0;
+    if (xos_DirMove(orEmpty(dst), orEmpty(src), flags) == 0) return true;
+    bool const copied = xos_DirCopy(orEmpty(dst), orEmpty(src), flags | RECURSIVE) == 0;
     // kept dir-03: who moves wants the source gone, and jobs are sent again rather than found twice.
+    KeepLastError const whyNotCopied;
     Rem(src, true, flagB);
     return copied;
 }
 
-bool Dir::Link(char const* dst, char const* src) { return xos_FileHardLink(src, dst) == 0; }
+bool Dir::Link(char const* dst, char const* src) { return xos_FileHardLink(orEmpty(src), orEmpty(dst)) == 0; }
 
 bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
     // kept dir-04: where only a first component could exist, there is nothing to split off.
@@ -131,19 +138,21 @@ bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
     existing.clear();
     rest.clear();
     FPath const whole(path);
-    if (whole.size() < 3) return false;
+    if (whole.size() < 3) return refuse(Reason::BAD_ARGUMENT);
 
-    // Existing components that end in a slash belong to the rest as a whole, without that slash.
+    auto const exists = [&](std::uint64_t length) { return FStat::exist(existing.copy(whole.c_str(), length)); };
+    existing = whole;
     std::uint64_t end = whole.size() - 1;
-    while (whole.isSlash(end) && FStat::exist(FPath(whole, end))) {
+    while (whole.isSlash(end)) {
+        if (!exists(end)) {
+            existing.copy(whole.c_str(), end + 1);
+            break;
+        }
         if (--end == FIRST_INDEX) return false;
     }
     for (std::uint64_t slash = end - 1; slash > FIRST_INDEX; --slash) {
-        if (!whole.isSlash(slash)) continue;
-        FPath const above(whole, slash);
-        if (!FStat::exist(above)) continue;
-        existing = above;
-        rest = FPath(whole.c_str() + slash + 1, end - slash);
+        if (!whole.isSlash(slash) || !exists(slash)) continue;
+        rest.copy(whole.c_str() + slash + 1, end - slash);
         return true;
     }
     return false;

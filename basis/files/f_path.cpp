@@ -12,11 +12,16 @@ namespace {
 
 using Path = PathText<NarrowPathKind>;
 
+/// Whether a path lies under the root already and so needs no translation. Every path begins with an unknown root's empty
+/// text: nothing can be translated to it. All absolute paths lie under "/", which says nothing about fake roots.
+bool isUnder(RootFolder::Root const& root, char const* text, std::uint64_t length) {
+    std::uint64_t const size = root.text.size();
+    return !root.isFileSystem && length >= size && std::memcmp(text, root.text.c_str(), size) == 0;
+}
+
 /// The length of the fake root at the front, the slash before it not counted; 0 without one.
-std::uint64_t fakeRoot(char const* text, std::uint64_t length, BufStr<255> const& root) {
-    if (length == 0 || !PathRules::isSlash(*text)) return 0;
-    bool const underRoot = !root.empty() && length >= root.size() && std::memcmp(text, root.c_str(), root.size()) == 0;
-    if (underRoot) return 0;
+std::uint64_t fakeRoot(char const* text, std::uint64_t length, RootFolder::Root const& root) {
+    if (length == 0 || !PathRules::isSlash(*text) || isUnder(root, text, length)) return 0;
     for (std::uint64_t i = 0; i < PathRules::FAKE_ROOTS; ++i) {
         std::uint64_t const end = 1 + PathRules::FAKE_ROOT_LENGTH[i];
         if (length < end || std::memcmp(text + 1, PathRules::FAKE_ROOT<char>[i], end - 1) != 0) continue;
@@ -72,7 +77,7 @@ void FPath::replaceSlashes(char* text) {
 
 FPath& FPath::translateRoot() {
     RootFolder::Root const& root = RootFolder::get();
-    if (std::uint64_t const fake = fakeRoot(text_, size_, root.text)) {
+    if (std::uint64_t const fake = fakeRoot(text_, size_, root)) {
         Str const folder = rootBefore(root, text_ + 1 + fake);
         BufStr::replace(0, 1 + fake, folder.c_str(), folder.size());
     }
@@ -95,7 +100,7 @@ bool FPath::isAbsolute(char const* text) { return PathRules::isAbsolute(Path::or
 bool FPath::isDos(char const* text) { return PathRules::isDos(Path::orEmpty(text)); }
 bool FPath::isURL(char const* text) { return PathRules::isURL(Path::orEmpty(text)); }
 bool FPath::isWildCard(char const* text) { return PathRules::isWildCard(Path::orEmpty(text)); }
-bool FPath::isFake(char const* text) { return fakeRoot(text, Path::lengthOf(text, 0), RootFolder::get().text) != 0; }
+bool FPath::isFake(char const* text) { return fakeRoot(text, Path::lengthOf(text, 0), RootFolder::get()) != 0; }
 bool FPath::matchWildCard(char const* pattern, char const* name) { return Path::matchWildCard(pattern, name); }
 bool FPath::isSub(char const* path, char const* dir) { return PathRules::isSub(path, dir); }
 std::uint64_t FPath::offsetName(char const* text, std::uint64_t len) { return Path::offsetName(text, len); }

@@ -1,5 +1,6 @@
 #include "zor_basis/files/f_stat.h"
 
+#include "basis/files/path_rules.h"
 #include "basis/files/system_calls.h"
 
 namespace ZOR_Basis {
@@ -59,9 +60,10 @@ private:
 
 bool FStat::update(char const* path, bool platformFallback) {
     *this = FStat();
+    path = PathRules::orEmpty(path);
     xos_Stat record{};
     if (!systemCalls.status(path, record)) {
-        if (!platformFallback || path == nullptr || xos_FileStatByNameEx(path, &record, 0x4000) != 0) return false;
+        if (!platformFallback || xos_FileStatByNameEx(path, &record, 0x4000) != 0) return false;
     }
     type_ = kindOf(record.st_mode_);
     modified_ = record.st_mtime_;
@@ -74,8 +76,9 @@ bool FStat::update(char const* path, bool platformFallback) {
 bool FStat::updateW(WChar const* path) {
     *this = FStat();
     xos_Stat record{};
-    if (!systemCalls.statusWide(path, record)) return false;
-    // kept stat-02: wide callers list directories and take everything else for something to open.
+    if (!systemCalls.statusWide(PathRules::orEmpty(path), record)) return false;
+    // kept stat-02: wide callers list directories and take everything else for something to open. The type bits are a
+    // number: a socket's have the directory's bit, too, and it is none.
     type_ = (record.st_mode_ & MODE_TYPE) == MODE_DIRECTORY ? ST_DIR : ST_FILE;
     modified_ = record.st_mtime_;
     created_ = record.st_ctime_;

@@ -1,6 +1,8 @@
 #include "zor_basis/files/file.h"
 
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
+#include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
 #include "zor_basis/files/dir.h"
 #include "zor_basis/files/f_stat.h"
@@ -9,6 +11,8 @@
 
 namespace ZOR_Basis {
 namespace {
+
+using PathRules::orEmpty;
 
 constexpr std::uint32_t WRITE_AND_CREATE = 0x54;
 
@@ -20,9 +24,24 @@ IFile* makeBackend(char const* path, int mode, bool flag) {
     return new (std::nothrow) FileStdDir(path, mode);
 }
 
-bool remove(char const* path) { return xos_FileRemove(path, REMOVE_ALWAYS) == 0; }
+bool remove(char const* path) { return xos_FileRemove(orEmpty(path), REMOVE_ALWAYS) == 0; }
 
-bool copy(char const* dst, char const* src, bool overwrite) { return xos_FileCopy(dst, src, overwrite ? 1 : 0) == 0; }
+bool copy(char const* dst, char const* src, bool overwrite) {
+    return xos_FileCopy(orEmpty(dst), orEmpty(src), overwrite ? 1 : 0) == 0;
+}
+
+/// Opens a file, which makes it where nothing is.
+bool touch(char const* path) {
+    xos_File const made = xos_FileOpen(orEmpty(path), WRITE_AND_CREATE);
+    if (made != 0) xos_FileCloseEx(made, 0);
+    return made != 0;
+}
+
+bool isFileNow(char const* path) {
+    FStat const entry(path);
+    if (entry.exist() && !entry.isFile()) return refuse(Reason::ALREADY_THERE);
+    return entry.isFile();
+}
 
 bool removeEntry(char const* path, FStat const& entry) {
     return entry.isDir() ? Dir::Rem(path, true, false) : remove(path);
@@ -53,18 +72,17 @@ void File::close() {
 }
 
 bool File::New(char const* path, bool makeDirs) {
-    FStat entry(path);
-    if (entry.isDir()) return false;
+    FStat const entry(path);
+    if (entry.isDir()) return refuse(Reason::IS_DIRECTORY);
     if (entry.isFile()) return true;
     if (makeDirs && !Dir::NewFor(path)) return false;
-    xos_File const made = xos_FileOpen(path, WRITE_AND_CREATE);
-    if (made != 0) xos_FileCloseEx(made, 0);
-    entry.update(path);
-    return entry.isFile();
+    if (touch(path)) return isFileNow(path);
+    KeepLastError const whyNotMade;
+    return FStat::isFile(path);
 }
 
 bool File::Rem(char const* path, bool flagA, bool flagB) {
-    return xos_FileRemove(path, flagIf(flagA, REMOVE_ALWAYS) | flagIf(flagB, SECOND_FLAG)) == 0;
+    return xos_FileRemove(orEmpty(path), flagIf(flagA, REMOVE_ALWAYS) | flagIf(flagB, SECOND_FLAG)) == 0;
 }
 
 bool File::Copy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
@@ -74,10 +92,11 @@ bool File::Copy(char const* dst, char const* src, bool overwrite, bool makeDirs)
 
 bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     if (makeDirs && !Dir::NewFor(dst)) return false;
-    if (xos_FileMove(dst, src, overwrite ? 1 : 0) == 0) return true;
+    if (xos_FileMove(orEmpty(dst), orEmpty(src), overwrite ? 1 : 0) == 0) return true;
     bool const hasPlace = !makeDirs || Dir::NewFor(dst);
     bool const copied = hasPlace && copy(dst, src, overwrite);
     // kept file-04: who moves wants the source gone, and jobs are sent again rather than found twice.
+    KeepLastError const whyNotCopied;
     remove(src);
     return copied;
 }
@@ -85,7 +104,8 @@ bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs)
 bool File::LinkOrCopy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     FStat const entry(dst);
     if (entry.exist()) {
-        if (!overwrite || !removeEntry(dst, entry)) return false;
+        if (!overwrite) return refuse(Reason::ALREADY_THERE);
+        if (!removeEntry(dst, entry)) return false;
     } else if (makeDirs && !Dir::NewFor(dst)) {
         return false;
     }

@@ -51,6 +51,10 @@ public:
     bool isOpen() override { return stream_ != nullptr; }
 
 private:
+    /// Else the last error says why not.
+    bool canBeUsed() const;
+    char const* nextLine(char* buffer, int room);
+
     std::FILE* stream_;
 };
 

@@ -1,6 +1,7 @@
 // The sibling is file_std_dir_win.cpp.
 
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
 #include "basis/files/os_path_posix.h"
 #include "basis/files/pieces.h"
 #include "zor_basis/files/file.h"
@@ -21,6 +22,17 @@ int flagsOf(int mode) {
     return flags;
 }
 
+/// A disk that becomes full takes what it still can, and only the next call says why it was not all.
+ssize_t writeWhole(int descriptor, char const* from, std::size_t n) {
+    std::size_t done = 0;
+    while (done < n) {
+        ssize_t const put = ::write(descriptor, from + done, n - done);
+        if (put <= 0) return done != 0 ? static_cast<ssize_t>(done) : put;
+        done += static_cast<std::size_t>(put);
+    }
+    return static_cast<ssize_t>(done);
+}
+
 } // namespace
 
 FileStdDir::FileStdDir(char const* path, int mode)
@@ -30,7 +42,9 @@ FileStdDir::FileStdDir(char const* path, int mode)
 }
 
 FileStdDir::~FileStdDir() {
-    if (descriptor_ != -1) ::close(descriptor_);
+    if (descriptor_ == -1) return;
+    KeepLastError const keep;
+    ::close(descriptor_);
 }
 
 // kept file-01: the runtime's -1 comes out as it is, as all ones.
@@ -41,14 +55,16 @@ std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
 
 std::uint64_t FileStdDir::write(void const* buffer, std::uint64_t n) {
     return inPieces(static_cast<char const*>(buffer), n,
-                    [this](char const* from, unsigned piece) { return ::write(descriptor_, from, piece); });
+                    [this](char const* from, unsigned piece) { return writeWhole(descriptor_, from, piece); });
 }
 
 bool FileStdDir::flush() { return ::fsync(descriptor_) == 0; }
 
 std::int64_t FileStdDir::seek(int origin, int offset) {
     // The system knows further origins, which look for data and for holes.
-    return origin <= SEEK_END ? ::lseek(descriptor_, offset, origin) : -1;
+    if (origin <= SEEK_END) return ::lseek(descriptor_, offset, origin);
+    refuse(Reason::BAD_ARGUMENT);
+    return -1;
 }
 
 } // namespace ZOR_Basis

@@ -1,6 +1,8 @@
 // The sibling is file_std_dir_posix.cpp.
 
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
+#include "basis/files/path_rules.h"
 #include "basis/files/pieces.h"
 #include "zor_basis/files/file.h"
 
@@ -21,33 +23,54 @@ int flagsOf(int mode) {
     return flags;
 }
 
-} // namespace
-
-FileStdDir::FileStdDir(char const* path, int mode)
-    : descriptor_(path != nullptr ? ::_open(path, flagsOf(mode), OWNER_READS_AND_WRITES) : -1) {}
-
-FileStdDir::~FileStdDir() {
-    if (descriptor_ != -1) ::_close(descriptor_);
+/// Runs a call of the runtime on a descriptor. \return -1 where that fails or there is none
+template <class Call>
+auto onDescriptor(int descriptor, Call call) -> decltype(call(descriptor)) {
+    // Never handed to the runtime, which may end the process for it.
+    if (descriptor == -1) {
+        refuse(Reason::NOT_OPEN);
+        return -1;
+    }
+    RuntimeCall const runtime;
+    auto const result = call(descriptor);
+    if (result == -1) runtime.fail();
+    return result;
 }
 
-// kept file-01: the runtime's -1 comes out as it is, as all ones. No descriptor is never handed to the runtime, which
-// may end the process for it.
+int opened(char const* path, int flags) {
+    RuntimeCall const call;
+    int const descriptor = ::_open(path, flags, OWNER_READS_AND_WRITES);
+    if (descriptor == -1) call.fail();
+    return descriptor;
+}
+
+} // namespace
+
+FileStdDir::FileStdDir(char const* path, int mode) : descriptor_(opened(PathRules::orEmpty(path), flagsOf(mode))) {}
+
+FileStdDir::~FileStdDir() {
+    if (descriptor_ == -1) return;
+    KeepLastError const keep;
+    ::_close(descriptor_);
+}
+
+// kept file-01: the runtime's -1 comes out as it is, as all ones.
 std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
-    if (descriptor_ == -1) return TRANSFER_FAILED;
-    return inPieces(static_cast<char*>(buffer), n,
-                    [this](char* to, unsigned piece) { return ::_read(descriptor_, to, piece); });
+    return inPieces(static_cast<char*>(buffer), n, [this](char* to, unsigned piece) {
+        return onDescriptor(descriptor_, [=](int from) { return ::_read(from, to, piece); });
+    });
 }
 
 std::uint64_t FileStdDir::write(void const* buffer, std::uint64_t n) {
-    if (descriptor_ == -1) return TRANSFER_FAILED;
-    return inPieces(static_cast<char const*>(buffer), n,
-                    [this](char const* from, unsigned piece) { return ::_write(descriptor_, from, piece); });
+    return inPieces(static_cast<char const*>(buffer), n, [this](char const* from, unsigned piece) {
+        return onDescriptor(descriptor_, [=](int to) { return ::_write(to, from, piece); });
+    });
 }
 
-bool FileStdDir::flush() { return descriptor_ != -1 && ::_commit(descriptor_) == 0; }
+bool FileStdDir::flush() { return onDescriptor(descriptor_, ::_commit) == 0; }
 
 std::int64_t FileStdDir::seek(int origin, int offset) {
-    return descriptor_ != -1 ? ::_lseeki64(descriptor_, offset, origin) : -1;
+    return onDescriptor(descriptor_, [=](int file) { return ::_lseeki64(file, offset, origin); });
 }
 
 } // namespace ZOR_Basis

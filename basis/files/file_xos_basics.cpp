@@ -1,4 +1,6 @@
 #include "basis/files/file_backends.h"
+#include "basis/files/last_error.h"
+#include "basis/files/path_rules.h"
 #include "zor_basis/files/file.h"
 
 #include <cstring>
@@ -21,10 +23,12 @@ std::uint32_t flagsOf(int mode) {
 } // namespace
 
 FileXosBasics::FileXosBasics(char const* path, int mode)
-    : handle_(xos_FileOpen(path != nullptr ? path : "", flagsOf(mode))) {}
+    : handle_(xos_FileOpen(PathRules::orEmpty(path), flagsOf(mode))) {}
 
 FileXosBasics::~FileXosBasics() {
-    if (handle_ != 0) xos_FileCloseEx(handle_, 0);
+    if (handle_ == 0) return;
+    KeepLastError const keep;
+    xos_FileCloseEx(handle_, 0);
 }
 
 std::uint64_t FileXosBasics::read(void* buffer, std::uint64_t n) { return xos_FileReadEx(handle_, buffer, n, 0, 0); }

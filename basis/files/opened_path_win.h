@@ -4,7 +4,7 @@
 #ifndef BASIS_FILES_OPENED_PATH_WIN_H
 #define BASIS_FILES_OPENED_PATH_WIN_H
 
-#include "basis/files/kept_error.h"
+#include "basis/files/last_error.h"
 #include "basis/platform/windows_api.h"
 #include "zor_basis/files/f_path.h"
 
@@ -18,7 +18,7 @@ public:
     FileHandle(FileHandle const&) = delete;
     FileHandle& operator=(FileHandle const&) = delete;
     ~FileHandle() {
-        KeptError const kept;
+        KeepLastError const kept;
         if (isOpen()) CloseHandle(handle_);
     }
     HANDLE get() const { return handle_; }

@@ -16,6 +16,15 @@ namespace ZOR_Basis::PathRules {
 using detail::isNothing;
 
 template <class Char>
+inline constexpr Char EMPTY[] = {0};
+
+/// A path as it is handed on: null is the empty one.
+template <class Char>
+constexpr Char const* orEmpty(Char const* path) {
+    return path != nullptr ? path : EMPTY<Char>;
+}
+
+template <class Char>
 constexpr bool isSlash(Char c) {
     return c == Char('/') || c == Char('\\');
 }

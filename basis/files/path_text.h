@@ -35,9 +35,7 @@ struct PathText {
     using View = typename Kind::View;
     using Text = detail::InlineText<String, Char, 255>;
 
-    static constexpr Char EMPTY[] = {0};
-
-    static Char const* orEmpty(Char const* text) { return text != nullptr ? text : EMPTY; }
+    static Char const* orEmpty(Char const* text) { return PathRules::orEmpty(text); }
 
     static std::uint64_t lengthOf(Char const* text, std::uint64_t len) { return detail::sourceLength(text, len); }
 

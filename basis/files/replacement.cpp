@@ -1,6 +1,6 @@
 #include "basis/files/replacement.h"
 
-#include "basis/files/kept_error.h"
+#include "basis/files/last_error.h"
 #include "basis/files/platform_flags.h"
 #include "basis/files/replacement_impl.h"
 #include "basis/files/system_calls.h"
@@ -26,7 +26,7 @@ void nameBeside(FPath const& target, FPath& temporary) {
 
 Replacement::~Replacement() {
     if (temporary_.empty()) return;
-    KeptError const kept;
+    KeepLastError const kept;
     file_.reset();
     xos_FileRemove(temporary_, REMOVE_ALWAYS);
 }

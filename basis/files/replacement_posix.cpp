@@ -2,7 +2,7 @@
 
 #include "basis/files/replacement_impl.h"
 
-#include "basis/files/kept_error.h"
+#include "basis/files/last_error.h"
 #include "basis/files/os_path_posix.h"
 
 #include <fcntl.h>
@@ -32,7 +32,7 @@ public:
     Descriptor(Descriptor const&) = delete;
     Descriptor& operator=(Descriptor const&) = delete;
     ~Descriptor() {
-        KeptError const kept;
+        KeepLastError const kept;
         if (number_ >= 0) ::close(number_);
     }
     int get() const { return number_; }

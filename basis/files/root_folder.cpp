@@ -2,10 +2,12 @@
 
 #include "basis/files/path_rules.h"
 #include "basis/files/root_folder_impl.h"
+#include "basis/memory/never_destroyed.h"
 #include "basis/platform/xos_basics.h"
 
 #include <atomic>
 #include <cstring>
+#include <mutex>
 
 namespace ZOR_Basis::RootFolder {
 namespace {
@@ -14,7 +16,7 @@ constexpr std::uint64_t FIRST_ROOM = 512;
 constexpr char SYSTEM[] = "system";
 
 std::atomic<Root const*> kept{nullptr};
-std::atomic<std::uint64_t> room{FIRST_ROOM};
+std::uint64_t room = FIRST_ROOM; // of the one that asks
 
 /// The root while it is not known. Not a static object: it must outlive everything that asks.
 Root const& unknown(bool isFileSystem) {
@@ -24,11 +26,10 @@ Root const& unknown(bool isFileSystem) {
 
 Root fromCurrentFolder() {
     BufStr<255> folder;
-    std::uint64_t const size = room.load(std::memory_order_relaxed);
-    folder.extendBuf(size);
-    if (currentFolder(folder.getBuf(), size)) return fromFolder(folder.c_str());
+    folder.extendBuf(room);
+    if (currentFolder(folder.getBuf(), room)) return fromFolder(folder.c_str());
     // kept root-01: a folder that needs more room is found by the next call, not by this one.
-    room.store(2 * size, std::memory_order_relaxed);
+    room *= 2;
     return {};
 }
 
@@ -52,13 +53,15 @@ Root fromFolder(char const* folder) {
 
 Root const& get() {
     if (Root const* const known = kept.load(std::memory_order_acquire)) return *known;
+    // One asks, the others wait for its answer.
+    static NeverDestroyed<std::mutex> asking;
+    std::lock_guard const one(*asking);
+    if (Root const* const known = kept.load(std::memory_order_relaxed)) return *known;
     Root const found = find();
     if (found.text.empty()) return unknown(found.isFileSystem);
-    Root const* const mine = new Root(found);
-    Root const* first = nullptr;
-    if (kept.compare_exchange_strong(first, mine, std::memory_order_acq_rel)) return *mine;
-    delete mine;
-    return *first;
+    Root const* const known = new Root(found);
+    kept.store(known, std::memory_order_release);
+    return *known;
 }
 
 } // namespace ZOR_Basis::RootFolder

@@ -16,7 +16,7 @@ struct Root {
 };
 
 /// The root, kept for the life of the process once it has a text; until then looked for at each call.
-/// \thread thread-safe
+/// \thread thread-safe; one asks at a time, and those that come meanwhile share its answer if it has a text
 Root const& get();
 
 /// The root that the platform layer's answer or the current folder stands for.

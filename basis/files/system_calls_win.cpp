@@ -2,6 +2,7 @@
 
 #include "basis/files/system_calls.h"
 
+#include "basis/files/last_error.h"
 #include "basis/platform/windows_api.h"
 
 #include <direct.h>
@@ -27,28 +28,41 @@ void copyRecord(struct __stat64 const& from, xos_Stat& record) {
     record.st_ctime_ = from.st_ctime;
 }
 
+/// Hands on what a call of the runtime gives. \param call  true, or a pointer, where it succeeds
+template <class Call>
+auto told(Call call) {
+    RuntimeCall const runtime;
+    auto const result = call();
+    if (!result) runtime.fail();
+    return result;
+}
+
 bool status(char const* path, xos_Stat& record) {
     struct __stat64 found;
-    if (path == nullptr || _stat64(path, &found) != 0) return false;
+    if (!told([&] { return _stat64(path, &found) == 0; })) return false;
     copyRecord(found, record);
     return true;
 }
 
 bool statusWide(wchar_t const* path, xos_Stat& record) {
     struct __stat64 found;
-    if (path == nullptr || _wstat64(path, &found) != 0) return false;
+    if (!told([&] { return _wstat64(path, &found) == 0; })) return false;
     copyRecord(found, record);
     return true;
 }
 
-bool makeDirectoryWide(wchar_t const* path) { return path != nullptr && _wmkdir(path) == 0; }
+bool makeDirectoryWide(wchar_t const* path) {
+    return told([=] { return _wmkdir(path) == 0; });
+}
 
-std::FILE* openStream(char const* path, char const* mode) { return path != nullptr ? std::fopen(path, mode) : nullptr; }
+std::FILE* openStream(char const* path, char const* mode) {
+    return told([=] { return std::fopen(path, mode); });
+}
 
 std::FILE* openStreamWide(wchar_t const* path, char const* mode) {
     wchar_t wideMode[LONGEST_MODE + 1] = {};
     for (std::size_t i = 0; i < LONGEST_MODE && mode[i] != '\0'; ++i) wideMode[i] = static_cast<unsigned char>(mode[i]);
-    return path != nullptr ? _wfopen(path, wideMode) : nullptr;
+    return told([&] { return _wfopen(path, wideMode); });
 }
 
 std::uint32_t lastError() { return GetLastError(); }

@@ -2,9 +2,11 @@
 
 #include "basis/files/path_text.h"
 #include "basis/files/root_folder.h"
+#include "basis/memory/never_destroyed.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text/convert.h"
 
+#include <algorithm>
 #include <atomic>
 #include <mutex>
 
@@ -13,15 +15,30 @@ namespace {
 
 using Path = PathText<WidePathKind>;
 
-/// Fills `WcPath::pathRoot` while it is empty. Who sees `filled` sees the text that was there before it.
-void fillRoot() {
-    static std::atomic<bool> filled{false};
-    static std::mutex filling;
-    if (filled.load(std::memory_order_acquire) && !WcPath::pathRoot.empty()) return;
-    std::lock_guard const lock(filling);
-    if (!WcPath::pathRoot.empty()) return;
-    Convert::Utf8ToWide(RootFolder::get().text, WcPath::pathRoot);
-    filled.store(!WcPath::pathRoot.empty(), std::memory_order_release);
+/// The size of `WcPath::pathRoot`. It is written last: whoever reads another size than 0 may read the text.
+struct RootSize : WcPath {
+    static std::atomic_ref<std::uint64_t> of(WcPath& root) { return std::atomic_ref(root.*&RootSize::size_); }
+};
+
+/// Fills the public root, unless another thread has done so. Only the empty root is ever written.
+void publish(WStr const& found) {
+    static NeverDestroyed<std::mutex> publishing;
+    std::lock_guard const lock(*publishing);
+    WcPath& root = WcPath::pathRoot;
+    if (!root.empty()) return;
+    root.extendBuf(found.size());
+    std::copy_n(found.wstr(), found.size() + 1, root.getBuf());
+    RootSize::of(root).store(found.size(), std::memory_order_release);
+}
+
+/// The root in wide form; the empty text where there is none, or it cannot be converted.
+WStr wideRoot() {
+    if (RootSize::of(WcPath::pathRoot).load(std::memory_order_acquire) != 0) return WcPath::pathRoot;
+    WcPath found;
+    bool const isConverted = Convert::Utf8ToWide(RootFolder::get().text, found);
+    if (!isConverted || found.empty()) return {};
+    publish(found);
+    return WcPath::pathRoot;
 }
 
 bool equal(WChar const* text, std::uint64_t length, WChar const* other, std::uint64_t otherLength) {
@@ -29,12 +46,10 @@ bool equal(WChar const* text, std::uint64_t length, WChar const* other, std::uin
 }
 
 /// The characters at the front that stand for the root, the slash included; 0 if none do.
-std::uint64_t fakeRoot(WChar const* text, std::uint64_t length) {
+std::uint64_t fakeRoot(WChar const* text, std::uint64_t length, WStr const& root) {
     constexpr std::uint64_t FIRST_WITH_SLASH = 6;
-    fillRoot();
     if (length == 0 || !PathRules::isSlash(*text)) return 0;
     // kept path-08: the root itself counts as the first fake root, and nothing may follow a fake root.
-    WcPath const& root = WcPath::pathRoot;
     if (equal(text, length, root.wstr(), root.size())) return length < FIRST_WITH_SLASH ? length : FIRST_WITH_SLASH;
     for (std::uint64_t i = 0; i < PathRules::FAKE_ROOTS; ++i) {
         if (equal(text + 1, length - 1, PathRules::FAKE_ROOT<WChar>[i], PathRules::FAKE_ROOT_LENGTH[i])) return length;
@@ -71,9 +86,10 @@ void WcPath::replaceSlashes(WChar* text) {
 }
 
 WcPath& WcPath::translateRoot() {
-    if (std::uint64_t const fake = fakeRoot(text_, size_)) {
-        WcPath const root = RootFolder::get().isFileSystem ? WcPath(ZB_W("/")) : pathRoot;
-        WBStr::replace(0, fake, root.wstr(), root.size());
+    WStr const root = wideRoot();
+    if (std::uint64_t const fake = fakeRoot(text_, size_, root)) {
+        bool const isSlash = root.empty() && RootFolder::get().isFileSystem;
+        WBStr::replace(0, fake, isSlash ? WStr(ZB_W("/")) : root);
     }
     return *this;
 }
@@ -92,7 +108,7 @@ bool WcPath::isAbsolute(WChar const* text) { return PathRules::isAbsolute(Path::
 bool WcPath::isDos(WChar const* text) { return PathRules::isDos(Path::orEmpty(text)); }
 bool WcPath::isURL(WChar const* text) { return PathRules::isURL(Path::orEmpty(text)); }
 bool WcPath::isWildCard(WChar const* text) { return PathRules::isWildCard(Path::orEmpty(text)); }
-bool WcPath::isFake(WChar const* text) { return fakeRoot(text, Path::lengthOf(text, 0)) != 0; }
+bool WcPath::isFake(WChar const* text) { return fakeRoot(text, Path::lengthOf(text, 0), wideRoot()) != 0; }
 bool WcPath::matchWildCard(WChar const* pattern, WChar const* name) { return Path::matchWildCard(pattern, name); }
 bool WcPath::isSub(WChar const* path, WChar const* dir) { return PathRules::isSub(path, dir); }
 std::uint64_t WcPath::offsetName(WChar const* text, std::uint64_t len) { return Path::offsetName(text, len); }

@@ -1,5 +1,6 @@
 #include "zor_basis/flat.h"
 
+#include "basis/files/last_error.h"
 #include "basis/platform/xos_basics.h"
 #include "zor_basis/text/buf_str.h"
 
@@ -19,6 +20,7 @@ bool ZB_runCommand(char const* command, char const* directory, bool noResult) {
     std::int64_t result = 0;
     for (int attempt = 0; attempt < ATTEMPTS; ++attempt) {
         if (xos_ShellExecuteEx(line.c_str(), noResult ? nullptr : &result) == 0) return true;
+        KeepLastError const keep;
         xos_TaskSleep(PAUSE_MS);
     }
     return false;

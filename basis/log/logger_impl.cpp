@@ -1,5 +1,6 @@
 #include "basis/log/logger_impl.h"
 
+#include "basis/files/last_error.h"
 #include "basis/files/system_calls.h"
 #include "basis/log/log_path.h"
 #include "basis/log/loggers.h"
@@ -23,8 +24,14 @@ using HQ_Basis::AlertTimer;
 bool appendToFile(char const* path, char const* text, std::uint64_t size) {
     std::FILE* const file = systemCalls.openStream(path, "a");
     if (file == nullptr) return false;
+    RuntimeCall const call;
     bool const isWritten = std::fwrite(text, 1, size, file) == size;
-    return std::fclose(file) == 0 && isWritten;
+    if (!isWritten) call.fail();
+    LastError const reason;
+    bool const isClosed = std::fclose(file) == 0;
+    if (!isWritten) reason.restore();
+    if (isWritten && !isClosed) call.fail();
+    return isWritten && isClosed;
 }
 
 } // namespace
@@ -160,7 +167,7 @@ bool LoggerImpl::writeWhatIsDue() {
 }
 
 bool LoggerImpl::flush() {
-    std::lock_guard const held(lock_);
+    std::unique_lock held(lock_);
     awaitWriter();
     for (std::uint64_t left = unwritten(); left != 0; awaitWriter()) {
         Buffer* const buffer = firstUnwritten();
@@ -169,6 +176,8 @@ bool LoggerImpl::flush() {
         left -= std::min(left, buffer->used - from);
         if (writeOut(*buffer)) continue;
         buffer->flushed = from;
+        KeepLastError const reason;
+        held.unlock();
         return false;
     }
     return true;
@@ -216,6 +225,7 @@ bool LoggerImpl::writeOut(Buffer& buffer) {
     buffer.flushed = buffer.used;
     lock_.unlock();
     bool const isWritten = appendToFile(sessionFile(logFolder(name_), session).c_str(), text, size);
+    KeepLastError const reason;
     lock_.lock();
     if (claims) claim_ = {};
     lastWrite_ = xos_MsCount();

@@ -19,7 +19,7 @@ ZB_PLATFORM_C_BEGIN
 /// \return 0 when the server answered with success (200 to 299) and the body arrived and could be stored
 /// \error an unknown scheme, nobody who answers within 30 s, any other status, a connection that falls silent for 60 s, a
 ///        body shorter than announced, a target that cannot be written. Where no length is announced, WinHTTP takes what
-///        came before a lost connection for the whole.
+///        came before a lost connection for the whole. The last error says which it was, stand-alone as docs/reasons.md lists
 /// \thread any thread; the calling one waits
 /// \cost constant memory, whatever the length
 XOS_API int xos_URLGet(char const* url, char const* target, char const* first, char const* second);

@@ -1,5 +1,6 @@
 #include "basis/system/accounts_posix.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/query_calls_posix.h"
 #include "zor_basis/text/blob.h"
 
@@ -23,7 +24,8 @@ bool find(Account& account, Ask ask) {
         larger.alloc(room, false);
         result = ask(&record, larger.buf(), larger.sizeBuf(), &found);
     }
-    if (result != 0 || found == nullptr) return false;
+    if (result != 0) errno = result;
+    if (result != 0 || found == nullptr) return result == 0 && refuse(Reason::NOT_FOUND);
     account.name = found->pw_name;
     account.user = found->pw_uid;
     account.group = found->pw_gid;

@@ -2,10 +2,12 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
+
 namespace ZOR_Basis {
 
-bool Sys::FullDomain(Str const&, BufStr<255>&) { return false; }
+bool Sys::FullDomain(Str const&, BufStr<255>&) { return refuse(Reason::NOT_SUPPORTED); }
 
-bool Sys::ShortDomain(Str const&, BufStr<255>&) { return false; }
+bool Sys::ShortDomain(Str const&, BufStr<255>&) { return refuse(Reason::NOT_SUPPORTED); }
 
 } // namespace ZOR_Basis

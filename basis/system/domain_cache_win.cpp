@@ -41,7 +41,7 @@ bool read(HKEY key, DWORD index, Entry& entry, DWORD& type) {
             setLength(entry.fullName, dataLength);
             return true;
         }
-        if (result != ERROR_MORE_DATA || !grow(entry, nameLength, dataLength)) return false;
+        if (result != ERROR_MORE_DATA || !grow(entry, nameLength, dataLength)) return told(result);
     }
 }
 

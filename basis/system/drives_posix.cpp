@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/mount_table_posix.h"
 
 namespace ZOR_Basis {
@@ -13,11 +14,12 @@ bool Sys::isLocalDisk(Str const& path) {
 }
 
 bool Sys::UnMap(Str const& path, FPath& unc) {
-    if (path.empty()) return false;
+    if (path.empty()) return refuse(Reason::BAD_ARGUMENT);
     FPath const absolute = absolutePath(path);
     Mount mount;
     FPath share;
-    if (!findMount(absolute, mount) || !networkPath(mount, share)) return false;
+    if (!findMount(absolute, mount)) return false;
+    if (!networkPath(mount, share)) return refuse(Reason::NOT_FOUND);
     char const* rest = absolute.c_str() + mount.directory.size();
     while (*rest == '/') ++rest;
     unc = share.add(rest);

@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/profiles_win.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/registry_win.h"
@@ -49,7 +50,7 @@ void unmapTo(char const* remote, BufStr<255> const& path, FPath& unc) {
 
 /// By the mappings under a user's key.
 bool unmapByKey(HKEY parent, char const* prefix, BufStr<255> const& path, FPath& unc) {
-    if (path.empty()) return false;
+    if (path.empty()) return refuse(Reason::BAD_ARGUMENT);
     BufStr<255> name(prefix);
     name.add("Network\\").add(letterOf(path));
     BufStr<255> remote;
@@ -65,7 +66,7 @@ bool unmapByProfile(Profile const& profile, BufStr<255> const& path, FPath& unc)
 
 /// By the connections of the calling thread.
 bool unmapByConnection(BufStr<255> const& path, FPath& unc) {
-    if (path.empty()) return false;
+    if (path.empty()) return refuse(Reason::BAD_ARGUMENT);
     BufStr<15> drive;
     drive.add(letterOf(path)).add(":");
     Blob remote;
@@ -74,7 +75,7 @@ bool unmapByConnection(BufStr<255> const& path, FPath& unc) {
         DWORD n = static_cast<DWORD>(remote.sizeBuf());
         DWORD const result = queryCalls.connection(drive, remote.buf(), &n);
         if (result == ERROR_MORE_DATA && growBuffer(remote, n)) continue;
-        if (result != NO_ERROR) return false;
+        if (!told(static_cast<LSTATUS>(result))) return false;
         unmapTo(remote.val(), path, unc);
         return true;
     }
@@ -113,6 +114,7 @@ bool Sys::UnMap(Str const& path, Str const& user, Str const& password, FPath& un
     std::unique_ptr<SysHdl> const handle(loginUser(user, password, INTERACTIVE));
     if (handle == nullptr) return false;
     bool const found = impersonate(handle.get()) && unmapByConnection(path, unc);
+    KeepLastError const whyNotFound;
     revertToSelf();
     return found;
 }

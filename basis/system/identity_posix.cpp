@@ -1,5 +1,6 @@
 #include "basis/system/identity_posix.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/query_calls_posix.h"
 
 #include <new>
@@ -16,7 +17,7 @@ constexpr int MOST = 65536;
 bool Identity::makeRoom(int n) {
     groups_.reset(new (std::nothrow) gid_t[static_cast<std::size_t>(n) + 1]);
     count_ = 0;
-    return groups_ != nullptr;
+    return groups_ != nullptr || refuse(Reason::NO_MEMORY);
 }
 
 bool Identity::readOwn() {
@@ -41,7 +42,7 @@ bool Identity::read(Account const& account) {
             return true;
         }
     }
-    return false;
+    return refuse(Reason::NO_MEMORY);
 }
 
 bool Identity::setGroups() const { return queryCalls.setGroups(count_, groups_.get()); }
@@ -49,10 +50,10 @@ bool Identity::setGroups() const { return queryCalls.setGroups(count_, groups_.g
 bool Identity::take(Identity const& own) const {
     // The user last: with it the privilege to change anything goes.
     if (!setGroups()) return false;
-    if (queryCalls.setEffectiveGroup(group_)) {
-        if (queryCalls.setEffectiveUser(user_)) return true;
-        queryCalls.setEffectiveGroup(own.group_);
-    }
+    bool const hasGroup = queryCalls.setEffectiveGroup(group_);
+    if (hasGroup && queryCalls.setEffectiveUser(user_)) return true;
+    KeepLastError const whyNotTaken;
+    if (hasGroup) queryCalls.setEffectiveGroup(own.group_);
     own.setGroups();
     return false;
 }

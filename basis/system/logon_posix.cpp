@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/identity_posix.h"
 #include "basis/system/query_calls_posix.h"
 #include "basis/system/secret_text.h"
@@ -72,14 +73,19 @@ public:
     Pam(Pam const&) = delete;
     Pam& operator=(Pam const&) = delete;
     ~Pam() {
-        if (handle_ != nullptr) pam_end(handle_, result_);
+        if (handle_ == nullptr) return;
+        KeepLastError const keep;
+        pam_end(handle_, result_);
     }
 
     bool admits() {
-        if (result_ != PAM_SUCCESS || handle_ == nullptr) return false;
-        result_ = pam_authenticate(handle_, PAM_SILENT | PAM_DISALLOW_NULL_AUTHTOK);
-        if (result_ == PAM_SUCCESS) result_ = pam_acct_mgmt(handle_, PAM_SILENT);
-        return result_ == PAM_SUCCESS;
+        if (handle_ != nullptr && result_ == PAM_SUCCESS) {
+            result_ = pam_authenticate(handle_, PAM_SILENT | PAM_DISALLOW_NULL_AUTHTOK);
+            if (result_ == PAM_SUCCESS) result_ = pam_acct_mgmt(handle_, PAM_SILENT);
+            if (result_ == PAM_SUCCESS) return true;
+        }
+        // The modules have codes of their own, none of which says more.
+        return refuse(result_ == PAM_BUF_ERR ? Reason::NO_MEMORY : Reason::LOGON_REFUSED);
     }
 
     /// The account's name, which modules may have changed.
@@ -98,7 +104,10 @@ private:
 } // namespace
 
 SysHdl* Sys::loginUser(Str const& user, Str const& password, bool) {
-    if (user.empty()) return nullptr;
+    if (user.empty()) {
+        refuse(Reason::BAD_ARGUMENT);
+        return nullptr;
+    }
     revertToSelf();
     BufStr<15> name, domain;
     if (ParseUser(user, name, domain) && !domain.empty()) name.add("@").add(domain);
@@ -113,10 +122,10 @@ SysHdl* Sys::loginUser(Str const& user, Str const& password, bool) {
 bool Sys::impersonate(SysHdl* handle) {
     if (!revertToSelf()) return false;
     if (handle == nullptr) return true;
-    if (!handle->isValid()) return false;
+    if (!handle->isValid()) return refuse(Reason::NOT_OPEN);
     std::unique_ptr<Identity> own(new (std::nothrow) Identity);
-    if (own == nullptr || !own->readOwn()) return false;
-    if (!static_cast<PosixHdl*>(handle)->identity().take(*own)) return false;
+    if (own == nullptr) return refuse(Reason::NO_MEMORY);
+    if (!own->readOwn() || !static_cast<PosixHdl*>(handle)->identity().take(*own)) return false;
     ownIdentity = std::move(own);
     return true;
 }

@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/secret_text.h"
 
@@ -20,7 +21,9 @@ class WinHdl final : public SysHdl {
 public:
     explicit WinHdl(HANDLE token) : token_(reinterpret_cast<std::uint64_t>(token)) {}
     ~WinHdl() override {
-        if (isValid()) queryCalls.closeHandle(token());
+        if (!isValid()) return;
+        KeepLastError const keep;
+        queryCalls.closeHandle(token());
     }
     bool isValid() override { return token_ != NONE; }
     HANDLE token() const { return reinterpret_cast<HANDLE>(token_); }
@@ -36,7 +39,10 @@ static_assert(sizeof(WinHdl) == 16 && sizeof(HANDLE) == sizeof(std::uint64_t));
 } // namespace
 
 SysHdl* Sys::loginUser(Str const& user, Str const& password, bool interactive) {
-    if (user.empty()) return nullptr;
+    if (user.empty()) {
+        refuse(Reason::BAD_ARGUMENT);
+        return nullptr;
+    }
     queryCalls.revertToSelf();
     BufStr<15> name, domain;
     bool const hasDomain = ParseUser(user, name, domain);
@@ -48,14 +54,17 @@ SysHdl* Sys::loginUser(Str const& user, Str const& password, bool interactive) {
         return nullptr;
     }
     SysHdl* const handle = new (std::nothrow) WinHdl(token);
-    if (handle == nullptr) queryCalls.closeHandle(token);
-    return handle;
+    if (handle != nullptr) return handle;
+    queryCalls.closeHandle(token);
+    refuse(Reason::NO_MEMORY);
+    return nullptr;
 }
 
 bool Sys::impersonate(SysHdl* handle) {
     queryCalls.revertToSelf();
     if (handle == nullptr) return true;
-    return handle->isValid() && queryCalls.impersonate(static_cast<WinHdl*>(handle)->token()) != FALSE;
+    if (!handle->isValid()) return refuse(Reason::NOT_OPEN);
+    return queryCalls.impersonate(static_cast<WinHdl*>(handle)->token()) != FALSE;
 }
 
 bool Sys::revertToSelf() { return queryCalls.revertToSelf() != FALSE; }

@@ -1,5 +1,6 @@
 #include "basis/system/mount_table_posix.h"
 
+#include "basis/files/last_error.h"
 #include "basis/files/os_path_posix.h"
 #include "basis/system/query_calls_posix.h"
 #include "basis/system/text_parts.h"
@@ -102,7 +103,7 @@ bool findMount(FPath const& path, Mount& mount) {
         mount.kind = entry.mnt_type;
         mount.directory = entry.mnt_dir;
     }
-    return longest != 0;
+    return longest != 0 || refuse(Reason::NOT_FOUND);
 }
 
 bool isLocalKind(Str const& kind) { return isOneOf(LOCAL_KINDS, kind); }

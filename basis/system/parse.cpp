@@ -1,5 +1,6 @@
 #include "zor_basis/system/parse.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/line_length.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/files/f_stat.h"
@@ -61,13 +62,15 @@ bool ZB_Parse::checkLine(char const* expected) {
 
 bool ZB_Parse::getCleanFileName(FPath& path, bool fileOnly, bool forwardSlashes) {
     skipBlanks();
-    if (isDataEnd()) return false;
+    if (isDataEnd()) return refuse(Reason::NOT_FOUND);
     Line const line = readLine(LONGEST_FILE_NAME);
     path = Str(line.text, line.size);
     path.translateRoot();
     if (forwardSlashes) path.replaceBackSlashes();
     FStat const entry(path.c_str());
-    return entry.isFile() || (!fileOnly && entry.isDir());
+    if (entry.isFile() || (!fileOnly && entry.isDir())) return true;
+    if (entry.exist()) refuse(entry.isDir() ? Reason::IS_DIRECTORY : Reason::ALREADY_THERE);
+    return false;
 }
 
 } // namespace ZOR_Basis

@@ -1,5 +1,6 @@
 #include "zor_basis/system/process.h"
 
+#include "basis/files/last_error.h"
 #include "basis/platform/xos_basics.h"
 #include "basis/system/process_impl.h"
 #include "zor_basis/text/char_ops.h"
@@ -14,8 +15,10 @@ static_assert(sizeof(Resolver) == 8);
 
 void* resolve(char const* name) {
     Resolver resolver = nullptr;
-    if (xos_BasicsParamLookup(FUNCTION_RESOLVER, &resolver, sizeof resolver) < 1 || resolver == nullptr) return nullptr;
-    return resolver(nullptr, name);
+    if (xos_BasicsParamLookup(FUNCTION_RESOLVER, &resolver, sizeof resolver) < 1) return nullptr;
+    if (resolver != nullptr) return resolver(nullptr, name);
+    refuse(Reason::NOT_FOUND);
+    return nullptr;
 }
 
 } // namespace
@@ -23,7 +26,7 @@ void* resolve(char const* name) {
 bool Process::Create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode) {
     // kept process-01: callers look at the code whether they have waited or not.
     if (exitCode != nullptr) *exitCode = 0;
-    if (application == nullptr && detail::isNothing(commandLine)) return false;
+    if (application == nullptr && detail::isNothing(commandLine)) return refuse(Reason::BAD_ARGUMENT);
     return ProcessImpl::create(application, processId, commandLine, exitCode);
 }
 
@@ -34,7 +37,9 @@ void* Process::loadLib(char const* name) { return xos_LibraryLoad(name); }
 
 void* Process::ptrFunc(char const* name, void* module) {
     if (module == nullptr) return resolve(name);
-    return !detail::isNothing(name) ? ProcessImpl::findFunction(module, name) : nullptr;
+    if (!detail::isNothing(name)) return ProcessImpl::findFunction(module, name);
+    refuse(Reason::BAD_ARGUMENT);
+    return nullptr;
 }
 
 } // namespace ZOR_Basis

@@ -2,6 +2,7 @@
 
 #include "basis/system/process_impl.h"
 
+#include "basis/files/last_error.h"
 #include "basis/files/os_path_posix.h"
 #include "basis/system/command_line.h"
 #include "basis/system/process_calls_posix.h"
@@ -55,7 +56,7 @@ class SpawnSettings {
 public:
     SpawnSettings() {
         posix_spawn_file_actions_init(&actions_);
-        isComplete_ = posix_spawn_file_actions_addclosefrom_np(&actions_, STDERR_FILENO + 1) == 0;
+        error_ = posix_spawn_file_actions_addclosefrom_np(&actions_, STDERR_FILENO + 1);
         posix_spawnattr_init(&attributes_);
         sigset_t none;
         sigemptyset(&none);
@@ -65,19 +66,24 @@ public:
     SpawnSettings(SpawnSettings const&) = delete;
     SpawnSettings& operator=(SpawnSettings const&) = delete;
     ~SpawnSettings() {
+        KeepLastError const keep;
         posix_spawnattr_destroy(&attributes_);
         posix_spawn_file_actions_destroy(&actions_);
     }
 
     bool start(char const* program, bool search, char* const* words, pid_t& child) const {
         auto const spawn = search ? processCalls.spawnFromPath : processCalls.spawn;
-        return isComplete_ && spawn(&child, OsPath(program), &actions_, &attributes_, words, environ) == 0;
+        // Told by their results alone.
+        int const error =
+            error_ != 0 ? error_ : spawn(&child, OsPath(program), &actions_, &attributes_, words, environ);
+        if (error != 0) errno = error;
+        return error == 0;
     }
 
 private:
     posix_spawn_file_actions_t actions_;
     posix_spawnattr_t attributes_;
-    bool isComplete_;
+    int error_;
 };
 
 /// A process that was found by its identifier.
@@ -87,7 +93,9 @@ public:
     OpenProcess(OpenProcess const&) = delete;
     OpenProcess& operator=(OpenProcess const&) = delete;
     ~OpenProcess() {
-        if (isOpen()) processCalls.close(descriptor_);
+        if (!isOpen()) return;
+        KeepLastError const keep;
+        processCalls.close(descriptor_);
     }
 
     bool isOpen() const { return descriptor_ >= 0; }
@@ -123,7 +131,7 @@ bool start(char const* application, char const* commandLine, pid_t& child) {
     // Blanks before the name of a program that is searched for are no empty name.
     if (application == nullptr) commandLine += std::strspn(commandLine, " \t");
     CommandLine const line(commandLine);
-    if (line.words() == nullptr) return false;
+    if (line.words() == nullptr) return refuse(Reason::NO_MEMORY);
     return application != nullptr ? settings.start(application, false, line.words(), child)
                                   : settings.start(line.words()[0], true, line.words(), child);
 }
@@ -159,22 +167,28 @@ bool ProcessImpl::create(char const* application, unsigned long* processId, char
 
 bool ProcessImpl::wait(unsigned long processId) {
     pid_t const process = processOf(processId);
-    if (process == 0) return false;
+    if (process == 0) return refuse(Reason::NO_PROCESS);
     bool const isOurs = unawaited.remove(process);
     bool const hasEnded = awaitEnd(process, isOurs);
     bool const isGone = errno == ESRCH || errno == ECHILD;
+    KeepLastError const whyNotEnded;
     if (isOurs && !hasEnded && !isGone) unawaited.add(process);
     return hasEnded;
 }
 
 bool ProcessImpl::terminate(unsigned long processId) {
     pid_t const process = processOf(processId);
-    if (process == 0) return false;
+    if (process == 0) return refuse(Reason::NO_PROCESS);
     OpenProcess const open(process);
     if (!open.isOpen()) return errno == ENOSYS && processCalls.signalProcess(process, SIGKILL) == 0;
-    return !open.hasEnded(0) && open.kill();
+    if (open.hasEnded(0)) return refuse(Reason::NO_PROCESS);
+    return open.kill();
 }
 
-void* ProcessImpl::findFunction(void* module, char const* name) { return dlsym(module, name); }
+void* ProcessImpl::findFunction(void* module, char const* name) {
+    void* const function = dlsym(module, name);
+    if (function == nullptr) refuse(Reason::NOT_FOUND);
+    return function;
+}
 
 } // namespace ZOR_Basis

@@ -2,6 +2,7 @@
 
 #include "basis/system/process_impl.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/process_calls_win.h"
 
 namespace ZOR_Basis {
@@ -17,7 +18,9 @@ public:
     Handle(Handle const&) = delete;
     Handle& operator=(Handle const&) = delete;
     ~Handle() {
-        if (handle_ != nullptr) processCalls.closeHandle(handle_);
+        if (handle_ == nullptr) return;
+        KeepLastError const keep;
+        processCalls.closeHandle(handle_);
     }
     HANDLE get() const { return handle_; }
     bool awaitEnd() const { return processCalls.waitFor(handle_, INFINITE) == WAIT_OBJECT_0; }
@@ -25,6 +28,16 @@ public:
 private:
     HANDLE const handle_;
 };
+
+/// Runs a call on a process that was to be opened. What could not be is a handle that the call refuses; why it could not
+/// be is what callers want to know.
+template <class Call>
+bool onOpened(Handle const& process, Call call) {
+    LastError const opening;
+    bool const done = call();
+    if (!done && process.get() == nullptr) opening.restore();
+    return done;
+}
 
 } // namespace
 
@@ -51,14 +64,13 @@ bool ProcessImpl::create(char const* application, unsigned long* processId, char
 }
 
 bool ProcessImpl::wait(unsigned long processId) {
-    // What cannot be opened is a handle that the call refuses.
     Handle const process(processCalls.openProcess(SYNCHRONIZE, FALSE, processId));
-    return process.awaitEnd();
+    return onOpened(process, [&] { return process.awaitEnd(); });
 }
 
 bool ProcessImpl::terminate(unsigned long processId) {
     Handle const process(processCalls.openProcess(PROCESS_TERMINATE, FALSE, processId));
-    return processCalls.terminateProcess(process.get(), 0) != FALSE;
+    return onOpened(process, [&] { return processCalls.terminateProcess(process.get(), 0) != FALSE; });
 }
 
 void* ProcessImpl::findFunction(void* module, char const* name) {

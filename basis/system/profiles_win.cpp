@@ -22,7 +22,7 @@ bool readKeyName(DWORD index, Blob& buffer, BufStr<255>& name) {
         LSTATUS const result =
             queryCalls.enumKey(HKEY_USERS, index, buffer.buf(), &n, nullptr, nullptr, nullptr, nullptr);
         if (result == ERROR_SUCCESS) return setBounded(name, buffer.val(), n), true;
-        if (result != ERROR_MORE_DATA || !growBuffer(buffer, n)) return false;
+        if (result != ERROR_MORE_DATA || !growBuffer(buffer, n)) return told(result);
     }
 }
 

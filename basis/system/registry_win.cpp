@@ -1,5 +1,6 @@
 #include "basis/system/registry_win.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/query_calls_win.h"
 
 namespace ZOR_Basis {
@@ -8,6 +9,11 @@ namespace {
 constexpr std::uint64_t MOST_ROOM = 64 * 1024 * 1024;
 
 } // namespace
+
+bool told(LSTATUS result) {
+    if (result != ERROR_SUCCESS) SetLastError(static_cast<DWORD>(result));
+    return result == ERROR_SUCCESS;
+}
 
 bool growBuffer(Blob& buffer, std::uint64_t reported) {
     std::uint64_t const room = reported > buffer.sizeBuf() ? reported : 2 * buffer.sizeBuf();
@@ -19,15 +25,17 @@ bool growBuffer(Blob& buffer, std::uint64_t reported) {
 bool isText(DWORD type) { return type == REG_SZ || type == REG_EXPAND_SZ || type == REG_MULTI_SZ; }
 
 RegistryKey::RegistryKey(HKEY parent, char const* path, REGSAM access) {
-    if (queryCalls.openKey(parent, path, 0, access, &key_) != ERROR_SUCCESS) key_ = nullptr;
+    if (!told(queryCalls.openKey(parent, path, 0, access, &key_))) key_ = nullptr;
 }
 
 RegistryKey::~RegistryKey() {
-    if (isOpen()) queryCalls.closeKey(key_);
+    if (!isOpen()) return;
+    KeepLastError const keep;
+    queryCalls.closeKey(key_);
 }
 
 bool RegistryKey::has(char const* value) const {
-    return isOpen() && queryCalls.queryValue(key_, value, nullptr, nullptr, nullptr, nullptr) == ERROR_SUCCESS;
+    return isOpen() && told(queryCalls.queryValue(key_, value, nullptr, nullptr, nullptr, nullptr));
 }
 
 bool RegistryKey::read(char const* value, Blob& buffer, Growth growth) const {
@@ -42,7 +50,7 @@ bool RegistryKey::read(char const* value, Blob& buffer, Growth growth) const {
     };
     LSTATUS result = ask();
     if (result == ERROR_MORE_DATA && growth == ONCE && growBuffer(buffer, n)) result = ask();
-    if (result != ERROR_SUCCESS || !isText(type)) return false;
+    if (!told(result == ERROR_SUCCESS && !isText(type) ? ERROR_UNSUPPORTED_TYPE : result)) return false;
     buffer.setSize(n);
     return true;
 }

@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/accounts_posix.h"
 #include "basis/system/query_calls_posix.h"
 #include "basis/system/text_parts.h"
@@ -62,7 +63,7 @@ bool Sys::CurrentDomain(BufStr<15>& domain, bool fromUser) {
 
 bool Sys::DefaultLogin(BufStr<15>& login) {
     login.clear();
-    return false;
+    return refuse(Reason::NOT_SUPPORTED);
 }
 
 bool Sys::CurHumanUser(BufStr<15>& user) {

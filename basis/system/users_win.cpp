@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/files/last_error.h"
 #include "basis/system/profiles_win.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/registry_win.h"
@@ -70,9 +71,10 @@ bool Sys::CurHumanUser(BufStr<15>& user) {
         if (!profile.user.empty()) return user = profile.user, true;
     }
     user.clear();
-    if (readThreadUser(user) && !user.empty() && !isMachine(user)) return true;
+    if (!readThreadUser(user)) return false;
+    if (!user.empty() && !isMachine(user)) return true;
     user.clear();
-    return false;
+    return refuse(Reason::NOT_FOUND);
 }
 
 } // namespace ZOR_Basis

@@ -1,5 +1,6 @@
 #include "zor_basis/walk/file_iterator.h"
 
+#include "basis/files/last_error.h"
 #include "basis/platform/xos_basics.h"
 #include "zor_basis/files/f_stat.h"
 
@@ -26,8 +27,29 @@ bool isPassedOver(char const* name) {
 FileEntry entryOf(FPath const& dir, char const* name, bool platformFallback) {
     FStat const status(FPath(dir, name), platformFallback);
     // kept walk-02: visitors handle two kinds, and removing or copying a tree is what suits the rest.
-    return {status.isFile() ? FStat::ST_FILE : FStat::ST_DIR, dir, name, status.size(), status.modified()};
+    if (status.isFile()) return {FStat::ST_FILE, dir, name, status.size(), status.modified()};
+    return {FStat::ST_DIR, dir, name, 0, status.modified()};
 }
+
+/// The result of a ride: that of the last entry, and with it the reason of its failure.
+class LastResult {
+public:
+    LastResult& operator=(bool result) {
+        result_ = result;
+        if (!result) why_ = LastError();
+        return *this;
+    }
+    operator bool() const { return result_; }
+    /// What a ride returns once the listing is over, which has last errors of its own.
+    bool told() const {
+        if (!result_) why_.restore();
+        return result_;
+    }
+
+private:
+    bool result_ = true;
+    LastError why_;
+};
 
 } // namespace
 
@@ -103,7 +125,7 @@ bool FileIterator::deepIteration(FileVisitor* visitor, bool stopOnFalse) {
 }
 
 bool FileIterator::shallowRide(FileVisitor* visitor, bool stopOnFalse) {
-    bool result = true;
+    LastResult result;
     while ((result || !stopOnFalse) && !visitor->stop()) {
         char const* const name = nextName(kindOf(WALKED, type_));
         if (name == nullptr) break;
@@ -113,11 +135,11 @@ bool FileIterator::shallowRide(FileVisitor* visitor, bool stopOnFalse) {
         // kept walk-05: who wants to know of each failure stops on it, or counts in the visitor.
         result = visitor->perform(&entry);
     }
-    return result;
+    return result.told();
 }
 
 bool FileIterator::deepRide(FileVisitor* visitor, bool stopOnFalse) {
-    bool result = true;
+    LastResult result;
     while ((result || !stopOnFalse) && !visitor->stop()) {
         char const* const name = nextName(DIRECTORIES);
         if (name == nullptr) break;
@@ -126,7 +148,7 @@ bool FileIterator::deepRide(FileVisitor* visitor, bool stopOnFalse) {
         child.path_.add(name);
         result = child.doIt(visitor, true, stopOnFalse);
     }
-    return result;
+    return result.told();
 }
 
 bool FileIterator::start(bool useWildcard) { return open(useWildcard, useWildcard); }
@@ -141,7 +163,9 @@ char const* FileIterator::next() {
 }
 
 void FileIterator::finish() {
-    if (handle_ != 0) xos_DirClose(handle_);
+    if (handle_ == 0) return;
+    KeepLastError const keep;
+    xos_DirClose(handle_);
     handle_ = 0;
 }
 

@@ -2,6 +2,7 @@
 
 #include "host/windows_api.h"
 #include "host/xos_url/fetch.h"
+#include "host/xos_url/reason.h"
 
 #include <cwchar>
 #include <memory>
@@ -17,7 +18,10 @@ namespace {
 
 struct CloseInternet {
     using pointer = HINTERNET;
-    void operator()(HINTERNET handle) const { WinHttpCloseHandle(handle); }
+    void operator()(HINTERNET handle) const {
+        KeepReason const keep;
+        WinHttpCloseHandle(handle);
+    }
 };
 using Handle = std::unique_ptr<HINTERNET, CloseInternet>;
 
@@ -163,7 +167,7 @@ bool readBody(HINTERNET request, BodySink& sink) {
     for (;;) {
         DWORD count = 0;
         if (WinHttpReadData(request, piece.data(), static_cast<DWORD>(piece.size()), &count) == FALSE) { return false; }
-        if (count == 0) { return !announced.has_value() || *announced == received; }
+        if (count == 0) { return !announced.has_value() || *announced == received || failFor(Reason::badAnswer); }
         received += count;
         if (!sink.take(piece.data(), count)) { return false; }
     }
@@ -195,9 +199,12 @@ Outcome fetchOnce(HINTERNET session, FetchRequest const& wanted, std::wstring& u
     if (leadsOn(status)) {
         std::wstring const location = header(request.get(), WINHTTP_QUERY_LOCATION);
         url = combined(url, location);
-        return location.empty() ? Outcome::failed : Outcome::leadsOn;
+        if (!location.empty()) { return Outcome::leadsOn; }
     }
-    return status >= 200 && status < 300 && readBody(request.get(), sink) ? Outcome::good : Outcome::failed;
+    // Without any status the system has said why.
+    bool const isGood = status >= 200 && status < 300;
+    if (!isGood && status != 0) { failForStatus(static_cast<long>(status)); }
+    return isGood && readBody(request.get(), sink) ? Outcome::good : Outcome::failed;
 }
 
 bool isSameServer(std::wstring const& a, std::wstring const& b, FetchRequest const& request) {
@@ -221,7 +228,7 @@ bool fetch(FetchRequest const& wanted, BodySink& sink) {
             request.user = nullptr;
         }
     }
-    return outcome == Outcome::good;
+    return outcome == Outcome::good || (outcome == Outcome::leadsOn && failFor(Reason::tooManySteps));
 }
 
 } // namespace host

@@ -1,5 +1,6 @@
 #include "host/xos_url/target_file.h"
 
+#include "host/xos_url/reason.h"
 #include "host/xos_url/url_files.h"
 
 #include <atomic>
@@ -22,6 +23,7 @@ constexpr int MOST_ATTEMPTS = 100;
 TargetFile::TargetFile(std::string path) : _path(std::move(path)) {}
 
 TargetFile::~TargetFile() {
+    KeepReason const keep;
     if (_file != nullptr) { std::fclose(_file); }
     if (!_temporary.empty()) { removeFile(_temporary); }
 }

@@ -1,5 +1,6 @@
 // Sibling: url_files_win.cpp.
 
+#include "host/xos_url/reason.h"
 #include "host/xos_url/url_files.h"
 
 #include <algorithm>
@@ -8,6 +9,17 @@
 #include <unistd.h>
 
 namespace host {
+
+namespace {
+
+bool isRegular(int file) {
+    struct stat status {};
+    if (fstat(file, &status) != 0) { return false; }
+    if (S_ISDIR(status.st_mode)) { return failFor(Reason::directory); }
+    return S_ISREG(status.st_mode) || failFor(Reason::badArgument);
+}
+
+} // namespace
 
 std::string systemPath(std::string path) {
     std::replace(path.begin(), path.end(), '\\', '/');
@@ -24,12 +36,10 @@ std::FILE* createNewFile(std::string const& path) {
 std::FILE* openRegularFile(std::string const& path) {
     // Without waiting for a writer, should the name be a pipe's.
     int const file = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    struct stat status {};
-    if (file < 0 || fstat(file, &status) != 0 || !S_ISREG(status.st_mode)) {
-        if (file >= 0) { close(file); }
-        return nullptr;
-    }
-    return fdopen(file, "rb");
+    if (file < 0 || isRegular(file)) { return file < 0 ? nullptr : fdopen(file, "rb"); }
+    KeepReason const keep;
+    close(file);
+    return nullptr;
 }
 
 bool replaceFile(std::string const& from, std::string const& to) { return rename(from.c_str(), to.c_str()) == 0; }

@@ -2,6 +2,7 @@
 
 #include "host/control_link/control_link.h"
 #include "host/xos_url/fetch.h"
+#include "host/xos_url/reason.h"
 #include "host/xos_url/target_file.h"
 #include "host/xos_url/url_files.h"
 #include "host/xos_url/url_text.h"
@@ -33,15 +34,23 @@ bool copyBytes(std::FILE* from, TargetFile& to) {
     return std::ferror(from) == 0;
 }
 
+struct Close {
+    void operator()(std::FILE* file) const {
+        KeepReason const keep;
+        std::fclose(file);
+    }
+};
+
 /// Closed when it returns: the source may be the target itself.
 bool readFile(FileUrl const& url, TargetFile& target) {
-    std::unique_ptr<std::FILE, int (*)(std::FILE*)> const source{openRegularFile(pathOfFileUrl(url)), std::fclose};
+    std::unique_ptr<std::FILE, Close> const source{openRegularFile(pathOfFileUrl(url))};
     return source != nullptr && target.open() && copyBytes(source.get(), target);
 }
 
 bool getFile(char const* url, TargetFile& target) {
     std::optional<FileUrl> const parsed = parseFileUrl(url);
-    return parsed.has_value() && readFile(*parsed, target) && target.commit();
+    if (!parsed.has_value()) { return failFor(Reason::badArgument); }
+    return readFile(*parsed, target) && target.commit();
 }
 
 bool getOverHttp(FetchRequest const& request, TargetFile& target) {
@@ -58,7 +67,7 @@ bool get(char const* url, char const* targetPath, char const* user, char const* 
     case Scheme::https:
         return getOverHttp({escapedUrl(url), user, password, CONNECT_SECONDS, STALL_SECONDS}, target);
     default:
-        return false;
+        return failFor(Reason::unknownScheme);
     }
 }
 
@@ -70,8 +79,11 @@ extern "C" int xos_URLGet(char const* url, char const* target, char const* first
     using host::addressArgument;
     constexpr int FAILED = -1;
     if (host::failsNow("xos_URLGet", {addressArgument(url), addressArgument(target), addressArgument(first),
-                                      addressArgument(second)}) ||
-        url == nullptr || target == nullptr || *target == '\0') {
+                                      addressArgument(second)})) {
+        return FAILED;
+    }
+    if (url == nullptr || target == nullptr || *target == '\0') {
+        host::failFor(host::Reason::badArgument);
         return FAILED;
     }
     return host::get(url, target, first, second) ? 0 : FAILED;

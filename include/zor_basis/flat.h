@@ -47,6 +47,7 @@ ZB_EXTERN_C ZB_API int ZB_resolveURIEscapes(char const* in, char* out);
 /// \param noResult   true: the platform layer is asked for no exit code; stand-alone this does not wait for the command
 /// \kept flat-03: a null or empty directory leaves a "cd" without an argument: "cd & COMMAND"
 /// \return whether the interpreter was started, whatever became of the command
+/// \error after a false the last error says why (docs/reasons.md)
 /// \thread any; the calling one waits
 ZB_EXTERN_C ZB_API bool ZB_runCommand(char const* command, char const* directory, bool noResult);
 

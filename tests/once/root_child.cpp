@@ -6,14 +6,26 @@
 //   fake PATH       whether the path is fake, and its translation, narrow
 //   wide PATH       the same, wide
 //   pathroot        WcPath::pathRoot
+//   set PATH        makes it WcPath::pathRoot
+//   clear           empties that
+//   ask             what many threads at once get for Sys::root(), and how often the platform layer was asked
+//   race EXPECTED   translates "/scsi0", wide, in many threads at once, and prints how often the result was another
+//   refill EXPECTED the same again and again, each time with WcPath::pathRoot emptied before
 
 #include <zor_basis/files/f_path.h>
 #include <zor_basis/files/wc_path.h>
 #include <zor_basis/system/sys.h>
 #include <zor_basis/text/convert.h>
 
+#include <xos_host.h>
+
+#include <atomic>
 #include <cstdio>
 #include <cstring>
+#include <set>
+#include <string>
+#include <thread>
+#include <vector>
 
 using namespace ZOR_Basis;
 
@@ -49,6 +61,63 @@ void wide(char const* text) {
     print(static_cast<WStr const&>(inPlace));
 }
 
+/// Runs a function in threads that begin together.
+template <class Function>
+void inThreads(unsigned n, Function function) {
+    std::atomic<unsigned> waiting{n};
+    std::vector<std::thread> threads;
+    for (unsigned i = 0; i < n; ++i) {
+        threads.emplace_back([&, i] {
+            --waiting;
+            while (waiting != 0) std::this_thread::yield();
+            function(i);
+        });
+    }
+    for (std::thread& thread : threads) thread.join();
+}
+
+void ask() {
+    constexpr unsigned THREADS = 32;
+    std::vector<FPath const*> answers(THREADS);
+    inThreads(THREADS, [&](unsigned i) { answers[i] = &Sys::root(); });
+    std::set<FPath const*> const different(answers.begin(), answers.end());
+    std::printf("%d calls, %d paths, ", static_cast<int>(xos_HostCalls("xos_FileSystemRoot")),
+                static_cast<int>(different.size()));
+    print(static_cast<Str const&>(*answers.front()));
+}
+
+/// The translations that are not the expected one.
+int wrongTranslations(char const* expected, unsigned times) {
+    WBStr units;
+    Convert::Utf8ToWide(expected, units);
+    std::atomic<int> wrong{0};
+    inThreads(4, [&](unsigned) {
+        for (unsigned i = 0; i < times; ++i) {
+            WcPath path;
+            path.translateRoot(ZB_W("/scsi0"));
+            if (path.size() != units.size() || std::memcmp(path.wstr(), units.wstr(), 2 * units.size()) != 0) ++wrong;
+        }
+    });
+    return wrong;
+}
+
+void race(char const* expected) { std::printf("%d wrong\n", wrongTranslations(expected, 1000)); }
+
+void refill(char const* expected) {
+    int wrong = 0;
+    for (int round = 0; round < 40; ++round) {
+        WcPath::pathRoot.clear();
+        wrong += wrongTranslations(expected, 20);
+    }
+    std::printf("%d wrong\n", wrong);
+}
+
+void set(char const* text) {
+    WBStr units;
+    Convert::Utf8ToWide(text, units);
+    WcPath::pathRoot = static_cast<WStr const&>(units);
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
@@ -67,6 +136,16 @@ int main(int argc, char** argv) {
             wide(argv[i]);
         } else if (std::strcmp(argv[i], "pathroot") == 0) {
             print(static_cast<WStr const&>(WcPath::pathRoot));
+        } else if (std::strcmp(argv[i], "set") == 0 && ++i < argc) {
+            set(argv[i]);
+        } else if (std::strcmp(argv[i], "clear") == 0) {
+            WcPath::pathRoot.clear();
+        } else if (std::strcmp(argv[i], "ask") == 0) {
+            ask();
+        } else if (std::strcmp(argv[i], "race") == 0 && ++i < argc) {
+            race(argv[i]);
+        } else if (std::strcmp(argv[i], "refill") == 0 && ++i < argc) {
+            refill(argv[i]);
         } else {
             return 2;
         }

@@ -73,6 +73,17 @@ private:
 
 } // namespace
 
+TEST_F(FileIteratorTest, gives_directories_the_size_0) {
+    fill();
+    Recorder seen;
+    EXPECT_TRUE(FileIterator(scratch.path(), LOOK_BOTH, nullptr, nullptr).doIt(&seen, true, false));
+    std::multiset<std::string> sizes;
+    for (FileEntry const& entry : seen.entries)
+        sizes.insert(std::string(entry.getName().c_str()) + " " + std::to_string(entry.getSize()));
+    EXPECT_EQ(sizes, (Found{"a.txt 5", "b.dat 0", "d 0", "c.txt 1", "e 0", "f.TXT 1"}));
+    for (FileEntry const& entry : seen.entries) EXPECT_GT(entry.getTime(), 0);
+}
+
 TEST_F(FileIteratorTest, breathes) {
     fill();
     EXPECT_EQ(walked(LOOK_BOTH, nullptr, true), (Found{"a.txt", "b.dat", "d/", "d/c.txt", "d/e/", "d/e/f.TXT"}));

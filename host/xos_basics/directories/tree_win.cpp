@@ -112,8 +112,9 @@ struct CopyRules {
 /// Recreates a link to a directory.
 bool copyDirectoryLink(std::wstring const& from, std::wstring const& to, bool overwrite) {
     EntryFacts present{};
-    if (factsOf(to, present) && (!overwrite || present.isDirectory() || !removeFileEntry(to))) {
-        return failWith(ERROR_ALREADY_EXISTS);
+    if (factsOf(to, present)) {
+        if (!overwrite || present.isDirectory()) { return failWith(ERROR_ALREADY_EXISTS); }
+        if (!removeFileEntry(to)) { return false; }
     }
     return CreateDirectoryExW(from.c_str(), to.c_str(), nullptr) != 0;
 }

@@ -24,6 +24,7 @@
 /// The members of the list are there too. `write` does not notice what is changed through them, and keys must stay
 /// different.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_CONTAINERS_DICT_H

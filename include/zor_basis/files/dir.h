@@ -7,6 +7,7 @@
 ///
 /// On Linux a symbolic link is neither a file nor a directory, except where a function says otherwise.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  thread-safe as far as the file system is
 
 #ifndef ZOR_BASIS_FILES_DIR_H
@@ -25,7 +26,7 @@ public:
 
     /// Makes a directory. One that is there already is as good, on Linux also a link to one.
     /// \param makeParents  first `NewFor`
-    /// \kept dir-01: a path without a slash has no parent that could be made, so `makeParents` fails there
+    /// \kept dir-01: a path without a slash has no parent that could be made, so `makeParents` fails there; "./name" has one
     /// \return false where a file is in the way, a parent cannot be made, or the platform layer fails
     static bool New(char const* path, bool makeParents);
 
@@ -59,13 +60,15 @@ public:
     /// Makes `dst` another name of the file `src`.
     static bool Link(char const* dst, char const* src);
 
-    /// Finds the deepest existing directory above the last component of a path.
-    /// \param existing  receives that directory, without a slash at its end
+    /// Finds the deepest existing entry above the last component of a path: looks at the whole path without its slashes at
+    /// the end, while that exists, and then at what stands before each earlier slash.
+    /// \param existing  receives that entry, without a slash at its end
     /// \param rest  receives what follows it in the path; existing components that end in a slash are taken for such
     /// \kept dir-04: a slash at index 0 or 1 is never looked at, so paths of fewer than three characters, and all that exist
     ///     no deeper than there, give false
     /// \pre the outputs are not the path
-    /// \return false, with both outputs empty, if there is none
+    /// \return false if there is none: `rest` is empty then, and `existing` what was looked at last, or the whole path; of
+    ///         paths that are too short it is empty, too
     static bool SplitCheck(char const* path, FPath& existing, FPath& rest);
 };
 

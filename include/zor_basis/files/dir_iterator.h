@@ -9,6 +9,7 @@
 /// is what it leads to, and a byte of a name that is not UTF-8 becomes U+DC80 to U+DCFF, which every function of this
 /// library that takes wide paths turns back.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_FILES_DIR_ITERATOR_H

@@ -8,7 +8,8 @@
 /// `add` and `normalize` write "/", `assureTermSlash` writes "\".
 ///
 /// **Fake roots.** Paths of the server may begin with a device: "/scsi0/tmp/a", "/JS_Root/b". `translateRoot` puts the
-/// installation's root folder (`Sys::root()`) in its place. The root is asked for at the first test and kept.
+/// installation's root folder (`Sys::root()`) in its place. The root is asked for at the first test and kept. While it is
+/// empty nothing is fake, except where it is the whole file system, "/" on Linux.
 ///
 /// **Sources.** A length of 0 means up to the terminator; a null text is an empty one. A source may lie inside the path's
 /// own text, but the outputs of `split` and `ParseUrl` are never the source.

@@ -7,6 +7,7 @@
 /// **Links.** Under Windows the system follows links. On Linux narrow paths do not, so that a link is `ST_LINK` and
 /// neither a file nor a directory, while wide paths do.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time for each object; the static forms are thread-safe
 
 #ifndef ZOR_BASIS_FILES_F_STAT_H
@@ -40,7 +41,7 @@ public:
     /// Takes a new snapshot.
     /// \param platformFallback  asks the platform layer where the system finds nothing: it may reach shares with other
     ///        credentials
-    /// \return whether there is an entry; a null path has none
+    /// \return whether there is an entry; a null path is the empty one, which has none
     /// \cost one system call for an entry that is there
     bool update(char const* path) { return update(path, true); }
     bool update(char const* path, bool platformFallback);

@@ -17,6 +17,10 @@
 ///
 /// Operations on whole files take the destination first and are done by the platform layer. A null path is an empty one.
 ///
+/// **`makeDirs` wants a slash.** A bare name ("page.ps") has no folder in it that could be made, so that `makeDirs` fails for
+/// it, also where the file could be made in the current folder. Write "./page.ps" (dir-01).
+///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time for each object; the static operations are thread-safe as far as the file system is
 
 #ifndef ZOR_BASIS_FILES_FILE_H
@@ -89,24 +93,26 @@ public:
     IFile* operator->() const { return file_; }
 
     /// Makes sure that there is a regular file; one that is there is not touched.
-    /// \param makeDirs  first `Dir::NewFor`
+    /// \param makeDirs  first `Dir::NewFor`, which fails for a bare name: write "./name"
     /// \return false where a directory of that name is there, and where the file cannot be made
     static bool New(char const* path, bool makeDirs);
 
     /// Removes a file. \param flagA, flagB  hand flags 0x400 and 0x800 to the platform layer
     static bool Rem(char const* path, bool flagA, bool flagB);
 
-    /// Copies a file. \param makeDirs  first `Dir::NewFor` of the destination
+    /// Copies a file.
+    /// \param makeDirs  first `Dir::NewFor` of the destination, which fails for a bare name: write "./name"
     static bool Copy(char const* dst, char const* src, bool overwrite, bool makeDirs);
 
     /// Moves a file; where the platform layer cannot move, copies it and removes the source.
+    /// \param makeDirs  first `Dir::NewFor` of the destination, which fails for a bare name, and the source stays
     /// \kept file-04: the source is removed even when the copy has failed, or its directories could not be made again
     /// \return whether the move or the copy succeeded
     static bool Move(char const* dst, char const* src, bool overwrite, bool makeDirs);
 
     /// Makes `dst` another name of `src`, or a copy where that cannot be. What is there already is removed first, with
     /// `overwrite`: a directory with all that is in it.
-    /// \param makeDirs  `Dir::NewFor`, where nothing is there yet
+    /// \param makeDirs  `Dir::NewFor`, where nothing is there yet; fails for a bare name: write "./name"
     /// \return false where something is there without `overwrite`, and on any failure
     static bool LinkOrCopy(char const* dst, char const* src, bool overwrite, bool makeDirs);
 

@@ -9,6 +9,7 @@
 /// | `seek` | the new position, 0 on failure | 0 on success, else not 0 | the new position, -1 on failure |
 /// | `read`, `write` on failure | fewer bytes | fewer bytes | all ones |
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_FILES_I_FILE_H

@@ -4,7 +4,8 @@
 /// The members do what those of `FPath` do, except where a `\kept` line says otherwise; there are no wide forms of
 /// `ParseUrl`, `addDecodedUrl` and the translating constructors.
 ///
-/// \thread  one thread at a time for each object; `pathRoot` is filled once, whichever thread asks first
+/// \thread  one thread at a time for each object. `pathRoot` is filled once, whichever thread asks first; an application sets
+///     or clears it while no other thread uses wide paths
 
 #ifndef ZOR_BASIS_FILES_WC_PATH_H
 #define ZOR_BASIS_FILES_WC_PATH_H
@@ -33,7 +34,8 @@ public:
     static constexpr WChar slashBad = FORW_SLASH;
 
     /// The root folder in wide form. Filled at the first test for a fake root from `Sys::root()`, which is UTF-8; while
-    /// that cannot be converted, or is empty, this stays empty and the next test tries again.
+    /// that cannot be converted, or is empty, this stays empty and the next test tries again. What an application puts here
+    /// is the root of all wide paths from then on; once it is cleared the next test fills it again.
     static WcPath pathRoot;
 
     WcPath() = default;

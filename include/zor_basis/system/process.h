@@ -16,6 +16,7 @@
 /// blank for its end in turn ("C:\Program Files\x.exe" may start C:\Program.exe); and text from elsewhere that goes into a
 /// command line has to be quoted by whoever builds it.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  thread-safe
 
 #ifndef ZOR_BASIS_SYSTEM_PROCESS_H

@@ -15,6 +15,7 @@
 ///
 /// A registry value longer than 512 bytes, or of a type that is no text, counts as missing unless told otherwise.
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  thread-safe. Acting as a user is a matter of the calling thread alone; on Linux threads that it starts
 ///     meanwhile inherit it
 
@@ -38,9 +39,11 @@ public:
     /// One slash at its end is taken away, and then a last component "system", so that the parent of that is the root.
     /// \kept root-01: a current folder of 512 bytes or more gives the empty path at the first call. Each call that fails
     ///     doubles the room for the next one: 512 to 1,023 bytes are found by the second call, up to 2,047 by the third
-    /// \return a path that lives as long as the process and never changes; the empty path while there is none. On Linux
-    ///         a root of "/" is the empty path too; what is made from it is absolute nonetheless ("/tmp", "/timer")
-    /// \cost the system is asked once, or, while the root is empty, at each call
+    /// \return a path that lives as long as the process and never changes; the empty path while there is none: that
+    ///         reference stays empty when a root is found later, so ask again instead of keeping it. On Linux a root of "/" is
+    ///         the empty path too; what is made from it is absolute nonetheless ("/tmp", "/timer")
+    /// \thread any; one thread asks the system, the others wait for its answer
+    /// \cost the system is asked once, or, while the root is empty, at each call, by one thread at a time
     static FPath const& root();
     /// Copies the root. \return whether it is not empty
     static bool root(FPath& out);

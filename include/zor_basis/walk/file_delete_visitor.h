@@ -1,5 +1,7 @@
 /// \file
 /// `FileDeleteVisitor`: removes the entries that a walk reports. And `zbCheckRemoveFileDir`, which removes one.
+///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_DELETE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_DELETE_VISITOR_H

@@ -24,13 +24,14 @@
 ///
 /// \kept walk-01: the two uses differ for `LOOK_ALL`, as tabled above
 /// \kept walk-02: an entry of a walk is a file where its status says regular file; all else is reported as a directory:
-///     links, devices, and what has gone meanwhile
+///     links, devices, and what has gone meanwhile. Only files have a size
 /// \kept walk-03: walks neither report nor enter an entry of the exact name "__MACOS"; the flat listing gives it
 /// \kept walk-04: sub-directories are entered whatever the wildcard and the condition say of them
 /// \kept walk-05: the result is that of the last `perform`, so that without `stopOnFalse` a later success hides a failure; a
 ///     deep walk's is that of its last sub-directory, true without one: it is true unless `stopOnFalse` or `stop` ends it
 /// \kept walk-06: a directory that cannot be opened is empty: a walk of it is true, and calls the visitor never
 ///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 /// \thread  one thread at a time
 
 #ifndef ZOR_BASIS_WALK_FILE_ITERATOR_H

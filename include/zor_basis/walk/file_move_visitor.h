@@ -1,5 +1,7 @@
 /// \file
 /// `FileMoveVisitor`: moves the entries that a walk reports into one directory.
+///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_MOVE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_MOVE_VISITOR_H

@@ -1,5 +1,7 @@
 /// \file
 /// `FileSizeVisitor`: sums the sizes of the entries that a walk reports.
+///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_SIZE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_SIZE_VISITOR_H

@@ -1,5 +1,7 @@
 /// \file
 /// `zbLinkOrCopy`: gives a file another name, or copies it.
+///
+/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_LINK_OR_COPY_H
 #define ZOR_BASIS_WALK_LINK_OR_COPY_H

@@ -1,0 +1,43 @@
+// Sibling: reason_posix.cpp.
+
+#include "host/xos_url/reason.h"
+
+#include "host/windows_api.h"
+
+#include <winhttp.h>
+
+namespace host {
+
+namespace {
+
+DWORD codeOf(Reason reason) {
+    switch (reason) {
+    case Reason::badArgument:
+        return ERROR_INVALID_PARAMETER;
+    case Reason::unknownScheme:
+        return ERROR_WINHTTP_UNRECOGNIZED_SCHEME;
+    case Reason::notFound:
+        return ERROR_FILE_NOT_FOUND;
+    case Reason::forbidden:
+        return ERROR_ACCESS_DENIED;
+    case Reason::directory:
+        return ERROR_ACCESS_DENIED;
+    case Reason::tooManySteps:
+        return ERROR_WINHTTP_REDIRECT_FAILED;
+    case Reason::badAnswer:
+        return ERROR_WINHTTP_INVALID_SERVER_RESPONSE;
+    }
+    return ERROR_GEN_FAILURE;
+}
+
+} // namespace
+
+bool failFor(Reason reason) {
+    SetLastError(codeOf(reason));
+    return false;
+}
+
+KeepReason::KeepReason() : _code(GetLastError()) {}
+KeepReason::~KeepReason() { SetLastError(_code); }
+
+} // namespace host
