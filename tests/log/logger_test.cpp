@@ -1,3 +1,4 @@
+#include "tests/host/support/system_error.h"
 #include "tests/log/driven_logger.h"
 #include "tests/support/table.h"
 
@@ -401,6 +402,26 @@ TEST_F(LoggerTest, keeps_what_it_cannot_flush) {
     EXPECT_TRUE(logger.flush());
     EXPECT_EQ(content(0), "first\n");
     EXPECT_EQ(content(1), "second\n");
+}
+
+TEST_F(LoggerTest, leaves_the_reason_why_it_cannot_be_flushed) {
+    LoggerImpl& logger = start();
+    std::filesystem::create_directory(file(0));
+    write(logger, "line");
+    clearSystemError();
+    EXPECT_FALSE(logger.flush());
+    int const whenDirectory = systemError();
+    std::filesystem::remove(file(0));
+    std::filesystem::remove(folder() + "/" + name());
+    clearSystemError();
+    EXPECT_FALSE(logger.flush());
+    int const whenFolderMissing = systemError();
+    EXPECT_NE(whenDirectory, 0);
+    EXPECT_NE(whenFolderMissing, 0);
+    EXPECT_NE(whenDirectory, whenFolderMissing);
+    std::filesystem::create_directory(folder() + "/" + name());
+    EXPECT_TRUE(logger.flush());
+    EXPECT_EQ(content(0), "line\n");
 }
 
 TEST_F(LoggerTest, flushes_what_was_there_and_ends_although_lines_come_meanwhile) {
