@@ -2,17 +2,28 @@
 
 #include "basis/text/inline_text_impl.h"
 
-#include <cstdio>
+#include <charconv>
 
 namespace ZOR_Basis {
 
+namespace {
+
+template <class String, class Number>
+String& addDigits(String& text, Number number) {
+    char digits[24];
+    *std::to_chars(digits, digits + sizeof digits - 1, number).ptr = '\0';
+    return text.add(digits);
+}
+
+} // namespace
+
 template <std::uint64_t N>
 requires(N == 15 || N == 255) BufStr<N>
-&BufStr<N>::addNumber(int number) {
-    char digits[64];
-    std::snprintf(digits, sizeof digits, "%d", number);
-    return add(digits);
-}
+&BufStr<N>::addNumber(std::int64_t number) { return addDigits(*this, number); }
+
+template <std::uint64_t N>
+requires(N == 15 || N == 255) BufStr<N>
+&BufStr<N>::addNumber(std::uint64_t number) { return addDigits(*this, number); }
 
 template <std::uint64_t N>
 requires(N == 15 || N == 255) BufStr<N>

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <type_traits>
 #include <vector>
 
 using namespace ZOR_Basis;
@@ -58,6 +60,26 @@ TEST(PtrArray, leaves_skipped_slots_null) {
     EXPECT_EQ(array[3], &values[1]);
     EXPECT_EQ(array.insertBack(&values[2]), 21u);
     EXPECT_EQ(array.capacity(), 42u);
+}
+
+TEST(PtrArray, is_walked_from_its_first_slot_to_its_size) {
+    PtrArray<int> array;
+    PtrArray<int> const& constant = array;
+    EXPECT_EQ(array.begin(), array.end());
+    EXPECT_EQ(constant.begin(), constant.end());
+    array.insertBack(&values[1]);
+    array.set(&values[2], 9); // beyond the first block
+    std::vector<int*> const expected{&values[1], nullptr, nullptr, nullptr, nullptr,
+                                     nullptr,    nullptr, nullptr, nullptr, &values[2]};
+    EXPECT_EQ(std::vector<int*>(array.begin(), array.end()), expected);
+    EXPECT_EQ(std::vector<int*>(constant.begin(), constant.end()), expected);
+    int found = 0;
+    for (int* pointer : constant) found += pointer != nullptr ? 1 : 0;
+    EXPECT_EQ(found, 2);
+    EXPECT_EQ(std::find(constant.begin(), constant.end(), &values[2]) - constant.begin(), 9);
+    std::replace(array.begin(), array.end(), &values[1], &values[3]);
+    EXPECT_EQ(array[0], &values[3]);
+    static_assert(std::is_same_v<decltype(*constant.begin()), int* const&>);
 }
 
 TEST(PtrArray, takes_a_capacity_of_0_for_1) {

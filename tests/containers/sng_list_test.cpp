@@ -9,6 +9,8 @@
 #include <iterator>
 #include <new>
 #include <string>
+#include <type_traits>
+#include <utility>
 #include <vector>
 
 using namespace ZOR_Basis;
@@ -204,6 +206,72 @@ TEST(SngList, adopts_a_chain) {
     auto* const unit = new List::Unit{first, {0, 0}}; // whatever its link says
     list.insertBack(unit);
     EXPECT_EQ(text(list), "1 2 3 4 0 ");
+}
+
+TEST(SngList, is_walked_without_being_changed) {
+    List list = make({{3, 0}, {1, 0}, {2, 0}});
+    List const& constant = list;
+    std::string found;
+    for (Item const& item : constant) found += std::to_string(item.key);
+    EXPECT_EQ(found, "312");
+    static_assert(std::forward_iterator<List::const_iterator> && std::forward_iterator<List::iterator>);
+    static_assert(std::is_same_v<decltype(*constant.begin()), Item const&>);
+    static_assert(std::is_same_v<decltype(*list.cbegin()), Item const&>);
+    static_assert(std::is_convertible_v<List::iterator, List::const_iterator>);
+    static_assert(!std::is_convertible_v<List::const_iterator, List::iterator>);
+    List::const_iterator place = list.begin();
+    EXPECT_EQ(place.unit(), list.first());
+    EXPECT_EQ(place++->key, 3);
+    EXPECT_EQ(place->key, 1);
+    EXPECT_EQ((++place)->key, 2);
+    EXPECT_TRUE(++place == constant.end() && place == list.cend() && place != list.cbegin());
+    EXPECT_TRUE(list.begin() == list.cbegin() && list.cend() == list.end());
+    EXPECT_EQ(std::distance(constant.begin(), constant.end()), 3);
+    EXPECT_TRUE(List().cbegin() == List().cend());
+}
+
+TEST(SngList, tells_whether_it_is_empty) {
+    List list;
+    EXPECT_TRUE(list.empty());
+    list.insertBack(Item{1, 0});
+    EXPECT_FALSE(list.empty());
+    list.removeFirst();
+    EXPECT_TRUE(list.empty());
+}
+
+TEST(SngList, moves_its_units_and_copies_nothing) {
+    static_assert(std::is_nothrow_move_constructible_v<List> && std::is_nothrow_move_assignable_v<List>);
+    {
+        SngList<Scarce> scarce;
+        Scarce::left = 1;
+        scarce.insertBack(Scarce());
+        SngList<Scarce> moved(std::move(scarce));
+        scarce = std::move(moved);
+        EXPECT_EQ(scarce.size(), 1u) << "no copy was left to make";
+    }
+    EXPECT_EQ(Scarce::living, 0);
+    List source = make({{1, 0}, {2, 0}, {3, 0}});
+    List::Unit* const first = source.first();
+    List taken(std::move(source));
+    EXPECT_EQ(taken.first(), first);
+    EXPECT_EQ(text(taken), "1 2 3 ");
+    EXPECT_EQ(text(source), ""); // NOLINT(bugprone-use-after-move)
+    source.insertBack(Item{9, 0});
+    EXPECT_EQ(text(source), "9 ") << "the moved-from list is an empty one";
+    EXPECT_EQ(source.last(), source.first());
+    int const living = Item::living;
+    source = std::move(taken);
+    EXPECT_EQ(Item::living, living - 1) << "what was there before is deleted at once";
+    EXPECT_EQ(source.first(), first);
+    EXPECT_EQ(text(source), "1 2 3 ");
+    EXPECT_EQ(text(taken), ""); // NOLINT(bugprone-use-after-move)
+    source.insertBack(Item{4, 0});
+    EXPECT_EQ(text(source), "1 2 3 4 ");
+    List& self = source;
+    source = std::move(self);
+    EXPECT_EQ(text(source), "1 2 3 4 ");
+    source = make({{5, 0}});
+    EXPECT_EQ(text(source), "5 ");
 }
 
 TEST(SngList, inserts_behind_an_iterator) {

@@ -1,6 +1,8 @@
 /// \file
 /// `PtrArray<T>`: a growable array of pointers that owns none of what they point to.
 ///
+/// A walk from `begin()` to `end()` meets every slot below the size, including those that were skipped and are null.
+///
 /// \thread  one thread at a time
 /// \error  memory that runs short ends the program
 
@@ -60,6 +62,12 @@ public:
 
     /// One more than the highest index in use.
     std::uint64_t size() const { return count_; }
+
+    /// The slots below the size; they move when the array grows.
+    T** begin() { return slots_; }
+    T** end() { return slots_ + count_; }
+    T* const* begin() const { return slots_; }
+    T* const* end() const { return slots_ + count_; }
 
 protected:
     /// Makes room for n pointers, and for at least twice as many as before where that is not enough already.

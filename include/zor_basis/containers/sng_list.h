@@ -6,7 +6,8 @@
 /// before their own so that they can remove and insert there; any other change of the list at their place makes them
 /// invalid.
 ///
-/// Values need to be copied only by the members that copy, and compared (`<`) only by those that sort.
+/// Values need to be copied only by the members that copy, and compared (`<`) only by those that sort. Moving a list moves
+/// its chain: units, and pointers to them, stay what they are.
 ///
 /// \thread  one thread at a time
 /// \error  memory that runs short when a unit is made comes out as `std::bad_alloc`
@@ -65,6 +66,39 @@ public:
         Unit* previous_ = nullptr;
     };
 
+    /// Reads the values of a list. Every iterator converts to one.
+    class const_iterator {
+    public:
+        using iterator_category = std::forward_iterator_tag;
+        using value_type = T;
+        using difference_type = std::ptrdiff_t;
+        using pointer = T const*;
+        using reference = T const&;
+
+        const_iterator() = default;
+        const_iterator(iterator const& other) : current_(other.unit()) {}
+        T const& operator*() const { return current_->value; }
+        T const* operator->() const { return &current_->value; }
+        /// The unit itself; null at the end.
+        Unit const* unit() const { return current_; }
+        const_iterator& operator++() {
+            current_ = current_->next;
+            return *this;
+        }
+        const_iterator operator++(int) {
+            const_iterator const before = *this;
+            ++*this;
+            return before;
+        }
+        friend bool operator==(const_iterator const& a, const_iterator const& b) { return a.current_ == b.current_; }
+
+    private:
+        friend SngList;
+        explicit const_iterator(Unit const* current) : current_(current) {}
+
+        Unit const* current_ = nullptr;
+    };
+
     SngList() = default;
     /// Adopts a chain as it is. \pre `first` leads to `last`, whose link is null, over `count` units
     SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_(count) {}
@@ -72,10 +106,20 @@ public:
     SngList(SngList const& other) : SngList() {
         for (Unit* unit = other.first_; unit != nullptr; unit = unit->next) insertBack(unit->value);
     }
+    /// Takes the other's units, which ends empty.
+    SngList(SngList&& other) noexcept { swap(other); }
     SngList& operator=(SngList const& other) {
         if (this != &other) {
             SngList copy(other);
             swap(copy);
+        }
+        return *this;
+    }
+    /// Deletes the own units and takes the other's, which ends empty; nothing for the list itself.
+    SngList& operator=(SngList&& other) noexcept {
+        if (this != &other) {
+            SngList taken(std::move(other));
+            swap(taken);
         }
         return *this;
     }
@@ -92,8 +136,13 @@ public:
     Unit* first() const { return first_; }
     Unit* last() const { return last_; }
     std::uint64_t size() const { return count_; }
+    bool empty() const { return count_ == 0; }
     iterator begin() { return {first_, nullptr}; }
     iterator end() { return {}; }
+    const_iterator begin() const { return const_iterator(first_); }
+    const_iterator end() const { return {}; }
+    const_iterator cbegin() const { return begin(); }
+    const_iterator cend() const { return end(); }
 
     void insertFront(T const& value) { insertFront(new Unit{nullptr, value}); }
     void insertFront(Unit* unit) {
@@ -212,7 +261,7 @@ public:
     }
 
 private:
-    void swap(SngList& other) {
+    void swap(SngList& other) noexcept {
         std::swap(first_, other.first_);
         std::swap(last_, other.last_);
         std::swap(count_, other.count_);

@@ -8,12 +8,13 @@
 
 #include "zor_basis/crypto/cr_hash.h"
 #include "zor_basis/export.h"
+#include "zor_basis/text/pointer_guard.h"
 
 namespace ZOR_Basis {
 
 class Crypt;
 
-class ZB_API CrHashPtr {
+class ZB_API CrHashPtr : public detail::NotDeletable<CrHashPtr> {
 public:
     /// Owns a new hash of the provider, and none for null.
     CrHashPtr(Crypt* crypt);

@@ -2,7 +2,8 @@
 /// `FPath`: a narrow path.
 ///
 /// A path is a `BufStr<255>` with path operations on top; all the text members of that class work on it, its `add` and
-/// `+=` excepted, which append path components here. Nothing touches the file system.
+/// `+=` excepted, which append path components here, a single character being one too. `<<` appends text as it stands.
+/// Nothing touches the file system.
 ///
 /// **Slashes.** Both kinds count as separators wherever a path is read. Which one is written depends on the operation:
 /// `add` and `normalize` write "/", `assureTermSlash` writes "\".
@@ -11,8 +12,8 @@
 /// installation's root folder (`Sys::root()`) in its place. The root is asked for at the first test and kept. While it is
 /// empty nothing is fake, except where it is the whole file system, "/" on Linux.
 ///
-/// **Sources.** A length of 0 means up to the terminator; a null text is an empty one. A source may lie inside the path's
-/// own text, but the outputs of `split` and `ParseUrl` are never the source.
+/// **Sources.** A length of 0 means up to the terminator; a null text is an empty one. A `std::string_view` counts as a
+/// `std::string` with the same bytes, and compares as one. A source may lie inside the path's own text, but the outputs of `split` and `ParseUrl` are never the source.
 ///
 /// \thread  one thread at a time for each object; the root is found once, whichever thread asks first
 
@@ -50,6 +51,8 @@ public:
     FPath(Str const& text) : BufStr(text) {}
     FPath(std::string const& text) : BufStr(text) {}
     FPath(char const* text, std::uint64_t len = 0) : BufStr(text, len) {}
+    template <detail::StringView View>
+    FPath(View text) : BufStr(text) {}
     template <detail::Index I>
     FPath(char const* text, I len) : FPath(text, static_cast<std::uint64_t>(len)) {}
     /// A copy of the first text, then `add` of the second.
@@ -65,6 +68,10 @@ public:
     FPath& operator=(Str const& text) { return BufStr::operator=(text), *this; }
     FPath& operator=(std::string const& text) { return BufStr::operator=(text), *this; }
     FPath& operator=(char const* text) { return BufStr::operator=(text), *this; }
+    template <detail::StringView View>
+    FPath& operator=(View text) {
+        return BufStr::operator=(text), *this;
+    }
 
     /// Becomes a copy of the first text, then `add` of the second; either may be a part of this path.
     FPath& assign(Str const& a, Str const& b);
@@ -84,9 +91,22 @@ public:
         return *this;
     }
     FPath& add(Str const& text) { return add(text.c_str(), text.size()); }
+    template <detail::StringView View>
+    FPath& add(View text) {
+        return text.empty() ? *this : add(text.data(), text.size());
+    }
+    /// Appends a component of one character: "dir" and 'z' give "dir/z". The byte 0 is no component.
+    template <std::same_as<char> C>
+    FPath& add(C c) {
+        return add(&c, 1);
+    }
     FPath& operator+=(char const* text) { return add(text); }
     FPath& operator+=(Str const& text) { return add(text); }
     FPath& operator+=(std::string const& text) { return add(text.c_str(), text.size()); }
+    template <class Source>
+    requires(detail::StringView<Source> || std::same_as<Source, char>) FPath& operator+=(Source source) {
+        return add(source);
+    }
 
     /// Appends an extension as it stands, with `addDot` after a "." unless the path ends or the extension begins in one.
     FPath& addExt(Str const& ext, bool addDot);
@@ -190,6 +210,9 @@ public:
     static bool ParseUrl(Str const& url, BufStr<255>* scheme, FPath* path, BufStr<255>* user, BufStr<255>* password);
     /// @}
 };
+
+template <>
+inline constexpr bool detail::IS_TEXT<FPath> = true;
 
 static_assert(sizeof(FPath) == sizeof(BufStr<255>));
 

@@ -64,8 +64,17 @@ public:
         return *this;
     }
     WcPath& add(WStr const& text) { return add(text.wstr(), text.size()); }
+    /// Appends a component of one unit; 0 is none.
+    template <std::same_as<WChar> C>
+    WcPath& add(C c) {
+        return add(&c, 1);
+    }
     WcPath& operator+=(WChar const* text) { return add(text); }
     WcPath& operator+=(WStr const& text) { return add(text); }
+    template <std::same_as<WChar> C>
+    WcPath& operator+=(C c) {
+        return add(c);
+    }
 
     WcPath& addExt(WStr const& ext, bool addDot);
     WcPath& assureTermSlash();

@@ -15,6 +15,7 @@
 #define ZOR_BASIS_MEMORY_MEM_MGR_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/pointer_guard.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -69,7 +70,7 @@ protected:
 };
 
 /// Owns a manager for the length of a scope. Lives on the stack or in another object, never on the heap by itself.
-class ZB_API MemMgrPtr {
+class ZB_API MemMgrPtr : public detail::NotDeletable<MemMgrPtr> {
 public:
     /// \param manager  adopted; may be null, is never the standard manager
     MemMgrPtr(MemMgr* manager = nullptr) : manager_(manager) {}

@@ -5,13 +5,14 @@
 #define ZOR_BASIS_TEXT_AUTO_PTR_CSTR_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/pointer_guard.h"
 
 #include <cstdint>
 #include <string>
 
 /// Not copyable. The buffer comes from the runtime's `malloc`, tried again through the new-handler of the library's own
 /// runtime, and goes back through `free`.
-class ZB_API Auto_ptr_CStr {
+class ZB_API Auto_ptr_CStr : public ZOR_Basis::detail::NotDeletable<Auto_ptr_CStr> {
 public:
     /// A buffer of n + 2 bytes that begins with a terminator; its length is n.
     /// \error throws `std::bad_alloc` where memory is short and no new-handler helps

@@ -17,6 +17,8 @@
 #include "zor_basis/export.h"
 
 #include <cstdint>
+#include <functional>
+#include <string_view>
 
 namespace ZOR_Basis {
 
@@ -106,5 +108,13 @@ public:
 static_assert(sizeof(Blob) == 32 && sizeof(SecretBlob) == sizeof(Blob));
 
 } // namespace ZOR_Basis
+
+/// Over all bytes in use.
+template <>
+struct std::hash<ZOR_Basis::Blob> {
+    std::size_t operator()(ZOR_Basis::Blob const& blob) const noexcept {
+        return std::hash<std::string_view>()({blob.val(), blob.size()});
+    }
+};
 
 #endif

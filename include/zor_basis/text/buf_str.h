@@ -8,12 +8,17 @@
 /// A source may lie inside the string's own text, in every member: nothing is released or overwritten before it has
 /// been copied. A source with a length is copied up to its terminator, see text-06. Where memory is short the program
 /// is aborted. There are no move operations: a move copies.
+///
+/// A `std::string_view` is a source like a `std::string` with the same bytes: an empty one is the empty text, a zero in it
+/// follows text-06, and nothing behind its end is read. How texts compare, and how containers of them are searched for a
+/// literal, stands at `Str`; a `std::string_view` compares as the `std::string` would.
 
 #ifndef ZOR_BASIS_TEXT_BUF_STR_H
 #define ZOR_BASIS_TEXT_BUF_STR_H
 
 #include "zor_basis/text/inline_text.h"
 #include "zor_basis/text/str.h"
+#include "zor_basis/text/view_ops.h"
 
 #include <compare>
 #include <concepts>
@@ -21,6 +26,7 @@
 #include <cstdlib>
 #include <functional>
 #include <string>
+#include <string_view>
 
 namespace ZOR_Basis {
 
@@ -44,6 +50,10 @@ public:
     BufStr(char const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
     BufStr(Str const& text) noexcept { Text::make(*this, text.c_str(), text.size()); }
     BufStr(std::string const& text) noexcept { Text::makeOwned(*this, text.c_str(), text.size()); }
+    template <detail::StringView View>
+    BufStr(View text) noexcept {
+        Text::makeOwned(*this, text.empty() ? StrEmpty : text.data(), text.size());
+    }
     BufStr(BufStr const& other) noexcept : Str(other) { Text::makeOwned(*this, other.text_, other.size_); }
     ~BufStr() { Text::end(*this); }
 
@@ -62,6 +72,11 @@ public:
     }
     BufStr& operator=(char const* text) {
         if (text != text_) Text::assign(*this, text, 0);
+        return *this;
+    }
+    template <detail::StringView View>
+    BufStr& operator=(View text) {
+        Text::assign(*this, text.empty() ? StrEmpty : text.data(), text.size());
         return *this;
     }
     BufStr& copy(char const* text, std::uint64_t n = 0) {
@@ -86,6 +101,10 @@ public:
     BufStr& add(std::string const& text, std::uint64_t n = 0) {
         return add(text.c_str(), n != 0 && n < text.size() ? n : text.size());
     }
+    template <detail::StringView View>
+    BufStr& add(View text) {
+        return text.empty() ? *this : add(text.data(), text.size());
+    }
     /// Appends one byte.
     /// \kept text-09: the byte 0 appends nothing
     template <detail::Index C>
@@ -96,17 +115,30 @@ public:
     BufStr& operator+=(std::string const& text) { return add(text); }
     BufStr& operator+=(Str const& text) { return add(text); }
     BufStr& operator+=(char const* text) { return add(text); }
+    template <detail::StringView View>
+    BufStr& operator+=(View text) {
+        return add(text);
+    }
     template <detail::Index C>
     BufStr& operator+=(C c) {
         return add(c);
     }
     BufStr& operator<<(Str const& text) { return add(text); }
     BufStr& operator<<(char const* text) { return add(text); }
-    /// Appends the decimal digits of a number, taken as an `int`, characters included.
-    template <detail::Index I>
-    BufStr& operator<<(I number) {
-        return addNumber(static_cast<int>(number));
+    template <detail::StringView View>
+    BufStr& operator<<(View text) {
+        return add(text);
     }
+    /// Appends the decimal digits of an integer of any size; characters, truth values and enumerators count as the numbers
+    /// that they are. What would lose something as an integer, a floating-point number above all, does not compile.
+    BufStr& operator<<(int number) { return addNumber(std::int64_t{number}); }
+    template <detail::Number I>
+    BufStr& operator<<(I number) {
+        using Wide = std::conditional_t<std::is_signed_v<decltype(+number)>, std::int64_t, std::uint64_t>;
+        return addNumber(static_cast<Wide>(+number));
+    }
+    template <detail::LosesAsInt T>
+    BufStr& operator<<(T const&) = delete;
 
     /// The byte at an index, for writing; the index is not checked.
     template <detail::Index I>
@@ -211,8 +243,23 @@ protected:
     /// Releases the text.
     void free() noexcept { std::free(getBuf()); }
 
+    // With a `std::string_view`, by the rules of `std::string`.
+    template <detail::StringView View>
+    friend bool operator==(BufStr const& a, View b) noexcept {
+        return detail::sameAsView(a, b);
+    }
+    template <detail::StringView View>
+    friend bool operator==(View a, BufStr const& b) noexcept {
+        return detail::viewSameAs(a, b);
+    }
+    template <detail::StringView View>
+    friend std::weak_ordering operator<=>(BufStr const& a, View b) noexcept {
+        return detail::compareWithView(a.text_, b) <=> 0;
+    }
+
 private:
-    BufStr& addNumber(int number);
+    BufStr& addNumber(std::int64_t number);
+    BufStr& addNumber(std::uint64_t number);
 
     detail::TextArea<char, N> area_;
 };
@@ -237,17 +284,14 @@ ZB_EXTERN_TEMPLATE BufStr<15>;
 ZB_EXTERN_TEMPLATE detail::InlineText<BufStr<255>, char, 255>;
 ZB_EXTERN_TEMPLATE BufStr<255>;
 
+template <std::uint64_t N>
+inline constexpr bool detail::IS_TEXT<BufStr<N>> = true;
+
 static_assert(sizeof(BufStr<15>) == 32 && sizeof(BufStr<255>) == 272);
 
 } // namespace ZOR_Basis
 
-/// Over the bytes before the terminator, at most `size` of them.
 template <std::uint64_t N>
-struct std::hash<ZOR_Basis::BufStr<N>> {
-    std::size_t operator()(ZOR_Basis::BufStr<N> const& text) const noexcept {
-        return std::hash<std::string_view>()(
-            {text.c_str(), ZOR_Basis::detail::textLengthUpTo(text.c_str(), text.size())});
-    }
-};
+struct std::hash<ZOR_Basis::BufStr<N>> : std::hash<ZOR_Basis::Str> {};
 
 #endif

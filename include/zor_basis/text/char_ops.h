@@ -24,6 +24,16 @@ namespace ZOR_Basis::detail {
 template <class T>
 concept Index = std::integral<T> ||(std::is_enum_v<T>&& std::is_convertible_v<T, std::int64_t>);
 
+/// An integer of at most 64 bits.
+template <class T>
+concept Number = Index<T> && sizeof(T) <= sizeof(std::int64_t);
+
+/// Everything else that the language would make an `int` of, although not every value survives that.
+template <class T>
+concept LosesAsInt = !Number<T> && std::is_convertible_v<T, int> && !requires(T const& value) {
+    int{value};
+};
+
 /// Units before the terminator.
 template <class Char>
 inline std::uint64_t textLength(Char const* text) noexcept {

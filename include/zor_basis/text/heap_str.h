@@ -4,16 +4,19 @@
 /// For texts that are stored for long: two words and a capacity, nothing inside the object. There is no appending; text is
 /// built in a `BufStr` and then stored here. A source may lie inside the own text. A source is copied up to its
 /// terminator and padded with zeros (text-06). Where memory is short the program is aborted. There are no move
-/// operations: a move copies.
+/// operations: a move copies. A `std::string_view` is a source, and compares, like a `std::string` with the same bytes.
 
 #ifndef ZOR_BASIS_TEXT_HEAP_STR_H
 #define ZOR_BASIS_TEXT_HEAP_STR_H
 
 #include "zor_basis/text/str.h"
+#include "zor_basis/text/view_ops.h"
 
+#include <compare>
 #include <cstdint>
 #include <functional>
 #include <string>
+#include <string_view>
 
 namespace ZOR_Basis {
 
@@ -28,6 +31,8 @@ public:
     HeapStr(char const* text, std::uint64_t n);
     HeapStr(Str const& text);
     HeapStr(std::string const& text);
+    template <detail::StringView View>
+    HeapStr(View text) : HeapStr(text.data(), text.size()) {}
     HeapStr(HeapStr const& other);
     ~HeapStr();
 
@@ -35,6 +40,10 @@ public:
     HeapStr& operator=(HeapStr const& other);
     HeapStr& operator=(Str const& text);
     HeapStr& operator=(std::string const& text);
+    template <detail::StringView View>
+    HeapStr& operator=(View text) {
+        return set(text.data(), text.size());
+    }
     /// As `set(text)`.
     HeapStr& operator=(char const* text);
 
@@ -52,6 +61,20 @@ public:
     /// Changes all bytes by the runtime's `tolower` and `toupper`.
     HeapStr& toLower() noexcept;
     HeapStr& toUpper() noexcept;
+
+    // With a `std::string_view`, by the rules of `std::string`.
+    template <detail::StringView View>
+    friend bool operator==(HeapStr const& a, View b) noexcept {
+        return detail::sameAsView(a, b);
+    }
+    template <detail::StringView View>
+    friend bool operator==(View a, HeapStr const& b) noexcept {
+        return detail::viewSameAs(a, b);
+    }
+    template <detail::StringView View>
+    friend std::weak_ordering operator<=>(HeapStr const& a, View b) noexcept {
+        return detail::compareWithView(a.text_, b) <=> 0;
+    }
 
 protected:
     /// A block of n + 1 bytes; size and capacity become n. Releases nothing and terminates nothing.
@@ -72,17 +95,14 @@ private:
     bool hasBlock() const noexcept { return capacity_ > 0 && text_ != StrEmpty; }
 };
 
+template <>
+inline constexpr bool detail::IS_TEXT<HeapStr> = true;
+
 static_assert(sizeof(HeapStr) == 24);
 
 } // namespace ZOR_Basis
 
-/// Over the bytes before the terminator, at most `size` of them.
 template <>
-struct std::hash<ZOR_Basis::HeapStr> {
-    std::size_t operator()(ZOR_Basis::HeapStr const& text) const noexcept {
-        return std::hash<std::string_view>()(
-            {text.c_str(), ZOR_Basis::detail::textLengthUpTo(text.c_str(), text.size())});
-    }
-};
+struct std::hash<ZOR_Basis::HeapStr> : std::hash<ZOR_Basis::Str> {};
 
 #endif

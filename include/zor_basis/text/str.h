@@ -9,7 +9,19 @@
 /// whatever its length. `HeapStr` is the exception and takes every length as it stands.
 ///
 /// **Comparing.** `==` looks at sizes, ordering does not; the two need not agree about texts with inner zeros or about
-/// views of parts of a text. A null text compares as the empty one.
+/// views of parts of a text. A null text compares as the empty one. All six comparisons exist with `char const*` and
+/// `std::string` on either side, and between all narrow text types. They compare texts, never addresses, through
+/// `std::less<>` and `std::ranges::less` too, so that a container can be searched for a literal without making a string:
+///
+///     std::map<BufStr<15>, int, std::less<>> trays{{"tray1", 500}, {"tray2", 250}};
+///     bool const known = trays.contains("tray2");
+///
+/// **As a pointer.** A text converts to `char const*`, so the language treats it as one in a condition: `if (name)` tells
+/// whether there is a pointer, which an empty text has too. The compiler therefore warns there; ask `some()` or `empty()`,
+/// or compare `c_str()` with null. `delete name` and comparisons with pointers to anything but text do not compile.
+///
+/// **Standard views.** A `std::string_view` does not convert to a `Str`, as nothing terminates it. The owning strings can
+/// be made from it, and a `Str` converts to it explicitly.
 
 #ifndef ZOR_BASIS_TEXT_STR_H
 #define ZOR_BASIS_TEXT_STR_H
@@ -17,15 +29,18 @@
 #include "zor_basis/containers/hashing.h"
 #include "zor_basis/export.h"
 #include "zor_basis/text/char_ops.h"
+#include "zor_basis/text/pointer_guard.h"
 
 #include <compare>
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 
 namespace ZOR_Basis {
 
-class ZB_API Str {
+class ZB_API Str : public detail::PointerGuard<char> {
 public:
     /// The one empty text that all views and strings share. Never written, never released; set before any code runs.
     static char const* const StrEmpty;
@@ -48,6 +63,11 @@ public:
     std::uint64_t size() const noexcept { return size_; }
     char const* c_str() const noexcept { return text_; }
     operator char const*() const noexcept { return text_; }
+    /// Whether the pointer is not null, as the conversion to a pointer has it.
+    [[deprecated("tells whether there is a pointer, not whether there is text: ask some() or empty()")]] explicit
+    operator bool() const noexcept {
+        return text_ != nullptr;
+    }
     /// The text with the size as it is, inner zeros included.
     explicit operator std::string_view() const noexcept { return {text_, size_}; }
     bool empty() const noexcept { return size_ == 0; }
@@ -116,11 +136,33 @@ public:
         return text_ == other ? 0 : detail::compareTextsUpTo(text_, other, n);
     }
 
-    /// The order of `compare`, which also gives `>`, `<=`, `>=` and all of them from the other side.
+    /// The order of `compare`, from both sides: `a > b` is `b < a`, `a <= b` is `!(b < a)`, `a >= b` is `!(a < b)`. Each is
+    /// declared by itself: the standard's function objects look for a function of that very name, and compare addresses
+    /// where they find none and both sides convert to pointers.
     bool operator<(Str const& other) const noexcept { return compare(other) < 0; }
+    bool operator>(Str const& other) const noexcept { return compare(other) > 0; }
+    bool operator<=(Str const& other) const noexcept { return compare(other) <= 0; }
+    bool operator>=(Str const& other) const noexcept { return compare(other) >= 0; }
     std::weak_ordering operator<=>(Str const& other) const noexcept { return compare(other) <=> 0; }
+    bool operator<(std::string const& other) const noexcept { return compare(Str(other)) < 0; }
+    bool operator>(std::string const& other) const noexcept { return compare(Str(other)) > 0; }
+    bool operator<=(std::string const& other) const noexcept { return compare(Str(other)) <= 0; }
+    bool operator>=(std::string const& other) const noexcept { return compare(Str(other)) >= 0; }
     std::weak_ordering operator<=>(std::string const& other) const noexcept { return compare(Str(other)) <=> 0; }
+    bool operator<(char const* other) const noexcept { return compare(other) < 0; }
+    bool operator>(char const* other) const noexcept { return compare(other) > 0; }
+    bool operator<=(char const* other) const noexcept { return compare(other) <= 0; }
+    bool operator>=(char const* other) const noexcept { return compare(other) >= 0; }
     std::weak_ordering operator<=>(char const* other) const noexcept { return compare(other) <=> 0; }
+    friend bool operator<(std::string const& a, Str const& b) noexcept { return b > a; }
+    friend bool operator>(std::string const& a, Str const& b) noexcept { return b < a; }
+    friend bool operator<=(std::string const& a, Str const& b) noexcept { return b >= a; }
+    friend bool operator>=(std::string const& a, Str const& b) noexcept { return b <= a; }
+    friend bool operator<(char const* a, Str const& b) noexcept { return b > a; }
+    friend bool operator>(char const* a, Str const& b) noexcept { return b < a; }
+    friend bool operator<=(char const* a, Str const& b) noexcept { return b >= a; }
+    friend bool operator>=(char const* a, Str const& b) noexcept { return b <= a; }
+    friend std::weak_ordering operator<=>(char const* a, Str const& b) noexcept { return 0 <=> b.compare(a); }
 
     /// `hashDjb2` of the text: over the bytes before the terminator, whatever the size.
     std::uint64_t hash() const noexcept { return hashDjb2(text_, size_); }
@@ -153,6 +195,40 @@ private:
 
 static_assert(sizeof(Str) == 16);
 
+namespace detail {
+
+/// The narrow text types.
+template <class>
+inline constexpr bool IS_TEXT = false;
+template <>
+inline constexpr bool IS_TEXT<Str> = true;
+
+template <class T>
+inline constexpr bool IS_TEXT_POINTER = std::is_same_v<T, char const*> || std::is_same_v<T, char*>;
+
+/// Texts of which neither converts to a reference to the other.
+template <class A, class B>
+concept UnrelatedTexts = (IS_TEXT<A> && IS_TEXT_POINTER<B>) || (IS_TEXT_POINTER<A> && IS_TEXT<B>) ||
+                         (IS_TEXT<A> && IS_TEXT<B> && !std::is_base_of_v<A, B> && !std::is_base_of_v<B, A>);
+
+} // namespace detail
+
 } // namespace ZOR_Basis
+
+/// What the standard's range functions want before they compare two types: both can be viewed as a `Str`.
+template <class A, class B, template <class> class AQualified, template <class> class BQualified>
+requires ZOR_Basis::detail::UnrelatedTexts<A, B>
+struct std::basic_common_reference<A, B, AQualified, BQualified> {
+    using type = ZOR_Basis::Str;
+};
+
+/// Over the bytes before the terminator, at most `size` of them; so do the hashes of all narrow text types, and they agree.
+template <>
+struct std::hash<ZOR_Basis::Str> {
+    std::size_t operator()(ZOR_Basis::Str const& text) const noexcept {
+        return std::hash<std::string_view>()(
+            {text.c_str(), ZOR_Basis::detail::textLengthUpTo(text.c_str(), text.size())});
+    }
+};
 
 #endif

@@ -186,13 +186,7 @@ static_assert(sizeof(WBStr) == 8 + 16 + 512);
 
 } // namespace ZOR_Basis
 
-/// Over the units before the terminator, at most `size` of them.
 template <>
-struct std::hash<ZOR_Basis::WBStr> {
-    std::size_t operator()(ZOR_Basis::WBStr const& text) const noexcept {
-        using View = std::basic_string_view<ZOR_Basis::WChar>;
-        return std::hash<View>()(View(text.wstr(), ZOR_Basis::detail::textLengthUpTo(text.wstr(), text.size())));
-    }
-};
+struct std::hash<ZOR_Basis::WBStr> : std::hash<ZOR_Basis::WStr> {};
 
 #endif

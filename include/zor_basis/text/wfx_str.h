@@ -7,6 +7,7 @@
 #include "zor_basis/text/wstr.h"
 
 #include <cstdint>
+#include <functional>
 
 namespace ZOR_Basis {
 
@@ -41,5 +42,8 @@ public:
 static_assert(sizeof(WFxStr) == sizeof(WStr));
 
 } // namespace ZOR_Basis
+
+template <>
+struct std::hash<ZOR_Basis::WFxStr> : std::hash<ZOR_Basis::WStr> {};
 
 #endif

@@ -3,22 +3,26 @@
 ///
 /// As for narrow text a length of 0 in a source means "measure it", and a null or empty text is an empty source. What
 /// differs from `Str`: the order is reversed (wide-01), `==` with a length of 0 on the right compares whole texts as
-/// there, and only the comparisons declared here exist.
+/// there, and only the comparisons declared here exist. Every other one is refused, through `std::less<>` and its like too,
+/// as it would compare addresses. In conditions, in `delete` and beside other pointers the rules of `Str` hold.
 
 #ifndef ZOR_BASIS_TEXT_WSTR_H
 #define ZOR_BASIS_TEXT_WSTR_H
 
 #include "zor_basis/export.h"
 #include "zor_basis/text/char_ops.h"
+#include "zor_basis/text/pointer_guard.h"
 #include "zor_basis/wide_char.h"
 
+#include <compare>
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <string_view>
 
 namespace ZOR_Basis {
 
-class ZB_API WStr {
+class ZB_API WStr : public detail::PointerGuard<WChar> {
 public:
     /// Bytes of a code unit.
     static constexpr std::uint64_t SizeWChar = 2;
@@ -40,6 +44,11 @@ public:
     std::uint64_t size() const noexcept { return size_; }
     WChar const* wstr() const noexcept { return text_; }
     operator WChar const*() const noexcept { return text_; }
+    /// Whether the pointer is not null, as the conversion to a pointer has it.
+    [[deprecated("tells whether there is a pointer, not whether there is text: ask empty()")]] explicit
+    operator bool() const noexcept {
+        return text_ != nullptr;
+    }
     /// The text with the size as it is, inner zeros included.
     explicit operator std::basic_string_view<WChar>() const noexcept { return {text_, size_}; }
     bool empty() const noexcept { return size_ == 0; }
@@ -98,6 +107,9 @@ public:
     friend bool operator>(WChar const*, WStr const&) = delete;
     friend bool operator<=(WChar const*, WStr const&) = delete;
     friend bool operator>=(WChar const*, WStr const&) = delete;
+    std::weak_ordering operator<=>(WStr const&) const = delete;
+    std::weak_ordering operator<=>(WChar const*) const = delete;
+    friend std::weak_ordering operator<=>(WChar const*, WStr const&) = delete;
 
     /// The first occurrence in this text, both up to their terminators.
     /// \return a pointer into this text, or null; null for null
@@ -118,5 +130,14 @@ protected:
 static_assert(sizeof(WStr) == 16);
 
 } // namespace ZOR_Basis
+
+/// Over the units before the terminator, at most `size` of them; so do the hashes of all wide text types, and they agree.
+template <>
+struct std::hash<ZOR_Basis::WStr> {
+    std::size_t operator()(ZOR_Basis::WStr const& text) const noexcept {
+        using View = std::basic_string_view<ZOR_Basis::WChar>;
+        return std::hash<View>()(View(text.wstr(), ZOR_Basis::detail::textLengthUpTo(text.wstr(), text.size())));
+    }
+};
 
 #endif

@@ -7,13 +7,14 @@
 #define ZOR_BASIS_TIMERS_BASE_TIMER_AUTO_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/pointer_guard.h"
 #include "zor_basis/timers/base_timer.h"
 
 namespace ZOR_Basis {
 
 class TimerMgr;
 
-class ZB_API BaseTimerAuto {
+class ZB_API BaseTimerAuto : public detail::NotDeletable<BaseTimerAuto> {
 public:
     /// Inert: without a pile, it does nothing ever.
     BaseTimerAuto() = default;

@@ -8,13 +8,14 @@
 #define ZOR_BASIS_TIMERS_PILE_TIMER_AUTO_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/text/pointer_guard.h"
 
 namespace ZOR_Basis {
 
 class PileTimer;
 class TimerMgr;
 
-class ZB_API PileTimerAuto {
+class ZB_API PileTimerAuto : public detail::NotDeletable<PileTimerAuto> {
 public:
     /// Inert: without a pile, it does nothing ever.
     PileTimerAuto() = default;

@@ -1,0 +1,41 @@
+/// \file
+/// What a text that converts to a pointer must not be taken for. Users have no need of it.
+///
+/// The text types convert to a pointer to their text without being asked. The language would then accept them where any
+/// pointer will do: in `delete`, and in comparisons with pointers to something else, which compare addresses.
+
+#ifndef ZOR_BASIS_TEXT_POINTER_GUARD_H
+#define ZOR_BASIS_TEXT_POINTER_GUARD_H
+
+#include <compare>
+#include <type_traits>
+
+namespace ZOR_Basis::detail {
+
+template <class>
+inline constexpr bool NEVER = false;
+
+/// An empty base of a class that converts to a pointer and must not be deleted through it. `delete` requires exactly one
+/// conversion to a pointer and finds two; the second one satisfies no call and so takes part in nothing else.
+template <class Derived>
+class NotDeletable {
+public:
+    operator NotDeletable*() const requires NEVER<Derived>;
+};
+
+/// A pointer that cannot point to text of these characters.
+template <class Pointer, class Char>
+concept PointerToOther = std::is_pointer_v<Pointer> && !std::is_convertible_v<Pointer, Char const*>;
+
+/// The empty base of the views. Whatever is deleted here would otherwise compile into a comparison of addresses.
+template <class Char>
+class PointerGuard : public NotDeletable<PointerGuard<Char>> {
+    template <PointerToOther<Char> Pointer>
+    friend bool operator==(PointerGuard const&, Pointer) = delete;
+    template <PointerToOther<Char> Pointer>
+    friend std::weak_ordering operator<=>(PointerGuard const&, Pointer) = delete;
+};
+
+} // namespace ZOR_Basis::detail
+
+#endif
