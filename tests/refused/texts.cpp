@@ -2,8 +2,7 @@
 // each compiler, with warnings as errors.
 
 #include "zor_basis/crypto.h"
-#include "zor_basis/files/f_path.h"
-#include "zor_basis/files/wc_path.h"
+#include "zor_basis/files.h"
 #include "zor_basis/memory.h"
 #include "zor_basis/text.h"
 #include "zor_basis/timers.h"
@@ -26,7 +25,8 @@ void isNoPointerToDelete(Str view, BufStr<15>& name, HeapStr const& stored, FPat
     delete text;   // refused
 }
 
-void handlesAreNotDeleted(MemMgrPtr& manager, CrHashPtr& hash, PileTimerAuto& pile, BaseTimerAuto& base) {
+void handlesAreNotDeleted(File& file, MemMgrPtr& manager, CrHashPtr& hash, PileTimerAuto& pile, BaseTimerAuto& base) {
+    delete file;    // refused
     delete manager; // refused
     delete hash;    // refused
     delete pile;    // refused

@@ -28,13 +28,14 @@
 
 #include "zor_basis/export.h"
 #include "zor_basis/files/i_file.h"
+#include "zor_basis/text/pointer_guard.h"
 #include "zor_basis/wide_char.h"
 
 #include <utility>
 
 namespace ZOR_Basis {
 
-class ZB_API File {
+class ZB_API File : public detail::NotDeletable<File> {
 public:
     /// Open modes, combined freely.
     enum Mode : int {
