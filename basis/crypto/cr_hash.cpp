@@ -1,7 +1,7 @@
 #include "zor_basis/crypto/cr_hash.h"
 
 #include "basis/crypto/cr_hash_impl.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 namespace ZOR_Basis {
 namespace {

@@ -1,7 +1,7 @@
 #include "zor_basis/crypto/cr_key.h"
 
 #include "basis/crypto/cr_key_impl.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 #include <algorithm>
 #include <limits>

@@ -4,7 +4,7 @@
 
 #include "basis/files/os_path_posix.h"
 #include "basis/files/system_calls.h"
-#include "basis/files/wildcard.h"
+#include "basis/ground/wildcard.h"
 
 #include <dirent.h>
 #include <fcntl.h>

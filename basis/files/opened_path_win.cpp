@@ -2,7 +2,8 @@
 
 #include "basis/files/opened_path_win.h"
 
-#include "zor_basis/text/blob.h"
+#include <memory>
+#include <new>
 
 namespace ZOR_Basis {
 namespace {
@@ -27,12 +28,11 @@ void takePlain(char const* path, FPath& plain) {
 bool openedPath(char const* path, FPath& found) {
     FileHandle const file(CreateFileA(path, 0, SHARE_ALL, nullptr, OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr));
     if (!file.isOpen()) return false;
-    Blob text;
     DWORD const room = GetFinalPathNameByHandleA(file.get(), nullptr, 0, FORM) + 1;
-    text.alloc(room, false);
-    DWORD const n = GetFinalPathNameByHandleA(file.get(), text.buf(), room, FORM);
+    std::unique_ptr<char[]> const text(new (std::nothrow) char[room]);
+    DWORD const n = GetFinalPathNameByHandleA(file.get(), text.get(), room, FORM);
     if (n == 0 || n >= room) return false;
-    takePlain(text.buf(), found);
+    takePlain(text.get(), found);
     return true;
 }
 

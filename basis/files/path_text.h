@@ -6,7 +6,7 @@
 
 #include "basis/files/path_rules.h"
 #include "basis/files/url_rules.h"
-#include "basis/files/wildcard.h"
+#include "basis/ground/wildcard.h"
 #include "zor_basis/text/buf_str.h"
 #include "zor_basis/text/wb_str.h"
 

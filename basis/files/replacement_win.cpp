@@ -3,7 +3,9 @@
 #include "basis/files/replacement_impl.h"
 
 #include "basis/files/opened_path_win.h"
-#include "zor_basis/text/blob.h"
+
+#include <memory>
+#include <new>
 
 namespace ZOR_Basis {
 namespace {
@@ -16,14 +18,15 @@ public:
     explicit AccessList(char const* path) {
         DWORD n = 0;
         GetFileSecurityA(path, DACL_SECURITY_INFORMATION, nullptr, 0, &n);
-        list_.alloc(n, false);
-        if (n == 0 || GetFileSecurityA(path, DACL_SECURITY_INFORMATION, list_.buf(), n, &n) == FALSE) return;
-        attributes_.lpSecurityDescriptor = list_.buf();
+        if (n == 0) return;
+        list_.reset(new (std::nothrow) char[n]);
+        if (GetFileSecurityA(path, DACL_SECURITY_INFORMATION, list_.get(), n, &n) == FALSE) return;
+        attributes_.lpSecurityDescriptor = list_.get();
     }
     SECURITY_ATTRIBUTES* get() { return attributes_.lpSecurityDescriptor != nullptr ? &attributes_ : nullptr; }
 
 private:
-    Blob list_;
+    std::unique_ptr<char[]> list_;
     SECURITY_ATTRIBUTES attributes_{sizeof(SECURITY_ATTRIBUTES), nullptr, FALSE};
 };
 

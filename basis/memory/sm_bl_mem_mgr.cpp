@@ -1,6 +1,6 @@
 #include "basis/memory/sm_bl_mem_mgr.h"
 
-#include "zor_basis/containers/hashing.h"
+#include "zor_basis/ground/hashing.h"
 
 #include <algorithm>
 #include <cstring>

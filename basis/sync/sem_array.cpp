@@ -1,6 +1,6 @@
 #include "basis/sync/sem_array.h"
 
-#include "zor_basis/containers/hashing.h"
+#include "zor_basis/ground/hashing.h"
 
 #include <algorithm>
 #include <new>

@@ -2,7 +2,7 @@
 
 #include "basis/files/last_error.h"
 #include "basis/system/query_calls_posix.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 #include <cerrno>
 

@@ -6,7 +6,7 @@
 
 #include "basis/platform/windows_api.h"
 #include "basis/system/text_parts.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 #include "zor_basis/text/buf_str.h"
 
 #include <cstdint>

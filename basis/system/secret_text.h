@@ -4,7 +4,7 @@
 #ifndef BASIS_SYSTEM_SECRET_TEXT_H
 #define BASIS_SYSTEM_SECRET_TEXT_H
 
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 #include "zor_basis/text/str.h"
 
 namespace ZOR_Basis {

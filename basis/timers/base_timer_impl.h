@@ -4,7 +4,7 @@
 #ifndef BASIS_TIMERS_BASE_TIMER_IMPL_H
 #define BASIS_TIMERS_BASE_TIMER_IMPL_H
 
-#include "basis/timers/clock.h"
+#include "basis/ground/clock.h"
 
 namespace ZOR_Basis {
 

@@ -4,7 +4,7 @@
 #ifndef BASIS_TIMERS_MEASUREMENT_H
 #define BASIS_TIMERS_MEASUREMENT_H
 
-#include "basis/timers/clock.h"
+#include "basis/ground/clock.h"
 #include "zor_basis/timers/timer_dat.h"
 
 namespace ZOR_Basis::Measurement {

@@ -1,6 +1,6 @@
 #include "zor_basis/timers/pile_timer.h"
 
-#include "basis/timers/clock.h"
+#include "basis/ground/clock.h"
 #include "basis/timers/complaint.h"
 #include "basis/timers/measurement.h"
 #include "basis/timers/report_row.h"

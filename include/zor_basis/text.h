@@ -8,8 +8,8 @@
 #ifndef ZOR_BASIS_TEXT_H
 #define ZOR_BASIS_TEXT_H
 
+#include "zor_basis/store/blob.h"
 #include "zor_basis/text/auto_ptr_cstr.h"
-#include "zor_basis/text/blob.h"
 #include "zor_basis/text/buf_str.h"
 #include "zor_basis/text/convert.h"
 #include "zor_basis/text/heap_str.h"

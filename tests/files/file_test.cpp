@@ -3,7 +3,7 @@
 #include <zor_basis/files/dir.h>
 #include <zor_basis/files/f_stat.h>
 #include <zor_basis/files/file.h>
-#include <zor_basis/text/blob.h>
+#include <zor_basis/store/blob.h>
 
 #include "basis/files/file_backends.h"
 #include "basis/files/system_calls.h"

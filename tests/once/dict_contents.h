@@ -4,7 +4,7 @@
 #ifndef TESTS_ONCE_DICT_CONTENTS_H
 #define TESTS_ONCE_DICT_CONTENTS_H
 
-#include "tests/containers/dict_files.h"
+#include "tests/store/dict_files.h"
 
 inline Pairs twoContents(int n) {
     Pairs pairs;

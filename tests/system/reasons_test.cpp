@@ -2,9 +2,9 @@
 
 #include "tests/system/reasons_test.h"
 
-#include <zor_basis/containers/dict.h>
 #include <zor_basis/files.h>
 #include <zor_basis/flat.h>
+#include <zor_basis/store/dict.h>
 #include <zor_basis/system.h>
 #include <zor_basis/walk.h>
 

@@ -1,5 +1,6 @@
 #!/usr/bin/env python3
-"""Includes run from the higher level to the lower, without a circle between components (levels.txt)."""
+"""Includes run from the higher room to the lower (levels.txt), without a circle between rooms or between components, in
+the library and in the host."""
 
 import re
 from pathlib import PurePosixPath
@@ -7,35 +8,38 @@ from pathlib import PurePosixPath
 import common
 
 INCLUDE = re.compile(r'^\s*#\s*include\s+[<"]([^">]+)[">]', re.M)
-ROOTS = ("include/zor_basis/", "basis/")
-# What the stand-alone platform layer may use of the library.
-HOST_MAY_USE = ("basis/platform/", "basis/files/wildcard.h")
+COMMENT = re.compile(r"//[^\n]*|/\*.*?\*/", re.S)
+PUBLIC = "include/zor_basis/"
+LIBRARY = (PUBLIC, "basis/")
+# What the host may use of the library.
+HOST_MAY_USE = ("basis/platform/", "basis/ground/wildcard.h")
 
 
 def levels():
-    table = []
+    table = {}
     for line in common.text("tools/lint/levels.txt").splitlines():
         if line.strip() and not line.startswith("#"):
-            level, prefix = line.split()
-            table.append((prefix, int(level)))
-    return sorted(table, key=lambda row: -len(row[0]))
+            level, room = line.split()
+            table[room] = int(level)
+    return table
 
 
-def inner(path):
-    """The path below the library's roots, without suffixes that only tell twins and file kinds apart."""
-    for root in ROOTS:
+def room_of(path, table):
+    """The room that a file belongs to; where none is listed, the folder that would be one."""
+    for root in LIBRARY:
         if path.startswith(root):
-            stem = path.removeprefix(root)
-            stem = str(PurePosixPath(stem).with_suffix(""))
-            return re.sub(r"_(win|posix|impl|detail)$", "", stem)
-    return None
+            folder, _, rest = path.removeprefix(root).partition("/")
+            if rest:
+                return folder
+            name = PurePosixPath(folder).stem
+            return name if name in table else "ground"
+    return str(PurePosixPath(path).parent)
 
 
-def level_of(component, table):
-    for prefix, level in table:
-        if component == prefix or component.startswith((prefix + "/", prefix + "_")):
-            return level
-    return None
+def component_of(path, table):
+    """A header, its source and its twins are one component."""
+    name = re.sub(r"_(win|posix|impl|detail)$", "", PurePosixPath(path).stem)
+    return f"{room_of(path, table)}/{name}"
 
 
 def resolve(including, name, known):
@@ -46,53 +50,43 @@ def resolve(including, name, known):
     return None
 
 
-def entry_header(path):
-    """An entry header (text.h) only gathers its room's headers and is no component of its own."""
-    return re.fullmatch(r"include/zor_basis/[a-z]+\.h", path) and path not in (
-        "include/zor_basis/export.h", "include/zor_basis/wide_char.h", "include/zor_basis/flat.h")
+def only_gathers(path):
+    """A public header that has nothing but includes: an entry header (text.h), or a second path of a header."""
+    if not path.startswith(PUBLIC):
+        return False
+    lines = COMMENT.sub("", common.text(path)).splitlines()
+    return all(re.match(r"\s*(#\s*(ifndef|define|include|endif)\b.*)?$", line) for line in lines)
 
 
-def main():
-    table = levels()
-    sources = [str(p) for p in common.files("include/**", "basis/**", "host/**") if p.suffix in (".h", ".cpp", ".c")]
-    known = set(sources)
-    problems, edges = [], {}
-    for path in sources:
-        for name in INCLUDE.findall(common.text(path)):
-            target = resolve(path, name, known)
-            if target is None:
-                continue
-            if path.startswith("host/"):
-                if target.startswith(ROOTS) and not target.startswith(HOST_MAY_USE):
-                    problems.append(f"{path} includes {target}, which is the library's own")
-                continue
-            if target.startswith("host/"):
-                problems.append(f"{path} includes {target}: the library never includes from host/")
-                continue
-            if entry_header(path):
-                continue
-            if entry_header(target):
-                problems.append(f"{path} includes {target}: inside the library the single headers are included")
-                continue
-            user, used = inner(path), inner(target)
-            if user == used:
-                continue
-            user_level, used_level = level_of(user, table), level_of(used, table)
-            if user_level is None or used_level is None:
-                problems.append(f"{path}: no level for {user if user_level is None else used}")
-            elif used_level > user_level:
-                problems.append(f"{path} (level {user_level}) includes {target} (level {used_level})")
-            edges.setdefault(user, set()).add(used)
-    problems += circles(edges)
-    common.finish("levels", problems, len(sources))
+def forbidden(path, target, gathering):
+    """Why a file must not include another one, whatever their levels are; None where it may."""
+    if path.startswith("host/"):
+        if target.startswith(LIBRARY) and not target.startswith(HOST_MAY_USE):
+            return f"{path} includes {target}, which is the library's own"
+    elif target.startswith("host/"):
+        return f"{path} includes {target}: the library never includes from host/"
+    elif target in gathering:
+        return f"{path} includes {target}, which only gathers others: the library includes those themselves"
+    return None
 
 
-def circles(edges):
+def wrong_level(path, target, table):
+    user, used = room_of(path, table), room_of(target, table)
+    for file, room in ((path, user), (target, used)):
+        if room not in table:
+            return f"{file}: levels.txt has no room {room}"
+    # The host has an order of its own; `forbidden` knows what it may use of the library.
+    if path.startswith("host/") == target.startswith("host/") and table[used] > table[user]:
+        return f"{path} (room {user}, level {table[user]}) includes {target} (room {used}, level {table[used]})"
+    return None
+
+
+def circles(kind, edges):
     found, done = [], set()
 
     def visit(node, trail):
         if node in trail:
-            found.append("circle: " + " -> ".join(trail[trail.index(node):] + [node]))
+            found.append(f"circle of {kind}: " + " -> ".join(trail[trail.index(node):] + [node]))
             return
         if node in done:
             return
@@ -103,6 +97,34 @@ def circles(edges):
     for node in sorted(edges):
         visit(node, [])
     return found
+
+
+def add_edge(edges, user, used):
+    if user != used:
+        edges.setdefault(user, set()).add(used)
+
+
+def main():
+    table = levels()
+    sources = [str(p) for p in common.files("include/**", "basis/**", "host/**") if p.suffix in (".h", ".cpp", ".c")]
+    known = set(sources)
+    gathering = {path for path in sources if only_gathers(path)}
+    problems, rooms, components = [], {}, {}
+    for path in known - gathering:
+        for name in INCLUDE.findall(common.text(path)):
+            target = resolve(path, name, known)
+            if target is None:
+                continue
+            problem = forbidden(path, target, gathering) or wrong_level(path, target, table)
+            if problem:
+                problems.append(problem)
+            if target not in gathering:
+                add_edge(rooms, room_of(path, table), room_of(target, table))
+                add_edge(components, component_of(path, table), component_of(target, table))
+    empty = table.keys() - {room_of(path, table) for path in sources}
+    problems += [f"levels.txt lists {room}, which holds no file" for room in empty]
+    problems = sorted(problems) + circles("rooms", rooms) + circles("components", components)
+    common.finish("levels", problems, len(sources))
 
 
 main()

@@ -1,7 +1,6 @@
 #include "host/xos_basics/control/call_order.h"
 
 #include "host/xos_basics/control/order_stamp.h"
-#include "host/xos_basics/control/registry.h"
 
 namespace host {
 

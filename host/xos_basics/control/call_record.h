@@ -73,6 +73,9 @@ struct ThreadCalls {
 /// The calling thread's records; null before its first call and while it ends.
 extern constinit thread_local ThreadCalls* currentThreadCalls;
 
+/// Shared by the threads for which no memory was left, and the mark of a function that several threads have called.
+extern constinit ThreadCalls spareThreadCalls;
+
 /// Gives the calling thread its records.
 ThreadCalls* adoptThreadCalls();
 

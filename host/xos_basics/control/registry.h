@@ -15,9 +15,6 @@ extern constinit QuickMutex registryMutex;
 /// Newest first.
 extern constinit ThreadCalls* registryHead;
 
-/// Shared by the threads for which no memory was left, and the mark of a function that several threads have called.
-extern constinit ThreadCalls spareThreadCalls;
-
 /// Makes the calls that follow, in whatever thread, later than all that were made.
 void gatherTime();
 

@@ -1,6 +1,5 @@
 #include "host/xos_basics/tasks/deferred_threads.h"
 
-#include "host/xos_basics/tasks/task_pool.h"
 #include "host/xos_basics/tasks/task_thread.h"
 #include "host/xos_basics/wait/word_wait.h"
 
@@ -19,13 +18,18 @@ constexpr std::uint32_t RESTING = 0;
 constexpr std::uint32_t WATCHING = 1;
 constinit std::atomic<std::uint32_t> watch{RESTING};
 
+/// Set before any threads are deferred.
+constinit std::atomic<ThreadProvider> threadProvider{nullptr};
+
+void askProvider() { threadProvider.load(std::memory_order_relaxed)(); }
+
 void watchCreators(void*) {
     for (;;) {
         while (watch.load(std::memory_order_relaxed) == RESTING) { waitWhile(watch, RESTING); }
         std::this_thread::sleep_for(PATIENCE);
         // Before the look under the pool's mutex: a creator whose job comes after that look reads it and starts the watch.
         watch.store(RESTING, std::memory_order_relaxed);
-        provideThreads();
+        askProvider();
     }
 }
 
@@ -39,16 +43,17 @@ bool startWatch() {
 
 } // namespace
 
-bool deferThreads() {
+bool deferThreads(ThreadProvider provider) {
     ThreadCalls& mine = threadCalls();
     if (mine.heldMutexes == 0) { return false; }
+    threadProvider.store(provider, std::memory_order_relaxed);
     mine.hasDeferredThreads = startWatch();
     return mine.hasDeferredThreads;
 }
 
 void provideThreadsNow(ThreadCalls& mine) {
     mine.hasDeferredThreads = false;
-    provideThreads();
+    askProvider();
 }
 
 } // namespace host

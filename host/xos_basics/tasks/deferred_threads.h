@@ -12,8 +12,11 @@
 
 namespace host {
 
+using ThreadProvider = void (*)();
+
+/// \param provider  makes the threads later; every call has the same one
 /// \return whether the calling thread holds a mutex, so that threads for its tasks come later
-bool deferThreads();
+bool deferThreads(ThreadProvider provider);
 
 void provideThreadsNow(ThreadCalls& mine);
 

@@ -260,7 +260,7 @@ bool isAnyoneAtWork() {
 bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
     QueuedJob* const job = owned.release(); // the queue's, and then its thread's
     enqueue(job);
-    if (isAnyoneAtWork() && deferThreads()) { return true; }
+    if (isAnyoneAtWork() && deferThreads(provideThreads)) { return true; }
     giveBusyWorkersAMoment();
     if (makeOneMoreReady() || !takeBack(job)) { return true; }
     owned.reset(job);

@@ -6,8 +6,8 @@
 #ifndef ZOR_BASIS_CONTAINERS_HASHED_STR_H
 #define ZOR_BASIS_CONTAINERS_HASHED_STR_H
 
-#include "zor_basis/containers/hashing.h"
 #include "zor_basis/export.h"
+#include "zor_basis/ground/hashing.h"
 #include "zor_basis/text/heap_str.h"
 #include "zor_basis/text/str.h"
 

@@ -1,36 +1,9 @@
 /// \file
-/// The hash of texts, and the integer helpers that size tables.
-///
-/// \thread  all thread-safe
+/// The hash of texts and the integer helpers, under the path that users include.
 
 #ifndef ZOR_BASIS_CONTAINERS_HASHING_H
 #define ZOR_BASIS_CONTAINERS_HASHING_H
 
-#include "zor_basis/export.h"
-
-#include <cstdint>
-
-namespace ZOR_Basis {
-
-/// The djb2 hash: from 5381 on, times 33 plus the byte, modulo 2^64, over the bytes before the terminator.
-/// \param text    zero-terminated; null hashes as the empty text, to 5381
-/// \param length  not looked at: a text with an inner zero byte is hashed up to that byte only
-/// \kept hash-01: bytes are signed, so 0x80 to 0xFF take away (0xE9 adds -23); stored hashes depend on it
-ZB_API std::uint64_t hashDjb2(char const* text, std::uint64_t length) noexcept;
-
-/// The floor of the binary logarithm; 0 for 0.
-ZB_API std::uint64_t Log2(std::uint64_t n) noexcept;
-
-/// 2^i. \pre i is at most 30
-ZB_API std::uint64_t Pow2(std::uint64_t i) noexcept;
-
-/// The largest prime that is not above 2^i; 1 for i = 0. \pre i is at most 30
-ZB_API std::uint64_t PrimeClsPo2(std::uint64_t i) noexcept;
-
-/// The floor of the square root.
-/// \kept hash-02: only the low 32 bits take part, as a signed number; from 2^31 on the result has no meaning
-ZB_API std::uint64_t sqrtInt(std::uint64_t n) noexcept;
-
-} // namespace ZOR_Basis
+#include "zor_basis/ground/hashing.h"
 
 #endif

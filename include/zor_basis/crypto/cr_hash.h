@@ -7,7 +7,7 @@
 #define ZOR_BASIS_CRYPTO_CR_HASH_H
 
 #include "zor_basis/export.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 #include <cstdint>
 

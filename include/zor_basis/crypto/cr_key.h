@@ -10,7 +10,7 @@
 #define ZOR_BASIS_CRYPTO_CR_KEY_H
 
 #include "zor_basis/export.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 namespace ZOR_Basis {
 

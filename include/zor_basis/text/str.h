@@ -26,8 +26,8 @@
 #ifndef ZOR_BASIS_TEXT_STR_H
 #define ZOR_BASIS_TEXT_STR_H
 
-#include "zor_basis/containers/hashing.h"
 #include "zor_basis/export.h"
+#include "zor_basis/ground/hashing.h"
 #include "zor_basis/text/char_ops.h"
 #include "zor_basis/text/pointer_guard.h"
 

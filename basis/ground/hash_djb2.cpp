@@ -1,6 +1,6 @@
-#include "basis/containers/hash_djb2.h"
+#include "basis/ground/hash_djb2.h"
 
-#include "zor_basis/containers/hashing.h"
+#include "zor_basis/ground/hashing.h"
 
 #include <array>
 #include <bit>

@@ -9,8 +9,8 @@
 /// overlooked: a slash run in the pattern never takes a part of a run in the name, and a "*" that meets a "*" in the
 /// name is an equal character, no wildcard: "*" does not match "*a".
 
-#ifndef BASIS_FILES_WILDCARD_H
-#define BASIS_FILES_WILDCARD_H
+#ifndef BASIS_GROUND_WILDCARD_H
+#define BASIS_GROUND_WILDCARD_H
 
 #include <cctype>
 #include <cstddef>

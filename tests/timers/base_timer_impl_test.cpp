@@ -6,17 +6,6 @@
 
 using namespace ZOR_Basis;
 
-TEST(PerformanceCounter, is_known_and_never_runs_back) {
-    EXPECT_TRUE(PerformanceCounter::frequency().known);
-    std::int64_t last = PerformanceCounter::now();
-    EXPECT_GT(last, 0);
-    for (int i = 0; i < 1000; ++i) {
-        std::int64_t const now = PerformanceCounter::now();
-        EXPECT_GE(now, last);
-        last = now;
-    }
-}
-
 TEST(PerformanceCounter, Kept_timers_03_that_is_missing_is_reported_under_an_old_name) {
     Assertions assertions;
     EXPECT_EQ(checkedFrequency({true, 10'000'000}), 10'000'000);

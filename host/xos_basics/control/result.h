@@ -1,8 +1,8 @@
 /// \file
 /// How a platform function turns what its body found out into its result.
 
-#ifndef HOST_XOS_BASICS_RESULT_H
-#define HOST_XOS_BASICS_RESULT_H
+#ifndef HOST_XOS_BASICS_CONTROL_RESULT_H
+#define HOST_XOS_BASICS_CONTROL_RESULT_H
 
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"

@@ -1,11 +1,11 @@
 /// \file
 /// The records of a dictionary's file, read and written in large pieces.
 
-#ifndef BASIS_CONTAINERS_DICT_RECORDS_H
-#define BASIS_CONTAINERS_DICT_RECORDS_H
+#ifndef BASIS_STORE_DICT_RECORDS_H
+#define BASIS_STORE_DICT_RECORDS_H
 
 #include "zor_basis/files/i_file.h"
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 #include <cstdint>
 

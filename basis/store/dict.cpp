@@ -1,9 +1,9 @@
-#include "zor_basis/containers/dict.h"
+#include "zor_basis/store/dict.h"
 
-#include "basis/containers/dict_index.h"
-#include "basis/containers/dict_records.h"
 #include "basis/files/replacement.h"
 #include "basis/files/system_calls.h"
+#include "basis/store/dict_index.h"
+#include "basis/store/dict_records.h"
 #include "zor_basis/files/file.h"
 
 #include <cstring>

@@ -1,4 +1,4 @@
-#include "basis/files/wildcard.h"
+#include "basis/ground/wildcard.h"
 
 #include "tests/support/random_steps.h"
 #include "tests/support/table.h"

@@ -1,6 +1,6 @@
 // What Linux knows of a file besides its content: links, owners, permissions, and disks that run full.
 
-#include "tests/containers/dict_files.h"
+#include "tests/store/dict_files.h"
 #include "tests/support/scratch.h"
 #include "tests/support/skip.h"
 #include "tests/support/table.h"

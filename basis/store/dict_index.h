@@ -1,11 +1,11 @@
 /// \file
 /// A passing hash table over the units of a list of entries: a file with many keys loads in linear time.
 
-#ifndef BASIS_CONTAINERS_DICT_INDEX_H
-#define BASIS_CONTAINERS_DICT_INDEX_H
+#ifndef BASIS_STORE_DICT_INDEX_H
+#define BASIS_STORE_DICT_INDEX_H
 
-#include "basis/containers/dict_records.h"
-#include "zor_basis/containers/dict_entry.h"
+#include "basis/store/dict_records.h"
+#include "zor_basis/store/dict_entry.h"
 
 #include <cstdint>
 #include <vector>

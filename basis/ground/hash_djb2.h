@@ -1,8 +1,8 @@
 /// \file
 /// The ways to hash a text that the processor decides between.
 
-#ifndef BASIS_CONTAINERS_HASH_DJB2_H
-#define BASIS_CONTAINERS_HASH_DJB2_H
+#ifndef BASIS_GROUND_HASH_DJB2_H
+#define BASIS_GROUND_HASH_DJB2_H
 
 #include <cstdint>
 

@@ -1,4 +1,4 @@
-#include "basis/containers/dict_index.h"
+#include "basis/store/dict_index.h"
 
 #include <cstring>
 

@@ -1,7 +1,7 @@
 // What is in each block at the moment when it is released. The linker leads every `malloc` and `free` of this program's
 // objects here, the library's own ones included.
 
-#include <zor_basis/text/blob.h>
+#include <zor_basis/store/blob.h>
 
 #include "tests/support/memory_file.h"
 #include "tests/support/watched_blocks.h"

@@ -1,4 +1,4 @@
-#include "zor_basis/text/blob.h"
+#include "zor_basis/store/blob.h"
 
 #include "basis/text/wipe.h"
 #include "zor_basis/files/i_file.h"

@@ -1,7 +1,7 @@
 // What Windows knows of a file besides its content: attributes, who has it open, and the path of an open entry.
 
 #include "basis/files/opened_path_win.h"
-#include "tests/containers/dict_files.h"
+#include "tests/store/dict_files.h"
 #include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>

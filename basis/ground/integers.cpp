@@ -1,4 +1,4 @@
-#include "zor_basis/containers/hashing.h"
+#include "zor_basis/ground/hashing.h"
 
 #include <bit>
 

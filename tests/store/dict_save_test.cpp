@@ -1,8 +1,8 @@
 // Saving a dictionary so that its file is always the old one or the whole new one.
 
 #include "basis/files/system_calls.h"
-#include "tests/containers/dict_files.h"
 #include "tests/once/dict_contents.h"
+#include "tests/store/dict_files.h"
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"

@@ -1,4 +1,4 @@
-#include "basis/containers/dict_records.h"
+#include "basis/store/dict_records.h"
 
 #include <algorithm>
 #include <cstring>

@@ -1,10 +1,10 @@
 /// \file
 /// Dictionaries and the bytes of their files, for the tests of both.
 
-#ifndef TESTS_CONTAINERS_DICT_FILES_H
-#define TESTS_CONTAINERS_DICT_FILES_H
+#ifndef TESTS_STORE_DICT_FILES_H
+#define TESTS_STORE_DICT_FILES_H
 
-#include <zor_basis/containers/dict.h>
+#include <zor_basis/store/dict.h>
 
 #include <cstdint>
 #include <string>

@@ -1,8 +1,8 @@
 /// \file
 /// The performance counter: clock_win.cpp, clock_posix.cpp.
 
-#ifndef BASIS_TIMERS_CLOCK_H
-#define BASIS_TIMERS_CLOCK_H
+#ifndef BASIS_GROUND_CLOCK_H
+#define BASIS_GROUND_CLOCK_H
 
 #include <cstdint>
 

@@ -1,8 +1,8 @@
 // The way that processors without SSSE3 take, on whatever processor this is.
 
-#include "basis/containers/hash_djb2.h"
+#include "basis/ground/hash_djb2.h"
 
-#include "zor_basis/containers/hashing.h"
+#include "zor_basis/ground/hashing.h"
 
 #include <gtest/gtest.h>
 

@@ -1,5 +1,5 @@
 // Its sibling is clock_posix.cpp.
-#include "basis/timers/clock.h"
+#include "basis/ground/clock.h"
 
 #include "basis/platform/windows_api.h"
 

@@ -1,5 +1,5 @@
 // Its sibling is clock_win.cpp.
-#include "basis/timers/clock.h"
+#include "basis/ground/clock.h"
 
 #include <ctime>
 

@@ -1,6 +1,6 @@
 #include <zor_basis/containers/dict.h>
 
-#include "tests/containers/dict_files.h"
+#include "tests/store/dict_files.h"
 #include "tests/support/random_steps.h"
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"

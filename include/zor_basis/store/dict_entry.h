@@ -1,0 +1,43 @@
+/// \file
+/// `DictEntry<Blob, Blob>`: a key of a dictionary with its value.
+///
+/// \thread  one thread at a time
+
+#ifndef ZOR_BASIS_STORE_DICT_ENTRY_H
+#define ZOR_BASIS_STORE_DICT_ENTRY_H
+
+#include "zor_basis/store/blob.h"
+
+namespace ZOR_Basis {
+
+template <class K, class V>
+class DictEntry {
+public:
+    /// With an empty value. A moved entry is copied, as blobs are.
+    DictEntry(K const& newKey) : key(newKey) {}
+    DictEntry(K const& newKey, V const& newValue) : key(newKey), value(newValue) {}
+    DictEntry(DictEntry const& other) = default;
+    DictEntry(DictEntry&& other) noexcept = default;
+    DictEntry& operator=(DictEntry const& other) = default;
+    DictEntry& operator=(DictEntry&& other) noexcept = default;
+
+    bool eq(K const& other) const { return key == other; }
+    /// Copies a value, unless it is the entry's own.
+    void set(V const& other) {
+        if (&other != &value) value = other;
+    }
+
+    /// Whether key or value differ.
+    bool operator!=(DictEntry const& other) const { return key != other.key || value != other.value; }
+    /// Orders by the keys alone.
+    bool operator<(DictEntry const& other) const { return key < other.key; }
+
+    K key;
+    V value;
+};
+
+static_assert(sizeof(DictEntry<Blob, Blob>) == 2 * sizeof(Blob));
+
+} // namespace ZOR_Basis
+
+#endif
