@@ -1,22 +1,11 @@
 #include "basis/ground/hash_djb2.h"
 
+#include "basis/ground/wide_loads.h"
 #include "zor_basis/ground/hashing.h"
 
 #include <array>
 #include <bit>
 #include <cstdint>
-
-#if defined(__GNUC__)
-#include <immintrin.h>
-#define ZB_SSSE3 [[gnu::target("ssse3")]]
-#define ZB_HAS_SSSE3 (__builtin_cpu_supports("ssse3") != 0)
-#define ZB_IN_CALLER [[gnu::always_inline]] inline
-#else
-#include <immintrin.h>
-#define ZB_SSSE3
-#define ZB_HAS_SSSE3 false
-#define ZB_IN_CALLER inline
-#endif
 
 // The hash of a text is 33^n times the start, plus the sum of its bytes weighted with falling powers of 33. Sixteen bytes
 // are weighted at once. The last block is filled with zeros, which weights its bytes too high by a power of 33; as 33 is
@@ -51,7 +40,7 @@ constexpr int weights(std::uint64_t first, std::uint64_t second) { return static
 
 // How pairs of bytes are weighted: eight sums of 33 times the first, plus the second.
 struct ByMultiplication {
-    ZB_IN_CALLER static __m128i pairs(__m128i bytes) {
+    ZB_INLINE static __m128i pairs(__m128i bytes) {
         // kept hash-01: the sign of each byte is extended.
         __m128i const signs = _mm_cmpgt_epi8(_mm_setzero_si128(), bytes);
         __m128i const byPair = _mm_set1_epi32(weights(POWER[1], 1));
@@ -68,13 +57,13 @@ struct BySsse3 {
 
 /// Sixteen bytes in four groups, each weighted within itself; 32 bits hold it.
 template <class Pairs>
-ZB_IN_CALLER __m128i byGroups(__m128i bytes) {
+ZB_INLINE __m128i byGroups(__m128i bytes) {
     return _mm_madd_epi16(Pairs::pairs(bytes), _mm_set1_epi32(weights(POWER[2], 1)));
 }
 
 /// Byte i of sixteen, signed, times 33^(15 - i), summed.
 template <class Pairs>
-ZB_IN_CALLER std::uint64_t weighted(__m128i bytes) {
+ZB_INLINE std::uint64_t weighted(__m128i bytes) {
     __m128i const groups = byGroups<Pairs>(bytes);
     std::int64_t const front = _mm_cvtsi128_si64(groups);
     std::int64_t const back = _mm_cvtsi128_si64(_mm_unpackhi_epi64(groups, groups));
@@ -82,36 +71,28 @@ ZB_IN_CALLER std::uint64_t weighted(__m128i bytes) {
            (signExtended(static_cast<std::int32_t>(back)) * POWER[4] + signExtended(back >> 32));
 }
 
-__m128i load(char const* p) { return _mm_loadu_si128(reinterpret_cast<__m128i const*>(p)); }
+using detail::load16;
+using detail::zerosIn;
 
 /// Sixteen bytes of a text; behind its terminator anything. What lies in the page of the first byte can be read.
-#if defined(__GNUC__)
-[[gnu::no_sanitize_address]]
-#endif
-inline __m128i
-loadText(char const* text) {
-    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) [[likely]] {
-        return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); // not load(): that one is sanitized
-    }
+ZB_UNSANITIZED inline __m128i loadText(char const* text) {
+    if (reinterpret_cast<std::uintptr_t>(text) % PAGE <= PAGE - BLOCK) [[likely]]
+        return load16(text);
     char bytes[BLOCK] = {};
     for (unsigned i = 0; i < BLOCK && text[i] != '\0'; ++i) bytes[i] = text[i];
-    return load(bytes);
+    return load16(bytes);
 }
 
 /// The first `count` bytes, zeros behind them.
 __m128i firstBytes(__m128i bytes, unsigned count) {
     alignas(BLOCK) static constexpr char MASK[2 * BLOCK] = {-1, -1, -1, -1, -1, -1, -1, -1,
                                                             -1, -1, -1, -1, -1, -1, -1, -1};
-    return _mm_and_si128(bytes, load(MASK + BLOCK - count));
-}
-
-unsigned zerosIn(__m128i bytes) {
-    return static_cast<unsigned>(_mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())));
+    return _mm_and_si128(bytes, load16(MASK + BLOCK - count));
 }
 
 /// \param bytes  the first sixteen of the text, or what `loadText` gives for them
 template <class Pairs>
-ZB_IN_CALLER std::uint64_t hashOf(char const* text, __m128i bytes) {
+ZB_INLINE std::uint64_t hashOf(char const* text, __m128i bytes) {
     std::uint64_t hash = START;
     for (;; bytes = loadText(text += BLOCK)) {
         unsigned const zeros = zerosIn(bytes);
@@ -127,7 +108,7 @@ ZB_IN_CALLER std::uint64_t hashOf(char const* text, __m128i bytes) {
 constexpr unsigned SHORT = 8;
 
 /// Of the first `count` of sixteen bytes, at most SHORT.
-ZB_IN_CALLER std::uint64_t hashOfShort(__m128i bytes, unsigned count) {
+ZB_INLINE std::uint64_t hashOfShort(__m128i bytes, unsigned count) {
     // Zeros in front of the text weigh nothing. In two steps, as all bits may go.
     unsigned const half = 4 * (SHORT - count);
     auto const last = static_cast<std::uint64_t>(_mm_cvtsi128_si64(bytes)) << half << half;

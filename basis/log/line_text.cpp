@@ -4,6 +4,7 @@
 #include "basis/log/decimal_digits.h"
 #include "basis/log/decimal_point.h"
 #include "basis/log/fixed_decimal.h"
+#include "zor_basis/ground/compiler.h"
 
 #include <cfenv>
 #include <charconv>
@@ -11,13 +12,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
-
-/// The frequent steps exist twice, for plain conversions and for all, and are worth it.
-#if defined(__GNUC__)
-#define ZB_ALWAYS_INLINE [[gnu::always_inline]] inline
-#else
-#define ZB_ALWAYS_INLINE inline
-#endif
 
 namespace ZOR_Basis {
 namespace {
@@ -79,7 +73,7 @@ bool QuickLine::write(char const* format) {
 }
 
 /// Goes on to the next conversion, or to the end.
-ZB_ALWAYS_INLINE bool QuickLine::putPlain(char const*& format) {
+ZB_INLINE bool QuickLine::putPlain(char const*& format) {
     char* at = at_;
     char const* from = format;
     while (*from != '%' && *from != '\0' && at != end_) *at++ = *from++;
@@ -130,7 +124,7 @@ bool QuickLine::writeParsed(Conversion const& how) {
     }
 }
 
-ZB_ALWAYS_INLINE bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
+ZB_INLINE bool QuickLine::writePadded(char const* text, std::size_t size, Conversion const& how) {
     std::size_t const blanks = how.width > size ? how.width - size : 0;
     if (size + blanks > room()) return false;
     if (!how.isLeft) fill(' ', blanks);
@@ -139,7 +133,7 @@ ZB_ALWAYS_INLINE bool QuickLine::writePadded(char const* text, std::size_t size,
     return true;
 }
 
-ZB_ALWAYS_INLINE bool QuickLine::writeText(Conversion const& how) {
+ZB_INLINE bool QuickLine::writeText(Conversion const& how) {
     if (how.length != Conversion::NONE || how.hasZeros || how.hasSignFlag()) return false;
     char const* const text = va_arg(arguments_.list, char const*);
     if (text == nullptr) return false;
@@ -200,7 +194,7 @@ char signOf(bool isNegative, Conversion const& how) {
     return how.hasBlank ? ' ' : '\0';
 }
 
-ZB_ALWAYS_INLINE bool QuickLine::writeSigned(Conversion const& how) {
+ZB_INLINE bool QuickLine::writeSigned(Conversion const& how) {
     if (how.precision >= 0) return false;
     std::int64_t const number = nextSigned(how.length);
     auto const bits = static_cast<std::uint64_t>(number);

@@ -1,6 +1,7 @@
 #include "basis/memory/sm_bl_mem_mgr.h"
 
 #include "zor_basis/ground/hashing.h"
+#include "zor_basis/ground/loads.h"
 
 #include <algorithm>
 #include <cstring>
@@ -31,11 +32,7 @@ std::uint64_t product(std::uint64_t a, std::uint64_t b) {
 }
 
 // A freed element's first word is the address of the next one; it need not be aligned for a pointer.
-char* nextOf(char const* element) {
-    char* next;
-    std::memcpy(&next, element, sizeof next);
-    return next;
-}
+char* nextOf(char const* element) { return detail::loadWord<char*>(element); }
 
 } // namespace
 
@@ -66,7 +63,7 @@ void SmBlMemMgr::free(void* p) {
         top_ = static_cast<char*>(p) + elemSize_;
     } else if (p != nullptr) {
         // kept memory-01: a whole pointer goes into the element, however small that is.
-        std::memcpy(p, &freeList_, sizeof freeList_);
+        detail::storeWord(p, freeList_);
         freeList_ = static_cast<char*>(p);
     }
 }

@@ -1,5 +1,7 @@
 #include "basis/store/dict_index.h"
 
+#include "zor_basis/ground/loads.h"
+
 #include <cstring>
 
 namespace ZOR_Basis {
@@ -18,12 +20,10 @@ std::uint64_t mix(std::uint64_t hash, std::uint64_t word) {
 std::uint32_t hashOf(RecordBytes key) {
     std::uint64_t hash = key.size;
     std::uint64_t at = 0;
-    std::uint64_t word = 0;
-    for (; key.size - at >= sizeof word; at += sizeof word) {
-        std::memcpy(&word, key.place + at, sizeof word);
-        hash = mix(hash, word);
+    for (; key.size - at >= sizeof(std::uint64_t); at += sizeof(std::uint64_t)) {
+        hash = mix(hash, detail::loadWord<std::uint64_t>(key.place + at));
     }
-    word = 0;
+    std::uint64_t word = 0;
     std::memcpy(&word, key.place + at, key.size - at);
     return static_cast<std::uint32_t>(mix(mix(hash, word), 0));
 }

@@ -4,7 +4,7 @@
 #ifndef BASIS_SYSTEM_LINE_LENGTH_H
 #define BASIS_SYSTEM_LINE_LENGTH_H
 
-#include "zor_basis/text/word_ops.h"
+#include "zor_basis/ground/loads.h"
 
 #include <bit>
 #include <cstdint>
@@ -15,24 +15,22 @@ inline bool endsLine(char c) { return c == '\n' || c == '\r' || c == '\0'; }
 
 #if ZB_VECTORS
 
-inline __m128i load16(char const* text) { return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); }
-
 /// One bit for each of 16 bytes: whether it ends a line.
 inline std::uint64_t lineEndsIn16(char const* text) {
-    __m128i const bytes = load16(text);
+    __m128i const bytes = detail::load16(text);
     __m128i const lineFeeds = _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\n'));
     __m128i const carriageReturns = _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\r'));
-    __m128i const zeros = _mm_cmpeq_epi8(bytes, _mm_setzero_si128());
-    return static_cast<std::uint32_t>(_mm_movemask_epi8(_mm_or_si128(_mm_or_si128(lineFeeds, carriageReturns), zeros)));
+    return detail::bitsOf(_mm_or_si128(_mm_or_si128(lineFeeds, carriageReturns), detail::zeroBytes(bytes)));
 }
 
 /// The same for 64 bytes. None of those that end a line is above a carriage return, and mostly nothing else is below.
 inline std::uint64_t lineEndsIn64(char const* text) {
+    using detail::load16;
     __m128i const lower = _mm_min_epu8(load16(text), load16(text + 16));
     __m128i const upper = _mm_min_epu8(load16(text + 32), load16(text + 48));
     __m128i const lowest = _mm_min_epu8(lower, upper);
     __m128i const capped = _mm_min_epu8(lowest, _mm_set1_epi8('\r'));
-    if (_mm_movemask_epi8(_mm_cmpeq_epi8(capped, lowest)) == 0) return 0;
+    if (detail::bitsOf(_mm_cmpeq_epi8(capped, lowest)) == 0) return 0;
     return lineEndsIn16(text) | lineEndsIn16(text + 16) << 16 | lineEndsIn16(text + 32) << 32 |
            lineEndsIn16(text + 48) << 48;
 }

@@ -41,7 +41,7 @@ template <class Text>
 ZB_INLINE bool same(char const* a, char const* b, std::uint64_t length) noexcept {
     if (length > 64) [[unlikely]] {
 #if ZB_WIDE_VECTOR_TEXT
-        if (__builtin_cpu_supports("avx512bw")) [[likely]]
+        if (ZB_HAS_AVX512) [[likely]]
             return askInWideRuns<Text, AreSame>(a, b, length);
 #endif
         return sameLongTexts<Text>(a, b, length);
@@ -58,7 +58,7 @@ template <class Text>
 ZB_INLINE int order(char const* a, char const* b, std::uint64_t length) noexcept {
     if (length > 64) [[unlikely]] {
 #if ZB_WIDE_VECTOR_TEXT
-        if (__builtin_cpu_supports("avx512bw")) [[likely]]
+        if (ZB_HAS_AVX512) [[likely]]
             return askInWideRuns<Text, OrderOf>(a, b, length);
 #endif
         return orderOfLongTexts<Text>(a, b, length);
@@ -68,7 +68,7 @@ ZB_INLINE int order(char const* a, char const* b, std::uint64_t length) noexcept
     if (length <= 16) [[unlikely]]
         return orderOfShortTexts(a, b, length);
 #if ZB_WIDE_VECTOR_TEXT
-    if (__builtin_cpu_supports("avx512bw")) [[likely]]
+    if (ZB_HAS_AVX512) [[likely]]
         return orderInOneRun(a, b, length);
 #endif
     return orderOfMediumTexts(a, b, length);

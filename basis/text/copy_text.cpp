@@ -31,9 +31,8 @@ struct Owned {
     static bool readable(char const*, std::uint64_t) noexcept { return true; }
 };
 
-// Each step reads everything before it writes anything, so that source and target may overlap.
-
 ZB_INLINE bool copyUpTo3(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length == 0) return true;
     char const first = source[0];
     char const middle = source[length / 2];
     char const last = source[length - 1];
@@ -44,55 +43,9 @@ ZB_INLINE bool copyUpTo3(char* target, char const* source, std::uint64_t length)
     return true;
 }
 
-ZB_INLINE bool copy4To7(char* target, char const* source, std::uint64_t length) noexcept {
-    std::uint32_t const head = load4(source);
-    std::uint32_t const tail = load4(source + length - 4);
-    if (hasZero(head | std::uint64_t{tail} << 32)) return false;
-    std::memcpy(target, &head, sizeof head);
-    std::memcpy(target + length - 4, &tail, sizeof tail);
-    return true;
-}
-
-ZB_INLINE bool copy8To15(char* target, char const* source, std::uint64_t length) noexcept {
-    __m128i const both = _mm_unpacklo_epi64(load8(source), load8(source + length - 8));
-    if (zerosOf(both) != 0) return false;
-    _mm_storel_epi64(reinterpret_cast<__m128i*>(target), both);
-    _mm_storel_epi64(reinterpret_cast<__m128i*>(target + length - 8), _mm_unpackhi_epi64(both, both));
-    return true;
-}
-
-ZB_INLINE bool copy16To32(char* target, char const* source, std::uint64_t length) noexcept {
-    __m128i const head = load16(source);
-    __m128i const tail = load16(source + length - 16);
-    if (zerosOf(_mm_min_epu8(head, tail)) != 0) return false;
-    store16(target, head);
-    store16(target + length - 16, tail);
-    return true;
-}
-
-ZB_INLINE bool copy33To64(char* target, char const* source, std::uint64_t length) noexcept {
-    __m128i const a = load16(source);
-    __m128i const b = load16(source + 16);
-    __m128i const c = load16(source + length - 32);
-    __m128i const d = load16(source + length - 16);
-    if (zerosOf(_mm_min_epu8(_mm_min_epu8(a, b), _mm_min_epu8(c, d))) != 0) return false;
-    store16(target, a);
-    store16(target + 16, b);
-    store16(target + length - 32, c);
-    store16(target + length - 16, d);
-    return true;
-}
-
 /// At most 64 bytes.
 ZB_INLINE bool copyShort(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length >= 16) {
-        if (length <= 32) return copy16To32(target, source, length);
-        return copy33To64(target, source, length);
-    }
-    if (length >= 8) [[likely]]
-        return copy8To15(target, source, length);
-    if (length >= 4) return copy4To7(target, source, length);
-    return length == 0 || copyUpTo3(target, source, length);
+    return copyInSteps<copyUpTo3>(target, source, length);
 }
 
 ZB_COLD void copyOther(char* target, char const* source, std::uint64_t length) noexcept {
@@ -192,7 +145,7 @@ ZB_INLINE void copyOf(char* target, char const* source, std::uint64_t length) no
         if (copyShort(target, source, length)) return;
     } else {
 #if ZB_WIDE_VECTOR_TEXT
-        if (__builtin_cpu_supports("avx2")) [[likely]]
+        if (ZB_HAS_AVX2) [[likely]]
             return copyLong<Text>(target, source, length);
 #endif
     }

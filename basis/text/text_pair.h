@@ -55,7 +55,7 @@ struct Places {
 
 inline Places<std::uint32_t> placesOf(__m128i a, __m128i b) noexcept {
     __m128i const equal = _mm_cmpeq_epi8(a, b);
-    return {static_cast<std::uint32_t>(_mm_movemask_epi8(equal)) ^ 0xFFFFU, zerosOf(_mm_min_epu8(equal, a))};
+    return {bitsOf(equal) ^ 0xFFFFU, zerosIn(_mm_min_epu8(equal, a))};
 }
 
 /// How much of two texts may be read before anything is known about their bytes.
@@ -74,8 +74,8 @@ inline __m128i ends1To3(char const* text, std::uint64_t length) noexcept {
     return _mm_cvtsi32_si128(byte(0) | byte(length / 2) << 8 | byte(length - 1) << 16);
 }
 inline __m128i ends4To7(char const* text, std::uint64_t length) noexcept {
-    return _mm_unpacklo_epi32(_mm_cvtsi32_si128(static_cast<int>(load4(text))),
-                              _mm_cvtsi32_si128(static_cast<int>(load4(text + length - 4))));
+    return _mm_unpacklo_epi32(_mm_cvtsi32_si128(static_cast<int>(loadWord<std::uint32_t>(text))),
+                              _mm_cvtsi32_si128(static_cast<int>(loadWord<std::uint32_t>(text + length - 4))));
 }
 inline __m128i ends8To16(char const* text, std::uint64_t length) noexcept {
     return _mm_unpacklo_epi64(load8(text), load8(text + length - 8));
@@ -117,10 +117,10 @@ public:
 
     ZB_INLINE bool same() const noexcept {
         __m128i const all = _mm_and_si128(_mm_and_si128(same_[0], same_[1]), _mm_and_si128(same_[2], same_[3]));
-        return _mm_movemask_epi8(all) == 0xFFFF;
+        return bitsOf(all) == 0xFFFF;
     }
     ZB_INLINE bool haveZero() const noexcept {
-        return zerosOf(_mm_min_epu8(_mm_min_epu8(bytes_[0], bytes_[1]), _mm_min_epu8(bytes_[2], bytes_[3]))) != 0;
+        return hasZero(_mm_min_epu8(_mm_min_epu8(bytes_[0], bytes_[1]), _mm_min_epu8(bytes_[2], bytes_[3])));
     }
     /// The place of the first difference; where there is none, the length.
     ZB_INLINE std::uint64_t difference() const noexcept {
@@ -139,9 +139,7 @@ private:
         bytes_[i] = load16(a + place);
         same_[i] = _mm_cmpeq_epi8(bytes_[i], load16(b + place));
     }
-    ZB_INLINE unsigned samePlaces(unsigned i) const noexcept {
-        return static_cast<unsigned>(_mm_movemask_epi8(same_[i]));
-    }
+    ZB_INLINE unsigned samePlaces(unsigned i) const noexcept { return bitsOf(same_[i]); }
 
     std::uint64_t second_;
     std::uint64_t last_;

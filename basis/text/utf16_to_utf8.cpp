@@ -2,6 +2,9 @@
 #include "basis/text/utf_block.h"
 
 #include <algorithm>
+#include <array>
+#include <bit>
+#include <cstring>
 
 namespace ZOR_Basis::Utf {
 namespace {
@@ -29,10 +32,10 @@ struct Progress {
 
 __m128i units(int value) { return _mm_set1_epi16(static_cast<short>(value)); }
 
-__m128i zerosIn(__m128i block) { return _mm_cmpeq_epi16(block, _mm_setzero_si128()); }
+__m128i zeroUnits(__m128i block) { return _mm_cmpeq_epi16(block, _mm_setzero_si128()); }
 
 /// All ones in each unit that has none of the given bits.
-__m128i without(__m128i block, int bits) { return zerosIn(_mm_and_si128(block, units(bits))); }
+__m128i without(__m128i block, int bits) { return zeroUnits(_mm_and_si128(block, units(bits))); }
 
 bool isAscii(__m128i block) { return bitsOf(without(block, 0xFF80)) == 0xFFFF; }
 
@@ -43,7 +46,7 @@ __m128i packed(__m128i block) { return _mm_packus_epi16(block, block); }
 constexpr Selection SHORTENED_UNITS = makeSelection(1, 2);
 
 /// Stores a block of units up to 0x7FF, each as one byte or two. \return the bytes; 0 if there are greater units
-ZB_SHUFFLE_TARGET inline unsigned storeMixedBlock(__m128i block, char* out) {
+ZB_SSSE3 inline unsigned storeMixedBlock(__m128i block, char* out) {
     if (bitsOf(without(block, 0xF800)) != 0xFFFF) return 0;
     __m128i const ascii = without(block, 0xFF80);
     __m128i const lead = _mm_srli_epi16(block, 6);
@@ -57,58 +60,58 @@ constexpr std::uint64_t LONG_BLOCK_BYTES = 3 * BLOCK_UNITS;
 constexpr std::uint64_t LONG_BLOCK_ROOM = LONG_BLOCK_BYTES + 4; // what is stored beyond the block
 
 /// Stores a block of units of three bytes each. \return whether it is one
-ZB_SHUFFLE_TARGET inline bool storeLongBlock(__m128i block, char* out) {
+ZB_SSSE3 inline bool storeLongBlock(__m128i block, char* out) {
     __m128i const high = _mm_and_si128(block, units(0xF800));
-    if (bitsOf(_mm_or_si128(zerosIn(high), _mm_cmpeq_epi16(high, units(0xD800)))) != 0) return false;
+    if (bitsOf(_mm_or_si128(zeroUnits(high), _mm_cmpeq_epi16(high, units(0xD800)))) != 0) return false;
     __m128i const first = _mm_srli_epi16(block, 12);
     __m128i const second = _mm_and_si128(_mm_slli_epi16(block, 2), units(0x3F00));
     __m128i const front = _mm_or_si128(_mm_or_si128(first, second), units(0x80E0));
     __m128i const last = _mm_or_si128(_mm_and_si128(block, units(0x3F)), units(0x80));
     // Of each character's four bytes the last one goes.
     __m128i const kept = _mm_setr_epi8(0, 1, 2, 4, 5, 6, 8, 9, 10, 12, 13, 14, -1, -1, -1, -1);
-    storeBlock(out, _mm_shuffle_epi8(_mm_unpacklo_epi16(front, last), kept));
-    storeBlock(out + LONG_BLOCK_BYTES / 2, _mm_shuffle_epi8(_mm_unpackhi_epi16(front, last), kept));
+    store16(out, _mm_shuffle_epi8(_mm_unpacklo_epi16(front, last), kept));
+    store16(out + LONG_BLOCK_BYTES / 2, _mm_shuffle_epi8(_mm_unpackhi_epi16(front, last), kept));
     return true;
 }
 
 /// A block's last `left` units, moved to its front; zeros behind them.
-ZB_SHUFFLE_TARGET inline __m128i movedToFront(__m128i block, std::uint64_t left) {
+ZB_SSSE3 inline __m128i movedToFront(__m128i block, std::uint64_t left) {
     static constexpr auto PLACES = [] {
         std::array<std::uint8_t, 2 * BLOCK_BYTES> places{};
         for (unsigned i = 0; i < places.size(); ++i) places[i] = static_cast<std::uint8_t>(i < BLOCK_BYTES ? i : 0x80);
         return places;
     }();
-    return _mm_shuffle_epi8(block, loadBlock(PLACES.data() + BLOCK_BYTES - sizeof(WChar) * left));
+    return _mm_shuffle_epi8(block, load16(PLACES.data() + BLOCK_BYTES - sizeof(WChar) * left));
 }
 
 struct WithShuffle {
-    ZB_SHUFFLE_TARGET static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
-    ZB_SHUFFLE_TARGET static bool storeLong(__m128i block, char* out) { return storeLongBlock(block, out); }
-    ZB_SHUFFLE_TARGET static __m128i lastOf(__m128i block, std::uint64_t left) { return movedToFront(block, left); }
+    ZB_SSSE3 static unsigned storeMixed(__m128i block, char* out) { return storeMixedBlock(block, out); }
+    ZB_SSSE3 static bool storeLong(__m128i block, char* out) { return storeLongBlock(block, out); }
+    ZB_SSSE3 static __m128i lastOf(__m128i block, std::uint64_t left) { return movedToFront(block, left); }
 };
 struct WithoutShuffle {
-    ZB_IN_CALLER static unsigned storeMixed(__m128i, char*) { return 0; }
-    ZB_IN_CALLER static bool storeLong(__m128i, char*) { return false; }
-    ZB_IN_CALLER static __m128i lastOf(__m128i block, std::uint64_t left) {
+    ZB_INLINE static unsigned storeMixed(__m128i, char*) { return 0; }
+    ZB_INLINE static bool storeLong(__m128i, char*) { return false; }
+    ZB_INLINE static __m128i lastOf(__m128i block, std::uint64_t left) {
         WChar window[2 * BLOCK_UNITS] = {};
-        storeBlock(window, block);
-        return loadBlock(window + BLOCK_UNITS - left);
+        store16(window, block);
+        return load16(window + BLOCK_UNITS - left);
     }
 };
 
-ZB_IN_CALLER void takeAsciiBlocks(Progress& progress) {
+ZB_INLINE void takeAsciiBlocks(Progress& progress) {
     constexpr std::uint64_t STEP = 2 * BLOCK_UNITS;
     __m128i least = _mm_set1_epi8(-1);
     for (std::uint64_t steps = std::min(progress.left(), progress.room()) / STEP; steps > 0; --steps) {
-        __m128i const low = loadBlock(progress.text);
-        __m128i const high = loadBlock(progress.text + BLOCK_UNITS);
+        __m128i const low = load16(progress.text);
+        __m128i const high = load16(progress.text + BLOCK_UNITS);
         if (!isAscii(_mm_or_si128(low, high))) break;
         __m128i const bytes = _mm_packus_epi16(low, high);
         least = _mm_min_epu8(least, bytes);
-        storeBlock(progress.out, bytes);
+        store16(progress.out, bytes);
         progress.advance(STEP, STEP);
     }
-    progress.hasZero |= bitsOf(_mm_cmpeq_epi8(least, _mm_setzero_si128())) != 0;
+    progress.hasZero |= hasZero(least);
 }
 
 struct Run {
@@ -117,27 +120,27 @@ struct Run {
 };
 
 /// ASCII from the front of `most` units, by blocks of twice the size.
-ZB_WIDE_TARGET Run takeWideAscii(WChar const* text, char* out, std::uint64_t most) {
+ZB_AVX2 Run takeWideAscii(WChar const* text, char* out, std::uint64_t most) {
     constexpr std::uint64_t STEP = 4 * BLOCK_UNITS;
     __m256i const beyondAscii = _mm256_set1_epi16(static_cast<short>(0xFF80));
     __m256i least = _mm256_set1_epi8(-1);
     std::uint64_t done = 0;
     for (; done + STEP <= most; done += STEP) {
-        __m256i const low = loadWideBlock(text + done);
-        __m256i const high = loadWideBlock(text + done + STEP / 2);
+        __m256i const low = load32(text + done);
+        __m256i const high = load32(text + done + STEP / 2);
         if (_mm256_testz_si256(_mm256_or_si256(low, high), beyondAscii) == 0) break;
         // Packing takes the halves of both by turns.
         __m256i const bytes = _mm256_permute4x64_epi64(_mm256_packus_epi16(low, high), _MM_SHUFFLE(3, 1, 2, 0));
         least = _mm256_min_epu8(least, bytes);
-        storeWideBlock(out + done, bytes);
+        store32(out + done, bytes);
     }
-    return {done, _mm256_movemask_epi8(_mm256_cmpeq_epi8(least, _mm256_setzero_si256())) != 0};
+    return {done, hasZero(least)};
 }
 
 /// Takes all of the text, if it is ASCII; else as much of its front as goes easily.
 /// \pre nothing has been taken; at least a block
-ZB_IN_CALLER void takeAsciiText(Progress& progress) {
-    if (progress.left() >= LEAST_WIDE_UNITS && ZB_CAN_WIDE) {
+ZB_INLINE void takeAsciiText(Progress& progress) {
+    if (progress.left() >= LEAST_WIDE_UNITS && ZB_HAS_AVX2) {
         auto const [units, hasZero] =
             takeWideAscii(progress.text, progress.out, std::min(progress.left(), progress.room()));
         progress.hasZero = hasZero;
@@ -148,29 +151,29 @@ ZB_IN_CALLER void takeAsciiText(Progress& progress) {
     std::uint64_t const left = progress.left();
     if (left == 0 || left >= 2 * BLOCK_UNITS || progress.room() < left) return;
     std::uint64_t const back = std::min(progress.done() + left, 2 * BLOCK_UNITS);
-    __m128i const low = loadBlock(progress.end - back);
-    __m128i const high = loadBlock(progress.end - BLOCK_UNITS);
+    __m128i const low = load16(progress.end - back);
+    __m128i const high = load16(progress.end - BLOCK_UNITS);
     if (!isAscii(_mm_or_si128(low, high))) return;
     char* const end = progress.out + left;
-    storeHalfBlock(end - back, packed(low));
-    storeHalfBlock(end - BLOCK_UNITS, packed(high));
-    progress.hasZero |= bitsOf(_mm_or_si128(zerosIn(low), zerosIn(high))) != 0;
+    store8(end - back, packed(low));
+    store8(end - BLOCK_UNITS, packed(high));
+    progress.hasZero |= bitsOf(_mm_or_si128(zeroUnits(low), zeroUnits(high))) != 0;
     progress.advance(left, left);
 }
 
 /// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
 template <class Shuffle>
-ZB_IN_CALLER void takeBlocks(Progress& progress) {
+ZB_INLINE void takeBlocks(Progress& progress) {
     while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
-        __m128i const block = loadBlock(progress.text);
-        progress.hasZero |= bitsOf(zerosIn(block)) != 0;
+        __m128i const block = load16(progress.text);
+        progress.hasZero |= bitsOf(zeroUnits(block)) != 0;
         unsigned const ascii = bitsOf(without(block, 0xFF80));
         unsigned const bytes = ascii != 0xFFFF ? Shuffle::storeMixed(block, progress.out) : 0;
         if (bytes != 0) {
             progress.advance(BLOCK_UNITS, bytes);
             continue;
         }
-        storeHalfBlock(progress.out, packed(block));
+        store8(progress.out, packed(block));
         unsigned const front = static_cast<unsigned>(std::countr_one(ascii)) / 2;
         if (front < BLOCK_UNITS) {
             progress.advance(front, front);
@@ -183,29 +186,29 @@ ZB_IN_CALLER void takeBlocks(Progress& progress) {
 
 /// The last units, fewer than a block, with zeros behind them.
 template <class Shuffle>
-ZB_IN_CALLER __m128i lastBlock(Progress const& progress) {
+ZB_INLINE __m128i lastBlock(Progress const& progress) {
     std::uint64_t const left = progress.left();
-    if (progress.done() + left >= BLOCK_UNITS) return Shuffle::lastOf(loadBlock(progress.end - BLOCK_UNITS), left);
+    if (progress.done() + left >= BLOCK_UNITS) return Shuffle::lastOf(load16(progress.end - BLOCK_UNITS), left);
     WChar window[BLOCK_UNITS] = {};
     std::memcpy(window, progress.text, left * sizeof(WChar));
-    return loadBlock(window);
+    return load16(window);
 }
 
 /// Takes the text's last units, if there are fewer than a block of them and none is above 0x7FF.
 template <class Shuffle>
-ZB_IN_CALLER void takeEnd(Progress& progress) {
+ZB_INLINE void takeEnd(Progress& progress) {
     std::uint64_t const left = progress.left();
     if (left >= BLOCK_UNITS || left == 0 || progress.room() < BLOCK_BYTES) return;
     __m128i const block = lastBlock<Shuffle>(progress);
     unsigned bytes = BLOCK_UNITS;
     if (isAscii(block)) {
-        storeHalfBlock(progress.out, packed(block));
+        store8(progress.out, packed(block));
     } else {
         bytes = Shuffle::storeMixed(block, progress.out);
         if (bytes == 0) return;
     }
     std::uint64_t const behind = BLOCK_UNITS - left;
-    progress.hasZero |= (bitsOf(zerosIn(block)) << sizeof(WChar) * behind & 0xFFFF) != 0;
+    progress.hasZero |= (bitsOf(zeroUnits(block)) << sizeof(WChar) * behind & 0xFFFF) != 0;
     progress.advance(left, bytes - behind);
 }
 
@@ -253,9 +256,9 @@ bool arePairs(__m128i block) {
 }
 
 template <class Shuffle>
-ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
+ZB_INLINE void takeThreeByteRun(Progress& progress) {
     while (progress.left() >= BLOCK_UNITS && progress.room() >= LONG_BLOCK_ROOM &&
-           Shuffle::storeLong(loadBlock(progress.text), progress.out)) {
+           Shuffle::storeLong(load16(progress.text), progress.out)) {
         progress.advance(BLOCK_UNITS, LONG_BLOCK_BYTES);
     }
     // The word that is stored is one byte longer than the character.
@@ -267,11 +270,11 @@ ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
     }
 }
 
-ZB_IN_CALLER void takePairs(Progress& progress) {
+ZB_INLINE void takePairs(Progress& progress) {
     while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
-        __m128i const block = loadBlock(progress.text);
+        __m128i const block = load16(progress.text);
         if (!arePairs(block)) break;
-        storeBlock(progress.out, fourBytes(block));
+        store16(progress.out, fourBytes(block));
         progress.advance(BLOCK_UNITS, BLOCK_BYTES);
     }
     while (progress.left() >= 4 && progress.room() >= 2 * LONGEST_CHARACTER) {
@@ -303,7 +306,7 @@ Encoded encode(WChar const* text, std::uint64_t size) {
 }
 
 /// \return whether the character fits
-ZB_IN_CALLER bool takeCharacter(Progress& progress) {
+ZB_INLINE bool takeCharacter(Progress& progress) {
     Encoded const character = encode(progress.text, progress.left());
     if (character.length > progress.room()) return false;
     progress.hasZero |= *progress.text == WChar();
@@ -319,8 +322,8 @@ Utf8Text result(Progress const& progress, char const* out) {
 
 /// Goes on to the end of the text, or of the room. \param front  how many units have been taken, all ASCII
 template <class Shuffle>
-ZB_IN_CALLER Utf8Text takeRest(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
-                               std::uint64_t front, bool hasZero) {
+ZB_INLINE Utf8Text takeRest(WChar const* text, std::uint64_t size, char* out, std::uint64_t room, std::uint64_t front,
+                            bool hasZero) {
     Progress progress{text, text + front, text + size, out + front, out + room, hasZero};
     while (progress.text != progress.end) {
         takeBlocks<Shuffle>(progress);
@@ -334,8 +337,8 @@ ZB_IN_CALLER Utf8Text takeRest(WChar const* text, std::uint64_t size, char* out,
 }
 
 // These take words that fit registers: a whole `Progress` would have to be stored and waited for.
-ZB_SHUFFLE_TARGET Utf8Text takeRestWithShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
-                                               std::uint64_t front, bool hasZero) {
+ZB_SSSE3 Utf8Text takeRestWithShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
+                                      std::uint64_t front, bool hasZero) {
     return takeRest<WithShuffle>(text, size, out, room, front, hasZero);
 }
 Utf8Text takeRestWithoutShuffle(WChar const* text, std::uint64_t size, char* out, std::uint64_t room,
@@ -343,7 +346,7 @@ Utf8Text takeRestWithoutShuffle(WChar const* text, std::uint64_t size, char* out
     return takeRest<WithoutShuffle>(text, size, out, room, front, hasZero);
 }
 
-ZB_IN_CALLER Utf8Text convert(WChar const* text, std::uint64_t size, char* out, std::uint64_t room, bool canShuffle) {
+ZB_INLINE Utf8Text convert(WChar const* text, std::uint64_t size, char* out, std::uint64_t room, bool canShuffle) {
     Progress progress{text, text, text + size, out, out + room};
     if (size >= BLOCK_UNITS) takeAsciiText(progress);
     if (progress.text == progress.end) return result(progress, out);
@@ -363,9 +366,9 @@ unsigned savedAt(WChar const* text, std::uint64_t at, std::uint64_t size) {
 
 /// The same for eight units, negated. \pre a ninth unit
 __m128i savedIn(WChar const* text) {
-    __m128i const block = loadBlock(text);
+    __m128i const block = load16(text);
     __m128i const high = _mm_cmpeq_epi16(_mm_and_si128(block, units(0xFC00)), units(0xD800));
-    __m128i const low = _mm_cmpeq_epi16(_mm_and_si128(loadBlock(text + 1), units(0xFC00)), units(0xDC00));
+    __m128i const low = _mm_cmpeq_epi16(_mm_and_si128(load16(text + 1), units(0xFC00)), units(0xDC00));
     __m128i const pair = _mm_and_si128(high, low);
     return _mm_add_epi16(_mm_add_epi16(without(block, 0xFF80), without(block, 0xF800)), _mm_add_epi16(pair, pair));
 }
@@ -393,7 +396,7 @@ Utf8Text toUtf8WithoutShuffle(WChar const* text, std::uint64_t size, char* out, 
 }
 
 Utf8Text toUtf8(WChar const* text, std::uint64_t size, char* out, std::uint64_t room) {
-    return convert(text, size, out, room, ZB_CAN_SHUFFLE);
+    return convert(text, size, out, room, ZB_HAS_SSSE3);
 }
 
 } // namespace ZOR_Basis::Utf

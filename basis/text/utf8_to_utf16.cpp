@@ -2,6 +2,8 @@
 #include "basis/text/utf_block.h"
 
 #include <algorithm>
+#include <bit>
+#include <cstring>
 
 namespace ZOR_Basis::Utf {
 namespace {
@@ -35,8 +37,8 @@ __m128i lowUnits(__m128i bytes) { return _mm_unpacklo_epi8(bytes, _mm_setzero_si
 __m128i highUnits(__m128i bytes) { return _mm_unpackhi_epi8(bytes, _mm_setzero_si128()); }
 
 void storeAscii(__m128i block, WChar* out) {
-    storeBlock(out, lowUnits(block));
-    storeBlock(out + BLOCK_UNITS, highUnits(block));
+    store16(out, lowUnits(block));
+    store16(out + BLOCK_UNITS, highUnits(block));
 }
 
 /// The unit of each two-byte character at the place of its lead byte, ASCII as it is.
@@ -54,7 +56,7 @@ struct Taken {
 
 /// Takes a block of ASCII and whole characters of two bytes, but not the first half of one at its end.
 /// \return nothing if the block has others or a fault
-ZB_SHUFFLE_TARGET inline Taken takeMixedBlock(__m128i block, WChar* out) {
+ZB_SSSE3 inline Taken takeMixedBlock(__m128i block, WChar* out) {
     // As signed bytes, continuations are -128 to -65 and leads of two bytes -62 to -33.
     unsigned const continuations = bitsOf(_mm_cmplt_epi8(block, _mm_set1_epi8(-64)));
     unsigned const leads =
@@ -73,7 +75,7 @@ ZB_SHUFFLE_TARGET inline Taken takeMixedBlock(__m128i block, WChar* out) {
 constexpr std::uint64_t LONG_CHARACTERS = 4;
 
 /// Takes the four characters of three bytes that a block begins with. \return false if it does not
-ZB_SHUFFLE_TARGET inline bool takeLongBlock(__m128i block, WChar* out) {
+ZB_SSSE3 inline bool takeLongBlock(__m128i block, WChar* out) {
     __m128i const marks = _mm_setr_epi8(-16, -64, -64, -16, -64, -64, -16, -64, -64, -16, -64, -64, 0, 0, 0, 0);
     __m128i const marked =
         _mm_setr_epi8(-32, -128, -128, -32, -128, -128, -32, -128, -128, -32, -128, -128, 0, 0, 0, 0);
@@ -89,24 +91,24 @@ ZB_SHUFFLE_TARGET inline bool takeLongBlock(__m128i block, WChar* out) {
     __m128i const wrong = _mm_or_si128(_mm_cmpeq_epi16(high, _mm_setzero_si128()),
                                        _mm_cmpeq_epi16(high, _mm_set1_epi16(static_cast<short>(0xD800))));
     if ((bitsOf(wrong) & 0xFF) != 0) return false;
-    storeHalfBlock(out, units);
+    store8(out, units);
     return true;
 }
 
 struct WithShuffle {
-    ZB_SHUFFLE_TARGET static Taken takeMixed(__m128i block, WChar* out) { return takeMixedBlock(block, out); }
-    ZB_SHUFFLE_TARGET static bool takeLong(__m128i block, WChar* out) { return takeLongBlock(block, out); }
+    ZB_SSSE3 static Taken takeMixed(__m128i block, WChar* out) { return takeMixedBlock(block, out); }
+    ZB_SSSE3 static bool takeLong(__m128i block, WChar* out) { return takeLongBlock(block, out); }
 };
 struct WithoutShuffle {
-    ZB_IN_CALLER static Taken takeMixed(__m128i, WChar*) { return {0, 0}; }
-    ZB_IN_CALLER static bool takeLong(__m128i, WChar*) { return false; }
+    ZB_INLINE static Taken takeMixed(__m128i, WChar*) { return {0, 0}; }
+    ZB_INLINE static bool takeLong(__m128i, WChar*) { return false; }
 };
 
 /// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
 template <class Shuffle>
-ZB_IN_CALLER void takeBlocks(Progress& progress) {
+ZB_INLINE void takeBlocks(Progress& progress) {
     while (progress.left() >= BLOCK_BYTES && progress.room() >= BLOCK_BYTES) {
-        __m128i const block = loadBlock(progress.text);
+        __m128i const block = load16(progress.text);
         unsigned const beyondAscii = bitsOf(block);
         if (beyondAscii == 0) {
             storeAscii(block, progress.out);
@@ -125,19 +127,19 @@ ZB_IN_CALLER void takeBlocks(Progress& progress) {
 }
 
 /// The last bytes, fewer than a block, with zeros behind them.
-ZB_IN_CALLER __m128i lastBlock(Progress const& progress) {
+ZB_INLINE __m128i lastBlock(Progress const& progress) {
     Byte window[2 * BLOCK_BYTES] = {};
     if (progress.done() < BLOCK_BYTES) {
         std::memcpy(window, progress.text, progress.left());
-        return loadBlock(window);
+        return load16(window);
     }
-    storeBlock(window, loadBlock(progress.end - BLOCK_BYTES));
-    return loadBlock(window + BLOCK_BYTES - progress.left());
+    store16(window, load16(progress.end - BLOCK_BYTES));
+    return load16(window + BLOCK_BYTES - progress.left());
 }
 
 /// Takes the text's last bytes, if there are fewer than a block of them and all are ASCII or characters of two bytes.
 template <class Shuffle>
-ZB_IN_CALLER void takeEnd(Progress& progress) {
+ZB_INLINE void takeEnd(Progress& progress) {
     std::uint64_t const left = progress.left();
     if (left >= BLOCK_BYTES || left == 0 || progress.room() < BLOCK_BYTES) return;
     __m128i const block = lastBlock(progress);
@@ -154,7 +156,7 @@ ZB_IN_CALLER void takeEnd(Progress& progress) {
 bool isThreeByteUnit(std::uint32_t unit) { return unit >= 0x800 && !isSurrogate(unit); }
 
 /// The next bytes, six of them at least, the first one lowest. \pre eight bytes in all
-ZB_IN_CALLER std::uint64_t wordAt(Progress const& progress) {
+ZB_INLINE std::uint64_t wordAt(Progress const& progress) {
     std::uint64_t const missing =
         sizeof(std::uint64_t) - std::min(progress.left(), std::uint64_t{sizeof(std::uint64_t)});
     return loadWord<std::uint64_t>(progress.text - missing) >> 8 * missing;
@@ -166,9 +168,9 @@ std::uint32_t threeByteUnit(std::uint64_t word) {
 }
 
 template <class Shuffle>
-ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
+ZB_INLINE void takeThreeByteRun(Progress& progress) {
     while (progress.left() >= BLOCK_BYTES && progress.room() >= LONG_CHARACTERS &&
-           Shuffle::takeLong(loadBlock(progress.text), progress.out)) {
+           Shuffle::takeLong(load16(progress.text), progress.out)) {
         progress.advance(3 * LONG_CHARACTERS, LONG_CHARACTERS);
     }
     while (progress.left() >= 6 && progress.done() + progress.left() >= sizeof(std::uint64_t) && progress.room() >= 2) {
@@ -185,7 +187,7 @@ ZB_IN_CALLER void takeThreeByteRun(Progress& progress) {
 WChar highSurrogate(std::uint32_t character) { return static_cast<WChar>(0xD7C0 + (character >> 10)); }
 WChar lowSurrogate(std::uint32_t character) { return static_cast<WChar>(0xDC00 + (character & 0x3FF)); }
 
-ZB_IN_CALLER void takeFourByteRun(Progress& progress) {
+ZB_INLINE void takeFourByteRun(Progress& progress) {
     while (progress.left() >= sizeof(std::uint32_t) && progress.room() >= 2) {
         auto const word = loadWord<std::uint32_t>(progress.text);
         std::uint32_t const character =
@@ -224,7 +226,7 @@ Decoded decode(Byte const* text, std::uint64_t size) {
 }
 
 /// \return 0; INVALID or NO_ROOM
-ZB_IN_CALLER std::uint64_t takeCharacter(Progress& progress) {
+ZB_INLINE std::uint64_t takeCharacter(Progress& progress) {
     auto const [character, bytes] = decode(progress.text, progress.left());
     if (bytes == 0) return INVALID;
     unsigned const units = character < 0x10000 ? 1 : 2;
@@ -240,7 +242,7 @@ ZB_IN_CALLER std::uint64_t takeCharacter(Progress& progress) {
 }
 
 template <class Shuffle>
-ZB_IN_CALLER std::uint64_t convert(Progress progress) {
+ZB_INLINE std::uint64_t convert(Progress progress) {
     WChar const* const out = progress.out;
     while (progress.text != progress.end) {
         takeBlocks<Shuffle>(progress);
@@ -259,8 +261,7 @@ Progress start(char const* text, std::uint64_t size, WChar* out, std::uint64_t r
     return {begin, begin, begin + size, out, out + room};
 }
 
-ZB_SHUFFLE_TARGET std::uint64_t toUtf16WithShuffle(char const* text, std::uint64_t size, WChar* out,
-                                                   std::uint64_t room) {
+ZB_SSSE3 std::uint64_t toUtf16WithShuffle(char const* text, std::uint64_t size, WChar* out, std::uint64_t room) {
     return convert<WithShuffle>(start(text, size, out, room));
 }
 
@@ -274,7 +275,7 @@ std::uint64_t utf16Length(char const* text, std::uint64_t size) {
     while (size - done >= BLOCK_BYTES) {
         __m128i sums = _mm_setzero_si128();
         for (std::uint64_t blocks = std::min((size - done) / BLOCK_BYTES, MOST_BLOCKS); blocks > 0; --blocks) {
-            __m128i const block = loadBlock(text + done);
+            __m128i const block = load16(text + done);
             __m128i const starts = _mm_cmpgt_epi8(block, _mm_set1_epi8(-65));
             __m128i const fourByteLeads = _mm_cmpeq_epi8(_mm_max_epu8(block, _mm_set1_epi8(-16)), block);
             sums = _mm_sub_epi8(_mm_sub_epi8(sums, starts), fourByteLeads);
@@ -294,7 +295,7 @@ std::uint64_t toUtf16WithoutShuffle(char const* text, std::uint64_t size, WChar*
 }
 
 std::uint64_t toUtf16(char const* text, std::uint64_t size, WChar* out, std::uint64_t room) {
-    return ZB_CAN_SHUFFLE ? toUtf16WithShuffle(text, size, out, room) : toUtf16WithoutShuffle(text, size, out, room);
+    return ZB_HAS_SSSE3 ? toUtf16WithShuffle(text, size, out, room) : toUtf16WithoutShuffle(text, size, out, room);
 }
 
 } // namespace ZOR_Basis::Utf

@@ -16,18 +16,17 @@ using WidePlaces = Places<std::uint64_t>;
 
 ZB_AVX512 ZB_INLINE WidePlaces placesOf(__m512i a, __m512i b) noexcept {
     std::uint64_t const different = _mm512_cmpneq_epi8_mask(a, b);
-    return {different, different | _mm512_testn_epi8_mask(a, a)};
+    return {different, different | zerosIn(a)};
 }
 
 /// Of 64 bytes.
 ZB_AVX512 ZB_INLINE WidePlaces widePlaces(char const* a, char const* b) noexcept {
-    return placesOf(_mm512_loadu_si512(a), _mm512_loadu_si512(b));
+    return placesOf(load64(a), load64(b));
 }
 
 /// Of 1 to 64 bytes, behind which both texts look as if they ended.
 ZB_AVX512 ZB_INLINE WidePlaces widePlaces(char const* a, char const* b, std::uint64_t length) noexcept {
-    __mmask64 const bytes = ~std::uint64_t{0} >> (64 - length);
-    return placesOf(_mm512_maskz_loadu_epi8(bytes, a), _mm512_maskz_loadu_epi8(bytes, b));
+    return placesOf(loadFirst(a, length), loadFirst(b, length));
 }
 
 /// What two texts are asked: whether they are the same, or for their order. `at` answers where they differ or end.

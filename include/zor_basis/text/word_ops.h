@@ -7,34 +7,11 @@
 #define ZOR_BASIS_TEXT_WORD_OPS_H
 
 #include "zor_basis/export.h"
+#include "zor_basis/ground/loads.h"
 #include "zor_basis/text/char_ops.h"
 
 #include <bit>
 #include <cstdint>
-#include <cstring>
-
-// A sanitizer that checks addresses has to see every single byte that is read.
-#if defined(__SANITIZE_ADDRESS__)
-#define ZB_HIDDEN_TEXT 0
-#elif defined(__has_feature)
-#if __has_feature(address_sanitizer)
-#define ZB_HIDDEN_TEXT 0
-#endif
-#endif
-#if !defined(ZB_HIDDEN_TEXT)
-#if defined(__GNUC__)
-#define ZB_HIDDEN_TEXT 1
-#else
-#define ZB_HIDDEN_TEXT 0
-#endif
-#endif
-
-#if defined(__SSE2__) || defined(_M_X64)
-#define ZB_VECTORS 1
-#include <emmintrin.h>
-#else
-#define ZB_VECTORS 0
-#endif
 
 namespace ZOR_Basis::detail {
 
@@ -43,18 +20,6 @@ namespace ZOR_Basis::detail {
 ZB_API_STRAIGHT void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT int compareOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
-
-template <class Word>
-inline Word loadWord(char const* text) noexcept {
-    Word word;
-    std::memcpy(&word, text, sizeof word);
-    return word;
-}
-
-/// The highest bit of the first zero byte and of some behind it; 0 where there is none.
-inline std::uint64_t zerosIn(std::uint64_t word) noexcept {
-    return (word - 0x0101010101010101U) & ~word & 0x8080808080808080U;
-}
 
 /// Bytes in the opposite order, so that words compare as the texts in them. Compilers make one instruction of it.
 inline std::uint64_t firstByteHighest(std::uint64_t word) noexcept {
@@ -88,55 +53,74 @@ inline std::uint64_t loadEnds(char const* text, std::uint64_t length) noexcept {
 
 inline constexpr bool WordsBeginLow = std::endian::native == std::endian::little;
 
-#if ZB_VECTORS
-inline __m128i loadVector(char const* text) noexcept { return _mm_loadu_si128(reinterpret_cast<__m128i const*>(text)); }
-inline void storeVector(char* target, __m128i bytes) noexcept {
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(target), bytes);
-}
-inline bool hasZero(__m128i bytes) noexcept {
-    return _mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())) != 0;
+// Steps of a copy. Each reads everything before it writes anything, so that source and target may overlap. It is false,
+// with nothing written, where a zero is among the bytes.
+
+ZB_INLINE bool copy4To7(char* target, char const* source, std::uint64_t length) noexcept {
+    auto const head = loadWord<std::uint32_t>(source);
+    auto const tail = loadWord<std::uint32_t>(source + length - 4);
+    if (hasZero(head | std::uint64_t{tail} << 32)) return false;
+    storeWord(target, head);
+    storeWord(target + length - 4, tail);
+    return true;
 }
 
-/// 17 to 64 bytes. \return false, with nothing written, where a zero is among them
-inline bool copyVectors(char* target, char const* source, std::uint64_t length) noexcept {
-    __m128i const head = loadVector(source);
-    __m128i const tail = loadVector(source + length - 16);
+#if ZB_VECTORS
+
+ZB_INLINE bool copy8To16(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const both = _mm_unpacklo_epi64(load8(source), load8(source + length - 8));
+    if (hasZero(both)) return false;
+    store8(target, both);
+    store8(target + length - 8, _mm_unpackhi_epi64(both, both));
+    return true;
+}
+
+ZB_INLINE bool copy17To64(char* target, char const* source, std::uint64_t length) noexcept {
+    __m128i const head = load16(source);
+    __m128i const tail = load16(source + length - 16);
     if (length <= 32) {
         if (hasZero(_mm_min_epu8(head, tail))) return false;
     } else {
-        __m128i const second = loadVector(source + 16);
-        __m128i const third = loadVector(source + length - 32);
+        __m128i const second = load16(source + 16);
+        __m128i const third = load16(source + length - 32);
         if (hasZero(_mm_min_epu8(_mm_min_epu8(head, second), _mm_min_epu8(third, tail)))) return false;
-        storeVector(target + 16, second);
-        storeVector(target + length - 32, third);
+        store16(target + 16, second);
+        store16(target + length - 32, third);
     }
-    storeVector(target, head);
-    storeVector(target + length - 16, tail);
+    store16(target, head);
+    store16(target + length - 16, tail);
     return true;
 }
+
 #else
-inline bool copyVectors(char*, char const*, std::uint64_t) noexcept { return false; }
+
+ZB_INLINE bool copy8To16(char* target, char const* source, std::uint64_t length) noexcept {
+    auto const head = loadWord<std::uint64_t>(source);
+    auto const tail = loadWord<std::uint64_t>(source + length - 8);
+    if ((zerosIn(head) | zerosIn(tail)) != 0) return false;
+    storeWord(target, head);
+    storeWord(target + length - 8, tail);
+    return true;
+}
+
+ZB_INLINE bool copy17To64(char*, char const*, std::uint64_t) noexcept { return false; }
+
 #endif
 
-/// Copies 4 to 64 bytes, all of which may be read. \return false, with nothing written, for other lengths and where a
-/// zero is among them
+/// Copies up to 64 bytes, all of which may be read; fewer than 4 by `copyUpTo3`. \return false, with nothing written, for
+/// more and where a zero is among them
+template <auto copyUpTo3>
+ZB_INLINE bool copyInSteps(char* target, char const* source, std::uint64_t length) noexcept {
+    if (length > 16) return length <= 64 && copy17To64(target, source, length);
+    if (length >= 8) return copy8To16(target, source, length);
+    return length >= 4 ? copy4To7(target, source, length) : copyUpTo3(target, source, length);
+}
+
+ZB_INLINE bool copyNothing(char*, char const*, std::uint64_t) noexcept { return false; }
+
+/// The same in users' code, where the compiler decides what is worth its room and fewer than 4 bytes are not.
 inline bool copyWords(char* target, char const* source, std::uint64_t length) noexcept {
-    if (length > 16) return length <= 64 && copyVectors(target, source, length);
-    if (length >= 8) {
-        auto const head = loadWord<std::uint64_t>(source);
-        auto const tail = loadWord<std::uint64_t>(source + length - 8);
-        if ((zerosIn(head) | zerosIn(tail)) != 0) return false;
-        std::memcpy(target, &head, sizeof head);
-        std::memcpy(target + length - 8, &tail, sizeof tail);
-        return true;
-    }
-    if (length < 4) return false;
-    auto const head = loadWord<std::uint32_t>(source);
-    auto const tail = loadWord<std::uint32_t>(source + length - 4);
-    if (zerosIn(head | std::uint64_t{tail} << 32) != 0) return false;
-    std::memcpy(target, &head, sizeof head);
-    std::memcpy(target + length - 4, &tail, sizeof tail);
-    return true;
+    return copyInSteps<copyNothing>(target, source, length);
 }
 
 inline void copyOwned(char* target, char const* source, std::uint64_t length) noexcept {
@@ -144,12 +128,13 @@ inline void copyOwned(char* target, char const* source, std::uint64_t length) no
 }
 
 /// The same for a text that may end before its length, with nothing readable behind: what lies in the page of its first
-/// byte can be read all the same. The compiler must not know which text it is, as it would take that for a mistake.
+/// byte can be read all the same, unless a sanitizer watches. The compiler must not know which text it is, as it would
+/// take that for a mistake.
 inline void copyGiven(char* target, char const* source, std::uint64_t length) noexcept {
-#if ZB_HIDDEN_TEXT
+#if ZB_CAN_HIDE && !ZB_ADDRESS_SANITIZER
     if (length <= 64 && (reinterpret_cast<std::uintptr_t>(source) & 4095U) <= 4096 - length) {
         char const* hidden = source;
-        __asm__("" : "+r"(hidden));
+        ZB_HIDE(hidden);
         if (copyWords(target, hidden, length)) return;
     }
 #endif
