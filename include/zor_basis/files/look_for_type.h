@@ -1,5 +1,5 @@
 /// \file
-/// `LookForType`: which entries a listing reports.
+/// `LookForType`: selects the entries that a listing or a walk reports.
 
 #ifndef ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
 #define ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
