@@ -7,10 +7,10 @@
 /// | | Windows | Linux |
 /// |---|---|---|
 /// | the command line | the program's own runtime splits it | is split by the same rules, without a shell |
-/// | no `application`: search order | own folder, current folder, system folders, `PATH` | `PATH`, unless there is a slash |
+/// | no `application`: search | own, current, system folders, `PATH` | `PATH`, unless the word has a slash |
 /// | inherited | environment, current folder; the console is a new one | the same, and descriptors 0 to 2 |
 /// | the exit code | the program's | the program's, or 128 + the number of the signal that ended it |
-/// | ended, not awaited | the identifier is soon unknown: `Wait` and `Terminate` fail | can be awaited once (see below) |
+/// | ended, not awaited | soon unknown: `Wait` and `Terminate` fail | can be awaited once (see below) |
 ///
 /// On Linux the library remembers thousands of children that were never awaited; beyond that it forgets the oldest.
 ///
