@@ -1,7 +1,7 @@
 /// \file
-/// Short narrow texts by words of 8 bytes, in the caller's code: copying and comparing strings that own their text. All
-/// bytes of an owned text may be read, whatever lies among them; what is longer goes into the library. Users have no need
-/// of it.
+/// Copies and compares short narrow texts in words of 8 bytes, inline in the caller's code, for strings that own their
+/// text. All bytes of an owned text may be read, including bytes behind a zero; longer texts are handled in the
+/// library. Not meant for users.
 
 #ifndef ZOR_BASIS_TEXT_WORD_OPS_H
 #define ZOR_BASIS_TEXT_WORD_OPS_H
@@ -13,7 +13,7 @@
 #include <cstdint>
 #include <cstring>
 
-// A sanitizer that checks addresses has to see every single byte that is read.
+// An address sanitizer must see every single byte that is read.
 #if defined(__SANITIZE_ADDRESS__)
 #define ZB_HIDDEN_TEXT 0
 #elif defined(__has_feature)
@@ -38,8 +38,8 @@
 
 namespace ZOR_Basis::detail {
 
-/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read. For the order
-/// that is the size of the shorter one, and the terminator behind it may be read too.
+/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read. For the
+/// order, `length` is the size of the shorter text, whose terminator may be read too.
 ZB_API_STRAIGHT void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT int compareOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
@@ -51,12 +51,12 @@ inline Word loadWord(char const* text) noexcept {
     return word;
 }
 
-/// The highest bit of the first zero byte and of some behind it; 0 where there is none.
+/// Sets the highest bit of the first zero byte and of some bytes behind it; 0 if there is no zero byte.
 inline std::uint64_t zerosIn(std::uint64_t word) noexcept {
     return (word - 0x0101010101010101U) & ~word & 0x8080808080808080U;
 }
 
-/// Bytes in the opposite order, so that words compare as the texts in them. Compilers make one instruction of it.
+/// Reverses the bytes, so that words compare like the texts in them. Compilers make one instruction of it.
 inline std::uint64_t firstByteHighest(std::uint64_t word) noexcept {
     word = (word & 0x00FF00FF00FF00FFU) << 8 | (word >> 8 & 0x00FF00FF00FF00FFU);
     word = (word & 0x0000FFFF0000FFFFU) << 16 | (word >> 16 & 0x0000FFFF0000FFFFU);
@@ -67,9 +67,11 @@ inline std::uint64_t firstByteHighest(std::uint64_t word) noexcept {
 struct WordPair {
     WordPair(std::uint64_t a, std::uint64_t b) noexcept : word(a), different(a ^ b), decided(different | zerosIn(a)) {}
 
-    /// Whether they end together, before any difference; where they are decided.
+    /// Tells whether both texts end together, before any difference.
+    /// \pre `decided` is not 0
     bool endTogether() const noexcept { return (decided & (0 - decided) & different) == 0; }
-    /// -1, 0 or 1; where they are decided.
+    /// Returns -1, 0 or 1.
+    /// \pre `decided` is not 0
     int order() const noexcept {
         std::uint64_t const a = firstByteHighest(word);
         std::uint64_t const b = firstByteHighest(word ^ different);
@@ -81,7 +83,7 @@ struct WordPair {
     std::uint64_t decided;
 };
 
-/// The first 4 and the last 4 of 4 to 8 bytes; bytes keep their order, though some may be there twice.
+/// Loads the first 4 and the last 4 of 4 to 8 bytes; the bytes keep their order, though some may occur twice.
 inline std::uint64_t loadEnds(char const* text, std::uint64_t length) noexcept {
     return loadWord<std::uint32_t>(text) | std::uint64_t{loadWord<std::uint32_t>(text + length - 4)} << 32;
 }
@@ -97,7 +99,8 @@ inline bool hasZero(__m128i bytes) noexcept {
     return _mm_movemask_epi8(_mm_cmpeq_epi8(bytes, _mm_setzero_si128())) != 0;
 }
 
-/// 17 to 64 bytes. \return false, with nothing written, where a zero is among them
+/// Copies 17 to 64 bytes.
+/// \return false, with nothing written, if one of them is a zero
 inline bool copyVectors(char* target, char const* source, std::uint64_t length) noexcept {
     __m128i const head = loadVector(source);
     __m128i const tail = loadVector(source + length - 16);
@@ -118,8 +121,8 @@ inline bool copyVectors(char* target, char const* source, std::uint64_t length) 
 inline bool copyVectors(char*, char const*, std::uint64_t) noexcept { return false; }
 #endif
 
-/// Copies 4 to 64 bytes, all of which may be read. \return false, with nothing written, for other lengths and where a
-/// zero is among them
+/// Copies 4 to 64 bytes, all of which may be read.
+/// \return false, with nothing written, for other lengths and if one of them is a zero
 inline bool copyWords(char* target, char const* source, std::uint64_t length) noexcept {
     if (length > 16) return length <= 64 && copyVectors(target, source, length);
     if (length >= 8) {
@@ -143,8 +146,8 @@ inline void copyOwned(char* target, char const* source, std::uint64_t length) no
     if (!copyWords(target, source, length)) copyOwnedText(target, source, length);
 }
 
-/// The same for a text that may end before its length, with nothing readable behind: what lies in the page of its first
-/// byte can be read all the same. The compiler must not know which text it is, as it would take that for a mistake.
+/// The same for a text that may end before its length, with unreadable memory behind it: the page of its first byte can
+/// always be read. The compiler must not know which text it is, because it would report an overrun.
 inline void copyGiven(char* target, char const* source, std::uint64_t length) noexcept {
 #if ZB_HIDDEN_TEXT
     if (length <= 64 && (reinterpret_cast<std::uintptr_t>(source) & 4095U) <= 4096 - length) {
@@ -156,8 +159,8 @@ inline void copyGiven(char* target, char const* source, std::uint64_t length) no
     copyText(target, source, length);
 }
 
-/// Of strings with room for N bytes inside. Where that is little, their texts are mostly short and compared here; longer
-/// ones go straight into the library.
+/// Compares texts of strings with N inline bytes. If N is small, texts are usually short and compared here; other texts
+/// go straight to the library.
 template <std::uint64_t N>
 inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexcept {
     if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
@@ -173,8 +176,8 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
     return sameOwnedTexts(a, b, length);
 }
 
-/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size, so that the terminator of the shorter
-/// one decides at the latest.
+/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size, so the terminator of the shorter one
+/// decides at the latest.
 template <std::uint64_t N>
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
     std::uint64_t const length = aSize < bSize ? aSize : bSize;

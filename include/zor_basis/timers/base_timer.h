@@ -6,7 +6,7 @@
 ///     render(page);
 ///     timer.stop(pile);
 ///
-/// The elapsed time is stop − start, including suspensions; the suspended time is counted separately. Misuse is ignored
+/// The elapsed time is stop - start, including suspensions; the suspended time is counted separately. Misuse is ignored
 /// silently; only a pile's own measurement reports it.
 ///
 /// \thread one thread at a time

@@ -1,5 +1,5 @@
 /// \file
-/// `zbTimerDat`: the record of one measurement. C-clean.
+/// `zbTimerDat`: the record of one measurement. Valid C.
 
 #ifndef ZOR_BASIS_TIMERS_TIMER_DAT_H
 #define ZOR_BASIS_TIMERS_TIMER_DAT_H
