@@ -1,6 +1,6 @@
 /// \file
-/// Children that run on by themselves. The system keeps what is left of one until somebody awaits it; Windows does not, so
-/// callers need not.
+/// Children that run independently. Linux keeps the exit status of a child until it is awaited; Windows does not, so
+/// callers need not await one.
 
 #ifndef BASIS_SYSTEM_UNAWAITED_POSIX_H
 #define BASIS_SYSTEM_UNAWAITED_POSIX_H
