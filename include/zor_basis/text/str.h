@@ -50,7 +50,7 @@ public:
     Str() noexcept : size_(0), text_(StrEmpty) {}
 
     /// Views a zero-terminated text and measures it.
-    /// \param text  null gives the empty text
+    /// \param text  is zero-terminated; null gives the empty text
     Str(char const* text) noexcept
         : size_(text != nullptr ? detail::textLength(text) : 0), text_(text != nullptr ? text : StrEmpty) {}
 

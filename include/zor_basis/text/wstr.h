@@ -33,7 +33,7 @@ public:
     /// Views the empty text.
     WStr() noexcept : size_(0), text_(StrEmpty) {}
     /// Views a zero-terminated text and measures it.
-    /// \param text  null gives the empty text
+    /// \param text  is zero-terminated; null gives the empty text
     WStr(WChar const* text) noexcept
         : size_(text != nullptr ? detail::textLength(text) : 0), text_(text != nullptr ? text : StrEmpty) {}
     /// Stores pointer and size as given; nothing is measured.
