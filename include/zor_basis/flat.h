@@ -53,8 +53,8 @@ ZB_EXTERN_C ZB_API int ZB_resolveURIEscapes(char const* in, char* out);
 /// \thread any; the calling thread waits
 ZB_EXTERN_C ZB_API bool ZB_runCommand(char const* command, char const* directory, bool noResult);
 
-/* The kinds of variable-data input: VPS, QDB, VIPP and PPML. The keys "vps", "qdb", "vipp" and "ppml" of the configuration
-   group "vdp" switch them on. All results are 1 or 0. All functions are thread-safe. */
+/* The kinds of variable-data input: VPS, QDB, VIPP and PPML. The keys "vps", "qdb", "vipp" and "ppml" of the
+   configuration group "vdp" switch them on. All results are 1 or 0. All functions are thread-safe. */
 
 /// Reads the configuration, again if it has been read before.
 /// \kept flat-05: if the group is missing every kind is on, but a key that is missing from an existing group switches

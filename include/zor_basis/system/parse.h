@@ -16,7 +16,7 @@
 ///     }
 ///
 /// \kept parse-01: a byte 0 is neither white space nor part of a line, so nothing behind it is ever read
-/// \thread  one thread at a time
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_SYSTEM_PARSE_H
 #define ZOR_BASIS_SYSTEM_PARSE_H

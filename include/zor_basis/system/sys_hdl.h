@@ -2,7 +2,7 @@
 /// `SysHdl`: a user who is logged on. `Sys::loginUser` creates it, the caller owns it, and deleting it logs the user
 /// off.
 ///
-/// \thread  one thread at a time
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_SYSTEM_SYS_HDL_H
 #define ZOR_BASIS_SYSTEM_SYS_HDL_H

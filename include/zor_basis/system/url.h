@@ -26,8 +26,9 @@ public:
     /// \param first  is passed to the platform layer, as is `second`; the stand-alone layer takes them as user name and
     ///     password, or null
     /// \param overwrite  allows the target to be replaced
-    /// \param makeDirectory  makes the directory of the target, with its parents, first; the directory stays even if the
-    ///     fetch fails. A bare name ("page.ps") contains no directory to make, so the call fails: write "./page.ps"
+    /// \param makeDirectory  makes the directory of the target, with its parents, first; the directory stays even
+    ///     if the fetch fails. A bare name ("page.ps") contains no directory to make, so the call fails: write
+    ///     "./page.ps"
     /// \return false, with nothing fetched, if the directory cannot be made or the target exists and may not be
     ///     replaced; otherwise whether the platform layer fetched the resource
     /// \error the stand-alone layer has distinct codes for an unknown host, a refused connection and the status of a

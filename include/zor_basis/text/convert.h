@@ -5,7 +5,7 @@
 /// both grow as needed, so no result is ever truncated.
 ///
 ///     WBStr wide;
-///    if (!Convert::Utf8ToWide("caf\xC3\xA9", wide)) report("not UTF-8");
+///     if (!Convert::Utf8ToWide("caf\xC3\xA9", wide)) report("not UTF-8");
 ///
 /// **Encodings.** On Windows the local encoding is the system's ANSI code page and the OEM encoding that of the
 /// console; 65001 is UTF-8. On Linux both are the character set of the environment's locale (`LC_ALL`, `LC_CTYPE`,
