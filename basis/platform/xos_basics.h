@@ -44,11 +44,11 @@ XOS_API xos_Sem xos_SemBCreate(int available);
 /// Opens the mutex that all processes of one user share under `id`, recursive for the thread that takes it. If the
 /// thread or process that holds it ends, however it ends, the mutex becomes free: the next taker takes it over.
 ///
-/// Stand-alone on Linux it is a locked file in `xos-UID`, a folder of that user alone (mode 0700) in /run/lock, else in
-/// /dev/shm, else in /tmp; on Windows a kernel mutex named after the user.
+/// Stand-alone on Linux it is a locked file in `xos-UID`, a folder of that user alone (mode 0700) in /run/lock, or else
+/// in /dev/shm or /tmp; on Windows a kernel mutex named after the user.
 /// \param flags  0 in every call of the library; ignored
-/// \param word  null or a word of the process, 0 before the first call: keeps the handle between calls, so that opening
-///     it again opens nothing
+/// \param word  stores the handle between calls, so that a repeated call opens nothing: a word of the process, 0 before
+///     the first call; may be null
 /// \return the same handle for the same `id`, as long as the process lives; 0 on failure
 XOS_API xos_Sem xos_SemNamedMutexCreate(int id, int flags, int reserved, uint32_t* word);
 
@@ -221,8 +221,8 @@ XOS_API char const* xos_FileSystemRoot(void);
 /// A line of the form `cd DIRECTORY& COMMAND` runs the command in that directory, and not at all if the directory
 /// cannot be entered. The first "& " ends the directory, which is used unchanged: both kinds of slash, double quotes
 /// around it and any drive are allowed. An empty directory, between `cd ` and `& `, keeps the current one.
-/// \param result  null: returns as soon as the interpreter has started; else waits and stores the exit code (128 + the
-///                signal of a command that one ended; -1 where the process ignores its children's ends)
+/// \param result  receives the exit code, for which the call waits (128 + the signal that ended the command; -1 if the
+///     process ignores SIGCHLD); null: the call returns as soon as the interpreter has started
 /// \return 0 once the interpreter has started, regardless of the command's result
 XOS_API int xos_ShellExecuteEx(char const* commandLine, int64_t* result);
 

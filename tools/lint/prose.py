@@ -14,7 +14,7 @@ PHRASES = {
     r"\b[Aa]t once\b": "immediately; concurrently; in one step",
     r"(?<!\bin )\b(?:the|that) way\b": "so that; through; how",
     r"\bby way of\b": "through, by",
-    r"\b(?:nobody's|(?:by|that) nobody|nobody (?:waits|awaits|else))\b": "never …, no other …, without an owner",
+    r"\b(?:[Nn]obody's|(?:by|that) nobody|nobody (?:waits|awaits|else))\b": "never …, no other …, without an owner",
     r"\bwants? (?:its?|the|an?)\b": "requires, must be followed by, expects",
     r"\bnothing ever\b": "never … anything",
     r"\bfor ever\b": "forever",
@@ -77,14 +77,15 @@ def paragraphs(path, content):
             numbers += [number] * (len(text) + 1)
 
 
-def without_code(words):
-    return CODE.sub(lambda code: "`" + "_" * (len(code[0]) - 2) + "`", words)
+def without_code(path, words):
+    """Code and quoted texts are not prose, but in scripts the quoted texts are the messages."""
+    return words if path.name == "dev" else CODE.sub(lambda code: "`" + "_" * (len(code[0]) - 2) + "`", words)
 
 
 def problems_in(path):
     public = str(path).startswith(("include/", "host/include/"))
     for words, numbers in paragraphs(path, common.text(path)):
-        for match in PATTERN.finditer(without_code(words)):
+        for match in PATTERN.finditer(without_code(path, words)):
             instead = INSTEAD[int(match.lastgroup[1:])]
             yield f'{path}:{numbers[match.start()]}: "{match[0].strip()}" (write: {instead})'
         if public and (parameter := PARAMETER.match(words)):

@@ -44,9 +44,9 @@ class IFile;
 /// The result of the last reading of a dictionary's file.
 enum DictFile : int {
     DICT_NOT_READ, ///< nothing was read, or the file could not be opened
-    DICT_PART, ///< there is more behind the last complete record: the file was cut, or damaged, or is no dictionary, or
-               ///< could not be read to its end
-    DICT_WHOLE, ///< every byte belongs to a complete record; so do those of an empty file
+    DICT_PART,  ///< bytes follow the last complete record: the file was cut or damaged, is not a dictionary, or could
+                ///< not be read to its end
+    DICT_WHOLE, ///< every byte belongs to a complete record; an empty file counts as whole
 };
 
 template <class K, class V>

@@ -67,7 +67,8 @@ public:
     /// Finds the deepest existing entry above the last component of a path. It looks at the whole path without its
     /// trailing slashes, while that exists, and then at what stands before each earlier slash.
     /// \param existing  receives that entry, without a trailing slash
-    /// \param rest  receives what follows it in the path; existing components that end in a slash are taken for such
+    /// \param rest  receives what follows it in the path, which may also exist; trailing slashes belong to it only if
+    ///     it does not exist
     /// \kept dir-04: a slash at index 0 or 1 is never examined, so the result is false for a path of fewer than three
     ///     characters, and for one that exists no deeper than such a slash
     /// \pre neither output is the path itself

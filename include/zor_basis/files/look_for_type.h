@@ -13,7 +13,7 @@ enum LookForType : std::uint32_t {
     LOOK_FILES = 1,
     LOOK_DIRS = 2,
     LOOK_BOTH = 3,    ///< the same as `LOOK_ALL`
-    LOOK_ANYCASE = 4, ///< may be added: the wildcard matches whatever the case of the letters, where a listing heeds it
+    LOOK_ANYCASE = 4, ///< may be added: the wildcard ignores case, in listings that support this
 };
 
 constexpr LookForType operator|(LookForType a, LookForType b) {
