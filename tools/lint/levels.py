@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Includes run from the higher level to the lower, without a circle between components (levels.txt)."""
+"""Headers include only headers of the same or a lower level (levels.txt), and components form no circle."""
 
 import re
 from pathlib import PurePosixPath

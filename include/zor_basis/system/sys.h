@@ -65,8 +65,8 @@ public:
 
     /// Gets a user's name.
     /// \param loggedOn  asks for the user of the session: on Windows the value "Logon User Name" of the key
-    ///     HKEY_CURRENT_USER\Software\Microsoft\Windows\CurrentVersion\Explorer, which may be empty; on Linux the
-    ///     process's real user. False asks for the user as whom the calling thread acts
+    ///     HKEY_CURRENT_USER\Software\Microsoft\Windows\CurrentVersion\Explorer, where an empty value counts as
+    ///     success; on Linux the process's real user. False asks for the user as whom the calling thread acts
     static bool CurrentUser(BufStr<15>& user, bool loggedOn);
 
     /// Gets a DNS domain.

@@ -33,8 +33,8 @@
 
 namespace ZOR_Basis {
 
-/// \kept text-04: assigning a text of N bytes or more allocates a heap block: 15 bytes in a `BufStr<15>` give a
-///     capacity of 16
+/// \kept text-04: an assigned text of N bytes or more lies on the heap: 15 bytes in a `BufStr<15>` give a capacity of
+///     16
 /// \kept text-05: appending keeps a text inside the object up to exactly N bytes
 /// \kept text-06: a source with a given length is copied up to its terminator and padded with zeros, and the size
 ///     becomes the given length
