@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-"""Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment marks
-its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`). Writes
+"""Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment
+marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`). Writes
 docs/kept.md."""
 
 import re
@@ -34,7 +34,8 @@ def main():
     tests = gather(TEST, common.files("tests/**.cpp", "tests/**.h"), lambda match: match[1].replace("_", "-"))
     problems = []
     for identity in sorted(told.keys() | spots.keys() | tests.keys()):
-        for name, where in (("a \\kept line in a public header", told), ("a mark in the code", spots), ("a test", tests)):
+        lists = {"a \\kept line in a public header": told, "a mark in the code": spots, "a test": tests}
+        for name, where in lists.items():
             if identity not in where:
                 problems.append(f"{identity} lacks {name}")
     lines, room = [], None

@@ -13,6 +13,12 @@
 /// | acting as a user | impersonation | user, group and supplementary groups of the calling thread |
 /// | disks and shares | volumes, drive mappings | the mount table |
 ///
+///     std::unique_ptr<SysHdl> user(Sys::loginUser("user@domain", password, true));
+///     if (user && Sys::impersonate(user.get())) {
+///         read(path);
+///         Sys::revertToSelf();
+///     }
+///
 /// A registry value that is longer than 512 bytes, or whose type is not text, counts as missing unless a function says
 /// otherwise.
 ///

@@ -1,6 +1,9 @@
 /// \file
 /// `FileCopyVisitor`: copies the entries that a walk reports into one directory.
 ///
+///     FileCopyVisitor copier("backup", true, true);
+///     FileIterator("jobs", LOOK_BOTH, nullptr, nullptr).doIt(&copier, false, true);
+///
 /// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_COPY_VISITOR_H

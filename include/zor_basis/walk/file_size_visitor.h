@@ -1,6 +1,8 @@
 /// \file
 /// `FileSizeVisitor`: adds up the sizes of the entries that a walk reports.
 ///
+///     std::int64_t const bytes = FileSizeVisitor::Get(folder, true); // of a whole tree
+///
 /// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_SIZE_VISITOR_H
