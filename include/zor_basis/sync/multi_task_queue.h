@@ -21,9 +21,10 @@
 ///     if (queue->failed()) ...
 ///
 /// A job is started when a task is created for it, and finishes when its function returns. `add` starts it unless as
-/// many jobs run as the limit says; a forced job (`startNow`) is always started. Otherwise it waits. `wait` starts all
-/// waiting jobs as soon as one job finishes. If no job runs, `wait` returns immediately, and a job that is waiting then
-/// is never started. The first failure marks the queue permanently; the policy decides what follows from it.
+/// many jobs run as the limit says; a forced job (`startNow`) starts regardless of the limit. Otherwise it waits.
+/// `wait` starts all waiting jobs as soon as one job finishes. If no job runs, `wait` returns immediately, and a job
+/// that is waiting then is never started. The first failure marks the queue permanently; the policy decides what
+/// follows from it.
 ///
 /// At the end of a job its own task does the book-keeping, under the queue's mutex: it counts the job as finished and,
 /// if requested, removes the record and deletes an owned argument. The destructor of such an argument therefore runs on
