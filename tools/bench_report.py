@@ -1,10 +1,10 @@
 #!/usr/bin/env python3
-"""bench_report.py FOLDER [FAMILY...]: runs the benchmark programs and sets each row beside its peers and its goal.
+"""bench_report.py FOLDER [FAMILY...]: runs the benchmark programs and compares each row with its peers and its goal.
 
-Benchmarks are named `row/who`, who being `ours` or a peer. Goals stand in bench/FAMILY/goals.txt, one a line:
+Benchmarks are named `row/who`, where who is `ours` or a peer. bench/FAMILY/goals.txt contains the goals, one per line:
 
-    ROW-GLOB <= RATIO x PEER          the time of ours is at most RATIO times that of the peer
-    ROW-GLOB <= RATIO x min(A,B)      … of the fastest of several
+    ROW-GLOB <= RATIO x PEER          our time is at most RATIO times the peer's
+    ROW-GLOB <= RATIO x min(A,B)      … the time of the fastest of several
 
 Repetitions of all rows are interleaved; the median counts. Ties by noise: 10 %, rows under 5 ns 30 %, rows that name
 two or more threads 50 %.

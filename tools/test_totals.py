@@ -1,8 +1,8 @@
 #!/usr/bin/env python3
 """Counts the cases in the verbose output of ctest: `passed failed skipped`.
 
-A GoogleTest program counts by its cases, any other test as one. With --failures the output of the tests that failed
-is printed instead.
+For a GoogleTest program it counts the cases; any other test counts as one. With --failures it prints the output of the
+tests that failed instead.
 """
 
 import re

@@ -1,5 +1,5 @@
 /// \file
-/// A doubly linked list of nodes that carry their own links and belong to somebody else.
+/// A doubly linked list of nodes that carry their own links and that the list does not own.
 
 #ifndef BASIS_CONTAINERS_LINKED_LIST_H
 #define BASIS_CONTAINERS_LINKED_LIST_H

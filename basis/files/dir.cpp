@@ -124,7 +124,8 @@ bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
     std::uint32_t const flags = flagIf(overwrite, OVERWRITE) | flagIf(flagB, SECOND_FLAG);
     if (xos_DirMove(orEmpty(dst), orEmpty(src), flags) == 0) return true;
     bool const copied = xos_DirCopy(orEmpty(dst), orEmpty(src), flags | RECURSIVE) == 0;
-    // kept dir-03: who moves wants the source gone, and jobs are sent again rather than found twice.
+    // kept dir-03: a caller that moves expects the source to be gone; it is better to send a job again than to find it
+    // twice.
     KeepLastError const whyNotCopied;
     Rem(src, true, flagB);
     return copied;

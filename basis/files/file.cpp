@@ -95,7 +95,8 @@ bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs)
     if (xos_FileMove(orEmpty(dst), orEmpty(src), overwrite ? 1 : 0) == 0) return true;
     bool const hasPlace = !makeDirs || Dir::NewFor(dst);
     bool const copied = hasPlace && copy(dst, src, overwrite);
-    // kept file-04: who moves wants the source gone, and jobs are sent again rather than found twice.
+    // kept file-04: a caller that moves expects the source to be gone; it is better to send a job again than to find it
+    // twice.
     KeepLastError const whyNotCopied;
     remove(src);
     return copied;

@@ -10,7 +10,7 @@ namespace {
 
 constexpr DWORD FORM = FILE_NAME_NORMALIZED | VOLUME_NAME_DOS;
 
-/// Takes away what marks a path for the system alone.
+/// Removes the prefix that marks a path for the system alone.
 void takePlain(char const* path, FPath& plain) {
     static constexpr char SHARE[] = "\\\\?\\UNC\\";
     static constexpr char MARK[] = "\\\\?\\";

@@ -1,5 +1,5 @@
 /// \file
-/// Transfers of any length through calls of the runtime that take only so much at once.
+/// Transfers of any length through calls of the runtime that limit the length of one transfer.
 
 #ifndef BASIS_FILES_PIECES_H
 #define BASIS_FILES_PIECES_H
@@ -9,7 +9,7 @@
 namespace ZOR_Basis {
 
 inline constexpr std::uint64_t TRANSFER_FAILED = ~std::uint64_t{0};
-/// What the runtime transfers at once on every system.
+/// The runtime transfers this many bytes in one call on every system.
 inline constexpr std::uint64_t LARGEST_PIECE = 0x40000000;
 
 /// Calls `transfer(place, bytes)` until all is done or a call does less than it was asked for. It gives the bytes done,

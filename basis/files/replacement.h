@@ -13,8 +13,9 @@ namespace ZOR_Basis {
 
 /// Whatever fails, and at whatever moment the process ends, the path leads to the old content or to the whole new one.
 ///
-/// The temporary file lies in the folder of the one that is replaced, as only a rename within one file system is one step.
-/// It is made by the system, exclusively, which the platform layer has no function for; all else is the platform layer's.
+/// The temporary file lies in the folder of the one that is replaced, as only a rename within one file system is one
+/// step. It is made by the system, exclusively, which the platform layer has no function for; all else is the platform
+/// layer's.
 ///
 /// \error every failure leaves its reason as the thread's last error
 class Replacement {
@@ -25,14 +26,14 @@ public:
     /// Removes what was written, unless it is in place. The last error stays.
     ~Replacement();
 
-    /// Makes and opens the temporary file. It gets the owner and the permissions of the file that is replaced, as far as
-    /// the system allows. A link stays, and what it leads to is replaced.
+    /// Makes and opens the temporary file. It gets the owner and the permissions of the file that is replaced, as far
+    /// as the system allows. A link stays, and what it leads to is replaced.
     /// \param mode  as for `File::open`
     /// \error also where the file that is there may not be written, or is no file
     bool open(char const* path, int mode);
     /// What takes the content. \pre it is open
     IFile& content() { return *file_; }
-    /// Has the content on the disk, and then renames the temporary file.
+    /// Flushes the content to the disk and then renames the temporary file.
     bool putInPlace();
 
 private:

@@ -15,7 +15,7 @@ namespace {
 
 using Path = PathText<WidePathKind>;
 
-/// The size of `WcPath::pathRoot`. It is written last: whoever reads another size than 0 may read the text.
+/// The size of `WcPath::pathRoot`. It is written last: a thread that reads a size other than 0 may read the text.
 struct RootSize : WcPath {
     static std::atomic_ref<std::uint64_t> of(WcPath& root) { return std::atomic_ref(root.*&RootSize::size_); }
 };

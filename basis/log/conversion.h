@@ -1,5 +1,5 @@
 /// \file
-/// One conversion of a format, "%-8.3f", taken apart.
+/// One parsed conversion of a format, such as "%-8.3f".
 
 #ifndef BASIS_LOG_CONVERSION_H
 #define BASIS_LOG_CONVERSION_H
@@ -10,7 +10,7 @@ namespace ZOR_Basis {
 
 struct Conversion {
     enum Length : unsigned char { NONE, CHAR, SHORT, LONG, LONG_LONG, SIZE, MAXIMUM, DIFFERENCE };
-    /// A width or precision of more digits is nobody's.
+    /// No format has a width or precision with more digits.
     static constexpr int LARGEST_NUMBER = 9999;
 
     bool isLeft = false;

@@ -16,8 +16,8 @@ struct FixedDecimal {
 
 inline constexpr int MOST_DECIMALS = 19;
 
-/// Takes the absolute value apart, rounded to the nearest, in the middle between two to the one with an even last digit,
-/// as the exact value of the number has it.
+/// Splits the absolute value into digits. The exact value is rounded to the nearest decimal, a tie to the one with an
+/// even last digit.
 /// \param decimals  0 to `MOST_DECIMALS`
 /// \return false, with `out` as it was, from 2^63 on and for what is no number
 bool takeApart(double number, int decimals, FixedDecimal& out);

@@ -21,8 +21,8 @@ constexpr int USUAL_DECIMALS = 6;
 constexpr int MOST_DIGITS = 22;
 constexpr std::size_t LONGEST_NUMBER = MOST_DIGITS + 1 + MOST_DECIMALS;
 
-/// Writes a line by the short way. Each step is false where the way ends: at a conversion that is not its business, or
-/// where the room does.
+/// Writes a line without `vsnprintf`. Each step returns false if it cannot continue: at a conversion that it does not
+/// handle, or at the end of the room.
 class QuickLine {
 public:
     QuickLine(char* line, std::size_t room, LineArguments& arguments)

@@ -156,7 +156,8 @@ bool LoggerImpl::writeWhatIsDue() {
         awaitWriter();
         // What cannot be written is lost.
         writeOut(*buffer);
-        // Lines may have come meanwhile, this may have become or ceased to be the current buffer, and be written by `flush`.
+        // Lines may have come meanwhile, this may have become or ceased to be the current buffer, and be written by
+        // `flush`.
         if (buffer == current_ || buffer->flushed < buffer->used || buffer == claim_.buffer) continue;
         Buffer* const written = buffer;
         buffer = buffer->next;
@@ -214,7 +215,7 @@ bool LoggerImpl::mustWait(Buffer const* buffer) const {
 }
 
 /// Releases the lock while it writes.
-/// \pre nobody else writes
+/// \pre no other thread writes
 // kept log-02: also where there is nothing to write.
 bool LoggerImpl::writeOut(Buffer& buffer) {
     char const* const text = buffer.data + buffer.flushed;

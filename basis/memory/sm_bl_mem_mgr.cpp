@@ -56,7 +56,7 @@ void* SmBlMemMgr::alloc() {
 void SmBlMemMgr::free(void* p, std::uint64_t) { SmBlMemMgr::free(p); }
 
 void SmBlMemMgr::free(void* p) {
-    // Many elements freed in a row are as many lines of memory to fetch, which all can be under way at once.
+    // Freeing many elements in a row fetches as many cache lines, and the fetches can overlap.
     _mm_prefetch(static_cast<char const*>(p), _MM_HINT_T0);
     if (p == top_) [[likely]] {
         // The same as from `top_`, which was written a moment ago and would have to be waited for.

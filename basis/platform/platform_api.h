@@ -1,5 +1,5 @@
 /// \file
-/// Linkage of the platform layer's functions. C-clean. A module defines `XOS_BUILDING` while it is built itself.
+/// Linkage of the platform layer's functions. Valid C. A module defines `XOS_BUILDING` when it is itself being built.
 
 #ifndef BASIS_PLATFORM_PLATFORM_API_H
 #define BASIS_PLATFORM_PLATFORM_API_H

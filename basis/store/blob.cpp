@@ -78,7 +78,7 @@ void Blob::add(std::uint64_t n, void const* bytes) {
 }
 
 void Blob::alloc(std::uint64_t n, bool keep) {
-    // kept blob-01: callers that want it empty clear it.
+    // kept blob-01: a caller that needs an empty blob clears it.
     if (capacity_ >= n) return;
     char* const block = makeBlock(n, keep ? size_ : 0);
     if (block == nullptr) return;

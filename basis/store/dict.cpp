@@ -125,7 +125,10 @@ bool Dict<K, V>::read() {
     found_ = DICT_NOT_READ;
     understood_ = 0;
     File file;
-    if (!file.open(path_, LOAD, WITHOUT_CREATE_FLAG)) return false;
+    if (!file.open(path_, LOAD, WITHOUT_CREATE_FLAG)) {
+        if (path_.some() && systemCalls.lastError() == FILE_NOT_FOUND) found_ = DICT_MISSING;
+        return false;
+    }
     RecordReader records(*file.ptr());
     load(records, *this);
     found_ = isWhole(records, path_) ? DICT_WHOLE : DICT_PART;

@@ -6,7 +6,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// What is read and written at once.
+/// The number of bytes in one read or write.
 constexpr std::uint64_t PIECE = 64 * 1024;
 constexpr std::uint64_t LENGTH_SIZE = 4;
 

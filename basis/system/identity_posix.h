@@ -19,10 +19,10 @@ public:
     bool readOwn();
     bool read(Account const& account);
 
-    /// Has the calling thread, whose identity is `own`, act so. Only a privileged thread can.
-    /// \return false where the system refuses; the thread acts as before then
+    /// Makes the calling thread, whose identity is `own`, take this identity. Requires privileges.
+    /// \return false if the system refuses; the thread's identity is then unchanged
     bool take(Identity const& own) const;
-    /// Has the calling thread act so again, as it once did.
+    /// Restores this identity, which the calling thread had before.
     bool takeBack() const;
 
 private:

@@ -35,7 +35,8 @@ void load() {
         readKeys(group);
         cfg_GroupDelete(group, 0);
     } else {
-        // kept flat-05: an installation that nobody has configured takes whatever comes; a configured one what it names.
+        // kept flat-05: an installation without a configuration accepts every kind; a configured one those that it
+        // names.
         on |= ALL;
     }
     loaded = true;

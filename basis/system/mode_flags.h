@@ -1,5 +1,5 @@
 /// \file
-/// Which kinds of variable-data input are switched on, as the configuration group "vdp" has it.
+/// Tells which kinds of variable-data input the configuration group "vdp" switches on.
 
 #ifndef BASIS_SYSTEM_MODE_FLAGS_H
 #define BASIS_SYSTEM_MODE_FLAGS_H

@@ -43,7 +43,7 @@ bool takeEnd(idtype_t kind, int process, int flags, siginfo_t& end) {
     return true;
 }
 
-/// Also true for one that somebody else has taken.
+/// Also true if another caller has already collected it.
 bool giveUp(pid_t child) {
     siginfo_t end{};
     return !takeEnd(P_PID, child, WNOHANG, end) || end.si_pid != 0;

@@ -17,7 +17,7 @@ struct QueryCalls {
     uid_t (*realUser)();
     uid_t (*effectiveUser)();
     gid_t (*effectiveGroup)();
-    /// The password and group databases, as the C library has them.
+    /// The C library's functions for the password and group databases.
     int (*userById)(uid_t, passwd*, char*, std::size_t, passwd**);
     int (*userByName)(char const*, passwd*, char*, std::size_t, passwd**);
     int (*groupsOf)(char const*, gid_t, gid_t*, int*);

@@ -1,6 +1,6 @@
 /// \file
-/// Children that run on by themselves. The system keeps what is left of one until somebody awaits it; Windows does not, so
-/// callers need not.
+/// Children that run independently. Linux keeps the exit status of a child until it is awaited; Windows does not, so
+/// callers need not await one.
 
 #ifndef BASIS_SYSTEM_UNAWAITED_POSIX_H
 #define BASIS_SYSTEM_UNAWAITED_POSIX_H
@@ -16,7 +16,7 @@ namespace ZOR_Basis {
 
 /// Keeps their number bounded: when there is no more room, those of the older half that have ended are given up.
 /// \tparam GIVE_UP  `bool (*)(pid_t)`: takes what is left of a child, if it has ended; false while it still runs
-/// \thread  thread-safe
+/// \thread thread-safe
 template <std::size_t MOST, auto GIVE_UP>
 class Unawaited {
 public:

@@ -36,7 +36,7 @@ bool fromWide(WChar const* text, Convert::Encoding to, BufStr<255>& out, std::ui
     return convert(text, len, out, [&](std::uint64_t size) { return ConvertImpl::wideToNarrow(text, size, to, out); });
 }
 
-/// Narrow to narrow by way of wide text. Leaves `out` empty if either step fails.
+/// Converts narrow text to narrow text through wide text. Leaves `out` empty if either step fails.
 bool reencode(Convert::Encoding from, char const* text, Convert::Encoding to, BufStr<255>& out, std::uint64_t len) {
     WBStr wide;
     out.clear();

@@ -212,7 +212,7 @@ ZB_INLINE void takeEnd(Progress& progress) {
     progress.advance(left, bytes - behind);
 }
 
-// ---- runs of longer characters, as real text has them -----------------------------------------------------------------
+// ---- runs of longer characters, as in real text ----------------------------------------------------------------------
 
 /// The three bytes of a unit above 0x7FF, the first one lowest.
 std::uint32_t threeBytes(std::uint32_t unit) {

@@ -151,7 +151,7 @@ ZB_INLINE void takeEnd(Progress& progress) {
     }
 }
 
-// ---- runs of longer characters, as real text has them: several at once ------------------------------------------------
+// ---- runs of longer characters, as in real text: several in one step ----------------------------------------------------
 
 bool isThreeByteUnit(std::uint32_t unit) { return unit >= 0x800 && !isSurrogate(unit); }
 

@@ -8,7 +8,7 @@ constinit WChar const* const WStr::StrEmpty = ZB_W("");
 
 namespace {
 
-/// A unit whose other case needs more than one unit stays as it is.
+/// A unit whose other case needs more than one unit does not change.
 template <class Function>
 void changeUnits(WChar* text, Function change) noexcept {
     for (; *text != WChar(); ++text) {

@@ -4,7 +4,7 @@ namespace ZOR_Basis {
 
 bool FileIterVisitor::perform(FileEntry* entry) {
     if (!entry->isDir()) return true;
-    // kept walk-07: setting the path back would cost every directory a copy that nobody reads.
+    // kept walk-07: restoring the path would cost an unused copy for every directory.
     it_->setPath(entry->getFullPath());
     return it_->doIt(inner_, deep_, stopOnFalse_);
 }

@@ -31,7 +31,7 @@ bool FileSizeVisitor::perform(FileEntry* entry) {
 std::int64_t FileSizeVisitor::Get(Str const& path, bool recursive) {
     FPath const whole(path);
     FStat const entry(whole);
-    // Listing a link would follow it out of the tree, or around in it for ever.
+    // Listing a link would follow it out of the tree, or around in it forever.
     if (!entry.exist() || entry.type() == FStat::ST_LINK) return 0;
     if (entry.isFile()) return static_cast<std::int64_t>(entry.size());
     DirectorySum sum;

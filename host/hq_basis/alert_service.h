@@ -1,8 +1,8 @@
 /// \file
 /// The alerts of the process: one thread that knows when they are due, and workers that run them.
 ///
-/// Every due alert gets a worker of its own: an idle one, else a new one. So a callback that never returns costs a thread
-/// and holds up nobody. An alert is never run twice at the same time.
+/// Every due alert gets a worker of its own: an idle one, else a new one. So a callback that never returns costs a
+/// thread and holds up nobody. An alert is never run twice at the same time.
 
 #ifndef HOST_HQ_BASIS_ALERT_SERVICE_H
 #define HOST_HQ_BASIS_ALERT_SERVICE_H
@@ -45,7 +45,7 @@ private:
         HQ_Basis::AlertTimer::Alert shown;
         HQ_Basis::AlertTimer::Callback callback;
         Clock::time_point due;
-        /// Whose thread runs the callback now; none: nobody's.
+        /// The thread that runs the callback now; a default id: none does.
         std::thread::id runner;
         bool isQueued{false};
         bool isRemoved{false};

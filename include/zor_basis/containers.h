@@ -1,6 +1,6 @@
 /// \file
-/// Lists, pointer arrays, the dictionary and its file, hashed texts, and the integer helpers that size their tables; and
-/// the texts and bytes that they hold.
+/// Lists, pointer arrays, the dictionary and its file, hashed texts, and integer functions for table sizes. Includes
+/// the types of the texts and bytes that they contain.
 
 #ifndef ZOR_BASIS_CONTAINERS_H
 #define ZOR_BASIS_CONTAINERS_H

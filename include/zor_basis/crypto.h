@@ -1,5 +1,5 @@
 /// \file
-/// Cryptography: hashes, keys that are derived from them, and blobs that are encrypted with these.
+/// Cryptography: hashes, keys derived from them, and blobs encrypted with the keys.
 
 #ifndef ZOR_BASIS_CRYPTO_H
 #define ZOR_BASIS_CRYPTO_H

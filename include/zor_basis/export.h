@@ -1,9 +1,9 @@
 /// \file
-/// What the library exports. C-clean.
+/// Marks what the library exports. Valid C.
 ///
-/// `ZB_API` stands before every exported class and function. On ELF it gives default visibility. With mingw-w64 it is
-/// empty, as the names exported there are those of the library's committed export list. With MSVC it imports, unless
-/// `ZB_BUILDING` (the library itself) or `ZB_STATIC` (its objects linked into a program) is defined.
+/// `ZB_API` precedes every exported class and function. On ELF it gives default visibility. With mingw-w64 it is empty,
+/// because the library's committed export list decides what is exported. With MSVC it imports, unless `ZB_BUILDING`
+/// (the library itself) or `ZB_STATIC` (its objects linked into a program) is defined.
 
 #ifndef ZOR_BASIS_EXPORT_H
 #define ZOR_BASIS_EXPORT_H
@@ -32,14 +32,14 @@
 #define ZB_INSTANTIATE_TEMPLATE template class
 #endif
 
-/// `ZB_API` for functions so short that the detour counts through which ELF programs reach a library's functions.
+/// `ZB_API` for functions so short that the indirection of an ELF call into a library matters.
 #if defined(__ELF__) && !defined(__clang__)
 #define ZB_API_STRAIGHT ZB_API __attribute__((noplt))
 #else
 #define ZB_API_STRAIGHT ZB_API
 #endif
 
-/// C linkage for what C can call.
+/// C linkage, for functions that C can call.
 #ifdef __cplusplus
 #define ZB_EXTERN_C extern "C"
 #else

@@ -1,5 +1,5 @@
 /// \file
-/// Paths, files, directories and what there is to know about them; and the texts that they are named by.
+/// Paths, files, directories and their status. Includes the text types that name them.
 
 #ifndef ZOR_BASIS_FILES_H
 #define ZOR_BASIS_FILES_H

@@ -1,6 +1,6 @@
 /// \file
-/// What there is to know about the system that the component runs on, and what it is asked to do: other programs, folders
-/// for jobs, URLs, and texts that come from such. Comes with the text types, in which it answers.
+/// The system that the component runs on: users, drives, other programs, folders for jobs, URLs, and parsing texts.
+/// Includes the text types, which the answers use.
 
 #ifndef ZOR_BASIS_SYSTEM_H
 #define ZOR_BASIS_SYSTEM_H

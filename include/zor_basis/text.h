@@ -1,6 +1,7 @@
 /// \file
-/// Text: views (`Str`, `WStr`, `WFxStr`), strings that keep short text inside the object (`BufStr`, `WBStr`), exact heap
-/// strings (`HeapStr`), and buffers for calls that fill them (`Auto_ptr_CStr`). Bytes: `Blob`, `SecretBlob`.
+/// Text: views (`Str`, `WStr`, `WFxStr`), strings that keep short text inside the object (`BufStr`, `WBStr`), heap
+/// strings of exact size (`HeapStr`), and buffers for calls that fill them (`Auto_ptr_CStr`). Bytes: `Blob`,
+/// `SecretBlob`.
 ///
 /// Narrow text is a sequence of bytes, wide text one of 16-bit code units. Views never copy; strings always do, and
 /// copying a string copies its text. Nothing here is synchronised: an object belongs to one thread at a time.

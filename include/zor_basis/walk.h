@@ -1,5 +1,5 @@
 /// \file
-/// Walks over directory trees, what to do with the entries that they find, and searches.
+/// Walks over directory trees, visitors for the entries that they report, and searches.
 
 #ifndef ZOR_BASIS_WALK_H
 #define ZOR_BASIS_WALK_H

@@ -385,9 +385,20 @@ TEST_F(DictTest, tells_what_the_last_reading_found) {
     EXPECT_EQ(dict.understood(), 20u);
     dict.setPath(Str(scratch / "missing"));
     EXPECT_FALSE(dict.read());
-    EXPECT_EQ(dict.found(), DICT_NOT_READ);
+    EXPECT_EQ(dict.found(), DICT_MISSING);
     EXPECT_EQ(dict.understood(), 0u);
-    EXPECT_EQ(BlobDict(Str(scratch / "missing")).found(), DICT_NOT_READ);
+    EXPECT_EQ(BlobDict(Str(scratch / "missing")).found(), DICT_MISSING);
+}
+
+TEST_F(DictTest, tells_a_file_that_could_not_be_opened_from_a_missing_one) {
+    put(path, fileOf({{"A", "1"}}));
+    BlobDict dict;
+    dict.setPath(Str(path));
+    xos_HostFail("xos_FileOpen", 0, 1);
+    EXPECT_FALSE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_NOT_READ);
+    EXPECT_TRUE(dict.read());
+    EXPECT_EQ(dict.found(), DICT_WHOLE);
 }
 
 TEST_F(DictTest, tells_a_failure_to_read_from_the_end) {

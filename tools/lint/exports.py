@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
-"""The names that each shared library exports are those of its committed lists in cmake/exports.
+"""Each shared library exports exactly the names in its committed lists in cmake/exports.
 
-`NAME.elf.txt` lists what the .so exports, as its export macros and version script decide. `NAME.def` lists the same
-functions and data for the DLL, where the linker reads it. With --update both are written anew: the second from the
-objects of the DLL, taking those names that stand for something in the first.
+`NAME.elf.txt` lists the names that the .so exports, which its export macros and version script decide. `NAME.def` lists
+the same functions and data for the DLL; the linker reads it. With --update both are rewritten: the second from the
+objects of the DLL, with the names that have a counterpart in the first.
 """
 
 import re

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Every source is laid out as clang-format does it."""
+"""Every source is formatted by clang-format."""
 
 import common
 

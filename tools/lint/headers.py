@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Every public header compiles alone and twice, with each compiler; C-clean headers compile as C too."""
+"""Every public header compiles alone and twice, with each compiler; headers that say "Valid C" also compile as C."""
 
 import common
 
@@ -19,8 +19,8 @@ INCLUDES = ["-Iinclude", "-Ihost/include", "-I."]
 headers = common.files("include/**.h", "host/include/*.h", "basis/platform/*.h")
 
 
-def is_c_clean(path):
-    return "C-clean" in common.text(path)[:1500]
+def is_valid_c(path):
+    return "Valid C" in common.text(path)[:1500]
 
 
 def name(path):
@@ -38,8 +38,8 @@ def check(job):
 
 
 public = [h for h in headers if "windows_api" not in str(h)]
-jobs = [(h, c, "c++") for h in public for c in CXX] + [(h, c, "c") for h in public if is_c_clean(h) for c in C]
+jobs = [(h, c, "c++") for h in public for c in CXX] + [(h, c, "c") for h in public if is_valid_c(h) for c in C]
 problems = [line for found in common.in_parallel(check, jobs) for line in found]
-if not any(is_c_clean(h) and h.name == "flat.h" for h in public):
-    problems.append("include/zor_basis/flat.h does not say that it is C-clean")
+if not any(is_valid_c(h) and h.name == "flat.h" for h in public):
+    problems.append("include/zor_basis/flat.h does not say that it is valid C")
 common.finish("headers", problems, len(jobs))

@@ -1,6 +1,7 @@
 #!/usr/bin/env python3
-"""Behaviour that looks odd and is relied upon has an id. Each id is told in a public header (`\\kept id: text`), marked
-at its spot (`// kept id: text`) and pinned by a test whose name holds it (`Kept_room_01_…`). Writes docs/kept.md."""
+"""Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment
+marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`). Writes
+docs/kept.md."""
 
 import re
 
@@ -11,8 +12,8 @@ SPOT = re.compile(r"(?://|/\*) kept ([a-z]+(?:-[a-z]+)*-\d+)\b")
 TEST = re.compile(r"\bKept_([a-z]+(?:_[a-z]+)*_\d+)_")
 HEAD = """# Kept behaviour
 
-What looks odd in this library and is relied upon, gathered from the public headers by `./dev lint kept`.
-Each line has a mark at its spot in the code and a test that fails as soon as the behaviour changes.
+Behaviour that looks odd and is relied upon, collected from the public headers by `./dev lint kept`.
+A comment marks each at its place in the code, and a test fails as soon as the behaviour changes.
 
 """
 
@@ -33,7 +34,8 @@ def main():
     tests = gather(TEST, common.files("tests/**.cpp", "tests/**.h"), lambda match: match[1].replace("_", "-"))
     problems = []
     for identity in sorted(told.keys() | spots.keys() | tests.keys()):
-        for name, where in (("a \\kept line in a public header", told), ("a mark at its spot", spots), ("a test", tests)):
+        lists = {"a \\kept line in a public header": told, "a mark in the code": spots, "a test": tests}
+        for name, where in lists.items():
             if identity not in where:
                 problems.append(f"{identity} lacks {name}")
     lines, room = [], None
@@ -47,7 +49,7 @@ def main():
     content = HEAD + "\n".join(lines) + "\n"
     if not page.exists() or page.read_text() != content:
         page.write_text(content)
-        problems.append("docs/kept.md was out of date and has been written anew; commit it")
+        problems.append("docs/kept.md was out of date and has been rewritten; commit it")
     common.finish("kept", problems, len(told))
 
 

@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-"""Includes run from the higher room to the lower (levels.txt), without a circle between rooms or between components, in
-the library and in the host."""
+"""Includes lead from higher rooms to lower ones (levels.txt), and neither rooms nor components form a circle, in the
+library and in the host."""
 
 import re
 from pathlib import PurePosixPath

@@ -1,5 +1,6 @@
 #!/usr/bin/env python3
-"""What must not compile: in tests/refused each line marked `// refused` is an error, with each compiler, and no other is."""
+"""Code that must not compile: with each compiler, the lines marked `// refused` in tests/refused are errors, no other
+line is."""
 
 import re
 
@@ -31,5 +32,5 @@ def check(job):
 sources = common.files("tests/refused/*.cpp")
 jobs = [(path, compiler) for path in sources for compiler in COMPILERS]
 problems = [line for found in common.in_parallel(check, jobs) for line in found]
-problems += [f"{path} marks nothing" for path in sources if not marked(path)]
+problems += [f"{path} has no line marked `// refused`" for path in sources if not marked(path)]
 common.finish("refused", problems, len(jobs))

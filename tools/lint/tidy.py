@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""clang-tidy over what the library, the platform layer and the examples compile on Linux."""
+"""Runs clang-tidy over the sources that the library, the platform layer and the examples compile on Linux."""
 
 import json
 

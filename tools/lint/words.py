@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Words that the project does not contain: unfinished work, paths of one machine, documents that are not part of it."""
+"""Words that the project must not contain: unfinished work, paths of one machine, documents that are not part of it."""
 
 import re
 

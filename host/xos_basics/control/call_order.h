@@ -1,11 +1,11 @@
 /// \file
-/// Which of two threads' calls was the later one.
+/// Decides which of two threads' calls came later.
 ///
-/// Most functions read a clock, once several threads call them. What is done to a semaphore costs less than that reading,
-/// so these functions count time by events: a thread's time grows with each such call, a semaphore carries the giver's
-/// time to the taker, and the common time passes it on where threads or tasks start and end, where any other function
-/// with arguments is called by several threads, and where somebody asks for a last call. So only threads that agree on an order by means of
-/// their own, between calls of nothing but these, leave the order of those calls open.
+/// Once several threads call a function, it normally reads a clock. A semaphore operation costs less than that reading,
+/// so the semaphore functions use a logical clock instead: each such call advances the thread's time, and a semaphore
+/// carries the giver's time to the taker. The common time passes it on when a thread or task starts or ends, when
+/// several threads call another function with arguments, and when a last call is queried. The order of semaphore calls
+/// is therefore undefined only if threads order them by other means and call nothing else in between.
 
 #ifndef HOST_XOS_BASICS_CONTROL_CALL_ORDER_H
 #define HOST_XOS_BASICS_CONTROL_CALL_ORDER_H
@@ -33,25 +33,25 @@ inline std::uint64_t nextTime(ThreadCalls& mine) {
     return time;
 }
 
-/// Makes every call that follows, in whatever thread, later than the thread's calls so far.
+/// Makes every following call, in any thread, later than this thread's calls so far.
 inline void publishTime(ThreadCalls const& mine) {
     std::uint64_t const time = mine.time.load(std::memory_order_relaxed);
     std::uint64_t common = commonTime.load(std::memory_order_relaxed);
     while (common < time && !commonTime.compare_exchange_weak(common, time, std::memory_order_release)) {}
 }
 
-/// Leaves the thread's time with a semaphore that it is about to give.
+/// Stores the thread's time in a semaphore that it is about to give.
 inline void leaveTime(ThreadCalls const& mine, std::atomic<std::uint64_t>& time) {
     time.store(mine.time.load(std::memory_order_relaxed), std::memory_order_relaxed);
 }
 
-/// Takes over the time of the semaphore's last giver.
+/// Adopts the time of the semaphore's last giver, if that is later.
 inline void learnTime(ThreadCalls& mine, std::atomic<std::uint64_t> const& time) {
     std::uint64_t const left = time.load(std::memory_order_relaxed);
     if (left > mine.time.load(std::memory_order_relaxed)) { mine.time.store(left, std::memory_order_relaxed); }
 }
 
-/// The stamp of a call by a thread that is not known as its function's only caller.
+/// Returns the stamp of a call by a thread that is not known to be its function's only caller.
 /// \pre the function is not ordered by events
 std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller);
 

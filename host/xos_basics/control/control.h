@@ -34,7 +34,7 @@ bool takesInjectedFailure(Function function);
 /// Notes one call in the calling thread's record, from construction to destruction.
 class CallNote {
 public:
-    /// \param isAlike  all calls of the function are noted alike, so that nobody asks which of them was the last
+    /// \param isAlike  says that all calls of the function have the same record, so the last one need not be known
     [[gnu::always_inline]] explicit CallNote(Function function, bool isAlike = false)
         : CallNote(function, isAlike, threadCalls()) {}
     CallNote(CallNote const&) = delete;

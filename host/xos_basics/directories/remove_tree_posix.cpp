@@ -99,7 +99,7 @@ bool TreeRemoval::leave() {
     Level& above = levels_.back();
     bool const gone = ::unlinkat(chain_.lowest(), above.directories.first(), AT_REMOVEDIR) == 0 || errno == ENOENT;
     if (!gone) {
-        // Filled again, or exchanged for something else: it is looked at once more.
+        // Filled again, or replaced by another entry: examine it again.
         bool const changed = errno == ENOTEMPTY || errno == EEXIST || errno == ENOTDIR;
         if (clean && changed && ++above.passes < MOST_PASSES) { return true; }
         fail();

@@ -17,7 +17,7 @@ bool statusAt(Place const& place, struct stat& status) {
     return ::fstatat(place.at(), place.name.c_str(), &status, AT_SYMLINK_NOFOLLOW) == 0;
 }
 
-/// Finds an entry that can be taken away: neither "." nor "..", nor the root.
+/// Finds an entry that can be removed: neither "." nor "..", nor the root.
 bool findEntry(char const* path, Place& place, struct stat& status) {
     if (!findPlace(path, place)) { return false; }
     return isDots(place.name.c_str()) ? failWith(EINVAL) : statusAt(place, status);

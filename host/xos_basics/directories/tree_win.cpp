@@ -12,7 +12,7 @@ namespace host {
 
 namespace {
 
-/// The full path of an entry that can be taken away: neither "." nor "..", nor a root.
+/// The full path of an entry that can be removed: neither "." nor "..", nor a root.
 bool entryPath(char const* path, std::wstring& full) {
     std::string text{path};
     cutEndSlashes(text);
@@ -23,7 +23,7 @@ bool entryPath(char const* path, std::wstring& full) {
     return fullPath(path, full) && (!isRoot(full) || failWith(ERROR_ACCESS_DENIED));
 }
 
-/// The directories of a tree on the way to the place of work, with those that are still to be visited.
+/// The directories from a tree's top to the current one, with those that are still to be visited.
 class Descent {
 public:
     explicit Descent(std::wstring top) : path_(std::move(top)) { levels_.push_back({path_.size(), {}}); }
@@ -187,7 +187,7 @@ private:
     std::size_t fromLength_;
     std::wstring to_;
     CopyRules rules_;
-    /// Which of the target's directories on the way were made here; the top is, where nobody sees it yet.
+    /// Which of the target's directories down to the current one were made here; the top was, if it is still unseen.
     std::vector<bool> isNew_{rules_.unseen};
 };
 

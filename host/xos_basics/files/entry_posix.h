@@ -1,8 +1,8 @@
 /// \file
 /// Steps on single entries that files and trees share: places, new names, complete copies. For `_posix` sources only.
 ///
-/// An entry is named by the descriptor of its directory and its name there, so that nobody can put another path under
-/// it between two steps. What fails leaves errno.
+/// An entry is identified by the descriptor of its directory and its name there, so no other process can exchange its
+/// path between two steps. What fails leaves errno.
 
 #ifndef HOST_XOS_BASICS_FILES_ENTRY_POSIX_H
 #define HOST_XOS_BASICS_FILES_ENTRY_POSIX_H
@@ -67,7 +67,8 @@ class FileCopier {
 public:
     /// Makes the entry `name` a complete copy of an open file. On failure there is no such entry.
     bool copyToNew(int source, struct stat const& status, int at, char const* name);
-    /// The same by way of a temporary name. \param overwrite  also in place of a file
+    /// The same through a temporary name.
+    /// \param overwrite  allows a file to be replaced
     bool copyTo(int source, struct stat const& status, int at, char const* name, bool overwrite);
 
 private:

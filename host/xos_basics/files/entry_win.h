@@ -44,7 +44,8 @@ bool renameEntry(std::wstring const& from, std::wstring const& to, bool overwrit
 /// Makes `to`, which nothing may bear yet, a complete copy of a file or of a link to one. On failure there is no `to`.
 bool copyToNewFile(std::wstring const& from, std::wstring const& to);
 
-/// Copies by way of a temporary name. \param overwrite  also in place of a file
+/// Copies through a temporary name.
+/// \param overwrite  allows a file to be replaced
 bool copyFileEntry(std::wstring const& from, std::wstring const& to, bool overwrite);
 
 /// Gives a directory the modification time and the attributes of another.

@@ -19,7 +19,7 @@ constexpr std::uint32_t CREATE = 0x10;
 constexpr std::uint32_t TEXT = 0x20;
 
 constexpr std::size_t BUFFER_SIZE = 32 * 1024;
-/// From here on a read gains nothing by way of the buffer.
+/// From this size on a read gains nothing from the buffer.
 constexpr std::size_t DIRECT_READ = 2048;
 
 } // namespace

@@ -14,8 +14,8 @@ namespace {
 /// Blocks move between a thread's own store and the common one by the batch.
 constexpr std::uint32_t BATCH = 16;
 
-/// Blocks that were made together. A handle hides its block's address from whoever looks for lost memory, so that all of
-/// them are kept in a list.
+/// Blocks that were made together. A handle hides its block's address from leak checkers, so all blocks are kept in a
+/// list.
 struct Slab {
     std::array<Semaphore, BATCH> blocks;
     Slab* older;

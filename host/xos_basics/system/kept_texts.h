@@ -1,5 +1,5 @@
 /// \file
-/// Texts whose address is handed out and may be used for ever.
+/// Texts whose address is returned and stays valid forever.
 
 #ifndef HOST_XOS_BASICS_SYSTEM_KEPT_TEXTS_H
 #define HOST_XOS_BASICS_SYSTEM_KEPT_TEXTS_H

@@ -6,7 +6,7 @@
 
 namespace host {
 
-/// What `xos_FileSystemRoot` answers, without counting as a call of it. Valid for ever.
+/// The result of `xos_FileSystemRoot`, without counting as a call of it. Valid forever.
 char const* configuredRoot();
 
 } // namespace host

@@ -22,7 +22,7 @@ public:
         _text.store(isSet ? keptText(text) : nullptr, std::memory_order_release);
     }
 
-    /// The text, valid for ever; empty where neither is set.
+    /// The text, valid forever; empty if neither is set.
     char const* get() const {
         char const* const text = _text.load(std::memory_order_acquire);
         return text != nullptr ? text : keptText(std::getenv(_variable));

@@ -12,7 +12,7 @@ namespace host {
 /// \return false: there is none idle and the system gives no new one; the last error is then set
 bool runTask(TaskJob const& job);
 
-/// Sees to it that no waiting job depends on another's end: makes threads for all that nobody takes soon.
+/// Ensures that no waiting job depends on another's end: makes threads for all jobs that no thread takes soon.
 void provideThreads();
 
 } // namespace host

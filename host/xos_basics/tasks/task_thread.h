@@ -8,8 +8,9 @@
 
 namespace host {
 
-/// Starts a thread that nobody waits for. \param stackSize  bytes at least; 0: the system's usual size
-/// \return false: the system has no thread to give; its last error says why
+/// Starts a detached thread.
+/// \param stackSize  is the minimum in bytes; 0: the system's usual size
+/// \return false if the system cannot make a thread; its last error says why
 bool startThread(void (*run)(void*), void* argument, std::uint64_t stackSize);
 
 /// Names the calling thread for debuggers, as far as the system keeps names (15 bytes on Linux).

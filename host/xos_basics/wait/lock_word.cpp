@@ -7,8 +7,8 @@ namespace host {
 
 namespace {
 
-/// The longest rest between two looks, in pauses; the rests before it double. Each look takes the cache line away from the
-/// holder, so they become rare soon. All together last about ten microseconds, as sleeping and waking do.
+/// The longest rest between two looks, in pauses; the rests before it double. Each look takes the cache line away from
+/// the holder, so they become rare soon. All together last about ten microseconds, as sleeping and waking do.
 constexpr int LONGEST_REST = 64;
 constexpr int LOOKS_AT_LONGEST = 4;
 
@@ -31,7 +31,7 @@ bool isTakenAwake(LockWord& lock) {
     return false;
 }
 
-/// Makes sure that whoever gives the lock from now on sees that it is awaited.
+/// Ensures that every thread that gives the lock from now on sees that it is awaited.
 void announceSleeper(LockWord& lock) {
     lock.awaited.exchange(1, std::memory_order_seq_cst);
     if (hasProcessBarrier) { passProcessBarrier(); }
@@ -41,7 +41,8 @@ void announceSleeper(LockWord& lock) {
 
 void takeContended(LockWord& lock) {
     if (isTakenAwake(lock)) { return; }
-    // Whoever has slept leaves the lock awaited, as others may be asleep still; its own giving wakes the next one.
+    // A thread that has slept leaves the lock awaited, because others may still be asleep; its own give wakes the next
+    // one.
     for (;;) {
         announceSleeper(lock);
         std::uint32_t expected = WORD_FREE;

@@ -1,9 +1,10 @@
 /// \file
-/// A lock that any thread may give, in two words: one says whether it is held, the other whether somebody sleeps at it.
+/// A lock that any thread may give, in two words: one says whether it is held, the other whether a thread sleeps at it.
 ///
-/// A giver frees the first word and then looks at the second; a sleeper sets the second and then looks at the first. One
-/// of them sees what the other did, provided that neither looks before it writes. The sleeper takes care of both sides by
-/// a barrier for the whole process. So giving needs no locked instruction, which would cost as much as all the rest.
+/// A giver frees the first word and then looks at the second; a sleeper sets the second and then looks at the first.
+/// One of them sees what the other did, provided that neither looks before it writes. The sleeper takes care of both
+/// sides by a barrier for the whole process. So giving needs no locked instruction, which would cost as much as all the
+/// rest.
 
 #ifndef HOST_XOS_BASICS_WAIT_LOCK_WORD_H
 #define HOST_XOS_BASICS_WAIT_LOCK_WORD_H

@@ -1,7 +1,7 @@
 /// \file
-/// A memory barrier for all threads of the process at once. Whoever waits for long pays for it, so that whoever passes by
-/// need not: with one thread's barrier, the other's order of a store and a later load holds too.
-/// Twins: process_barrier_posix.cpp, process_barrier_win.cpp.
+/// A memory barrier for all threads of the process. A thread that waits for long pays for it, so that a thread that
+/// does not wait need not: one thread's barrier also keeps the order of a store and a later load in the others. Twins:
+/// process_barrier_posix.cpp, process_barrier_win.cpp.
 
 #ifndef HOST_XOS_BASICS_WAIT_PROCESS_BARRIER_H
 #define HOST_XOS_BASICS_WAIT_PROCESS_BARRIER_H

@@ -13,7 +13,7 @@ namespace host {
 /// Sleeps while the word has the value; may also return for no reason.
 void waitWhile(std::atomic<std::uint32_t>& word, std::uint32_t value);
 
-/// The word need not exist any more: an address that nobody waits at is no error.
+/// The word need not exist any more: an address at which no thread waits is not an error.
 void wakeOne(std::atomic<std::uint32_t>& word);
 
 } // namespace host

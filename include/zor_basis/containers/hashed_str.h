@@ -1,7 +1,10 @@
 /// \file
-/// `HashedStr<HeapStr>`: a stored text that carries its hash, so that comparing looks at the hash first.
+/// `HashedStr<HeapStr>`: a stored text with its hash, which comparisons check first.
 ///
-/// \thread  one thread at a time
+///     HashedStr<HeapStr> const tray("tray1");
+///     bool const same = tray.eq(name, hashDjb2(name, 0));
+///
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_CONTAINERS_HASHED_STR_H
 #define ZOR_BASIS_CONTAINERS_HASHED_STR_H
@@ -20,7 +23,7 @@ namespace ZOR_Basis {
 template <class Text>
 class HashedStr {
 public:
-    /// The empty text, and copies of others, by the rules of the text type.
+    /// Constructs the empty text, or a copy of another, by the rules of the text type.
     HashedStr() { calcHash(); }
     HashedStr(char const* text) : text_(text) { calcHash(); }
     HashedStr(char const* text, std::uint64_t n) : text_(text, n) { calcHash(); }
@@ -36,7 +39,7 @@ public:
         hash_ = other.hash_;
         return *this;
     }
-    /// As the text's own `set`.
+    /// Calls the text's own `set`.
     HashedStr& set(char const* text) { return assign(text); }
     HashedStr& set(char const* text, std::uint64_t n) {
         text_.set(text, n);
@@ -53,14 +56,15 @@ public:
     std::uint64_t size() const { return text_.size(); }
     /// `hashDjb2` of the text.
     std::uint64_t hash() const { return hash_; }
-    /// The text. Whoever changes it through this calls `calcHash` afterwards.
+    /// The text. A caller that changes it through this reference must call `calcHash` afterwards.
     Text& str() { return text_; }
     Text const& str() const { return text_; }
     void calcHash() { hash_ = text_.hash(); }
 
-    /// Equality by the rule of `Str`, without a look at the hash.
+    /// Compares by the rule of `Str`, without the hash.
     bool eq(Str const& text) const { return text_ == text; }
-    /// The same after comparing hashes. \param hash  that of the text
+    /// The same after comparing hashes.
+    /// \param hash  is that of `text`
     bool eq(Str const& text, std::uint64_t hash) const { return hash_ == hash && text_ == text; }
 
     bool operator==(HashedStr const& other) const { return this == &other || eq(other.text_, other.hash_); }

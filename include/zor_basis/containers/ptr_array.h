@@ -1,10 +1,15 @@
 /// \file
-/// `PtrArray<T>`: a growable array of pointers that owns none of what they point to.
+/// `PtrArray<T>`: a growable array of pointers that does not own the objects they point to.
 ///
-/// A walk from `begin()` to `end()` meets every slot below the size, including those that were skipped and are null.
+/// An iteration from `begin()` to `end()` visits every slot below the size, including skipped slots, which are null.
 ///
-/// \thread  one thread at a time
-/// \error  memory that runs short ends the program
+///     PtrArray<Page> pages;
+///     pages.insertBack(&cover);
+///     for (Page* page : pages)
+///         if (page != nullptr) page->render();
+///
+/// \thread one thread at a time
+/// \error the program is aborted if memory is short
 
 #ifndef ZOR_BASIS_CONTAINERS_PTR_ARRAY_H
 #define ZOR_BASIS_CONTAINERS_PTR_ARRAY_H
@@ -20,10 +25,10 @@ namespace ZOR_Basis {
 template <class T>
 class PtrArray {
 public:
-    /// An empty array with room for n pointers; 0 counts as 1.
+    /// Constructs an empty array with room for n pointers; 0 counts as 1.
     PtrArray(std::uint64_t n = 8) { extend(n != 0 ? n : 1); }
     PtrArray(PtrArray const& other) : PtrArray(other.capacity_) { *this = other; }
-    /// Holds the other's pointers afterwards, in a block of its own with at least the other's capacity.
+    /// Copies the other's pointers into its own block, of at least the other's capacity.
     PtrArray& operator=(PtrArray const& other) {
         if (this == &other) return *this;
         if (capacity_ < other.capacity_) {
@@ -36,17 +41,18 @@ public:
         count_ = other.count_;
         return *this;
     }
-    /// Leaves what is pointed to alone.
+    /// Releases the block, not the objects.
     ~PtrArray() { std::free(slots_); }
 
-    /// Appends a pointer. \return its index
+    /// Appends a pointer.
+    /// \return its index
     std::uint64_t insertBack(T* pointer) {
         if (count_ == capacity_) extend(2 * capacity_);
         slots_[count_] = pointer;
         return count_++;
     }
 
-    /// Stores a pointer at an index; slots that are skipped are null.
+    /// Stores a pointer at an index; skipped slots become null.
     void set(T* pointer, std::uint64_t index) {
         if (index >= capacity_) extend(index + 1);
         slots_[index] = pointer;
@@ -70,7 +76,7 @@ public:
     T* const* end() const { return slots_ + count_; }
 
 protected:
-    /// Makes room for n pointers, and for at least twice as many as before where that is not enough already.
+    /// Makes room for n pointers; a new block has at least twice the previous capacity.
     void extend(std::uint64_t n) {
         if (n <= capacity_) return;
         std::uint64_t const capacity = n > 2 * capacity_ ? n : 2 * capacity_;
@@ -87,10 +93,10 @@ protected:
     T** slots_ = nullptr;
 
 private:
-    /// Up to here the runtime has blocks at hand that cost less to clear than its own cleared blocks cost to find.
+    /// Up to this number, clearing a block costs less than getting a cleared block from the runtime.
     static constexpr std::uint64_t FEW = 128;
 
-    /// Null slots, or slots yet to be cleared where they are few.
+    /// Returns null slots, or, if they are few, slots that the caller must clear.
     static T** makeSlots(std::uint64_t n) {
         void* const slots = n <= FEW ? std::malloc(n * sizeof(T*)) : std::calloc(n, sizeof(T*));
         if (slots == nullptr) std::abort();

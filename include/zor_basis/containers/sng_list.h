@@ -1,16 +1,21 @@
 /// \file
-/// `SngList<T>`: a singly linked list of units, each a link and a value.
+/// `SngList<T>`: a singly linked list of units, each with a link and a value.
 ///
-/// The list owns its units: `new` makes them, `delete` ends them. A unit taken out (`take`, `takeFirst`) is the caller's,
-/// who gives it back to a list or deletes it; a unit put in is adopted. Positions are iterators, which remember the unit
-/// before their own so that they can remove and insert there; any other change of the list at their place makes them
-/// invalid.
+/// The list owns its units, which it makes by `new` and deletes by `delete`. A unit that is taken out (`take`,
+/// `takeFirst`) belongs to the caller, who returns it to a list or deletes it; a unit that is inserted is adopted. A
+/// position is an iterator, which also knows the previous unit so that it can remove and insert there; any other change
+/// of the list at that place invalidates it.
 ///
-/// Values need to be copied only by the members that copy, and compared (`<`) only by those that sort. Moving a list moves
-/// its chain: units, and pointers to them, stay what they are.
+///     SngList<int> list;
+///     list.insertBack(2);
+///     list.insertFront(1);
+///     for (auto it = list.begin(); it != list.end();) *it % 2 == 0 ? list.remove(it) : void(++it);
 ///
-/// \thread  one thread at a time
-/// \error  memory that runs short when a unit is made comes out as `std::bad_alloc`
+/// Only the members that copy require copyable values, and only those that sort require `<`. Moving a list moves its
+/// chain: units stay where they are, and pointers to them stay valid.
+///
+/// \thread one thread at a time
+/// \error throws `std::bad_alloc` if memory for a unit is short
 
 #ifndef ZOR_BASIS_CONTAINERS_SNG_LIST_H
 #define ZOR_BASIS_CONTAINERS_SNG_LIST_H
@@ -100,13 +105,14 @@ public:
     };
 
     SngList() = default;
-    /// Adopts a chain as it is. \pre `first` leads to `last`, whose link is null, over `count` units
+    /// Adopts a chain without changing it.
+    /// \pre `count` units lead from `first` to `last`, whose link is null
     SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_(count) {}
     /// Copies the values in their order.
     SngList(SngList const& other) : SngList() {
         for (Unit* unit = other.first_; unit != nullptr; unit = unit->next) insertBack(unit->value);
     }
-    /// Takes the other's units, which ends empty.
+    /// Takes the units of the other list, which becomes empty.
     SngList(SngList&& other) noexcept { swap(other); }
     SngList& operator=(SngList const& other) {
         if (this != &other) {
@@ -115,7 +121,7 @@ public:
         }
         return *this;
     }
-    /// Deletes the own units and takes the other's, which ends empty; nothing for the list itself.
+    /// Deletes its own units and takes those of the other list, which becomes empty. Self-assignment does nothing.
     SngList& operator=(SngList&& other) noexcept {
         if (this != &other) {
             SngList taken(std::move(other));
@@ -159,7 +165,7 @@ public:
         ++count_;
     }
 
-    /// Inserts behind the iterator's unit; at the end of the list, and for an iterator without a unit, appends.
+    /// Inserts after the iterator's unit; appends at the end of the list and for an iterator without a unit.
     void insertAfter(T const& value, iterator& place) { insertAfter(new Unit{nullptr, value}, place); }
     void insertAfter(Unit* unit, iterator& place) {
         if (place.current_ == nullptr || place.current_ == last_) {
@@ -168,7 +174,7 @@ public:
             link(unit, place.current_);
         }
     }
-    /// Inserts before the iterator's unit, which stays its own; an iterator without a unit appends.
+    /// Inserts before the iterator's unit; the iterator keeps its unit. Appends for an iterator without a unit.
     void insertBefore(T const& value, iterator& place) { insertBefore(new Unit{nullptr, value}, place); }
     void insertBefore(Unit* unit, iterator& place) {
         if (place.current_ == nullptr) {
@@ -183,10 +189,10 @@ public:
         place.previous_ = unit;
     }
 
-    /// Deletes the iterator's unit and moves the iterator to the next one; nothing without a unit.
+    /// Deletes the iterator's unit and moves the iterator to the next one; does nothing without a unit.
     void remove(iterator& place) { delete take(place); }
-    /// Takes the iterator's unit out and moves the iterator on.
-    /// \return the unit with its value, now the caller's; null without a unit
+    /// Takes the iterator's unit out and moves the iterator to the next one.
+    /// \return the unit with its value, which the caller now owns; null without a unit
     Unit* take(iterator& place) {
         if (place.current_ == nullptr) return nullptr;
         Unit* const taken = unlink(place.previous_, place.current_);
@@ -203,7 +209,7 @@ public:
         return taken;
     }
 
-    /// Turns the order round, in place.
+    /// Reverses the order, in place.
     void reverse() {
         Unit* reversed = nullptr;
         last_ = first_;
@@ -214,22 +220,22 @@ public:
         first_ = reversed;
     }
 
-    /// Sorts by the links; values stay where they are. Equal values keep their order.
-    /// \kept list-01: except in a list of exactly two, which are swapped unless the first comes strictly before the
-    ///     second, so that two equal ones change places
-    /// \cost n log n comparisons, and for the time of the call one pointer a unit, where memory allows it
+    /// Sorts by changing links; values do not move in memory. Equal values keep their order.
+    /// \kept list-01: a list of exactly two units is an exception: they are swapped unless the first comes strictly
+    ///     before the second, so two equal ones change places
+    /// \cost n log n comparisons, and during the call one pointer per unit, if memory allows
     void sort(bool ascending) {
         if (count_ < 2) return;
         if (count_ == 2) {
-            // kept list-01: two units are compared once, and whatever is not less goes behind.
+            // kept list-01: two units are compared once, and one that is not less goes behind.
             if (!comp(first_, last_, ascending)) reverse();
         } else if (!sortGathered(ascending)) {
             sortLinked(ascending);
         }
     }
 
-    /// Merges another sorted list into this sorted one; the other ends empty.
-    /// \kept list-02: of equal values the other list's comes first
+    /// Merges another sorted list into this sorted one; the other becomes empty.
+    /// \kept list-02: of equal values, those of the other list come first
     void merge(SngList& other, bool ascending) {
         if (this == &other || other.first_ == nullptr) return;
         Unit* mine = first_;
@@ -249,10 +255,11 @@ public:
         other.count_ = 0;
     }
 
-    /// Whether a comes strictly before b.
+    /// Tells whether a comes strictly before b.
     static bool comp(Unit* a, Unit* b, bool ascending) { return ascending ? a->value < b->value : b->value < a->value; }
 
-    /// Whether links, tail and count agree. \cost a walk over all units
+    /// Tells whether links, tail and count agree.
+    /// \cost a walk over all units
     bool isConsistent() const {
         std::uint64_t units = 0;
         Unit const* tail = nullptr;
@@ -267,7 +274,7 @@ private:
         std::swap(count_, other.count_);
     }
 
-    /// Puts a unit behind one that is not the last.
+    /// Inserts a unit after one that is not the last.
     void link(Unit* unit, Unit* previous) {
         unit->next = previous->next;
         previous->next = unit;
@@ -281,8 +288,8 @@ private:
         return unit;
     }
 
-    /// Sorts an array of the units and links them anew: neighbours in memory compare faster than links are followed.
-    /// \return false, with nothing changed, where there is no memory for the array
+    /// Sorts an array of pointers to the units and links the units again, which is faster than following links.
+    /// \return false, with nothing changed, if memory for the array is short
     bool sortGathered(bool ascending) {
         Unit** const units = static_cast<Unit**>(std::malloc(count_ * sizeof(Unit*)));
         if (units == nullptr) return false;

@@ -1,7 +1,7 @@
 /// \file
 /// `CrHashPtr`: owns one hash.
 ///
-/// \thread  one thread at a time
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_CRYPTO_CR_HASH_PTR_H
 #define ZOR_BASIS_CRYPTO_CR_HASH_PTR_H
@@ -16,9 +16,9 @@ class Crypt;
 
 class ZB_API CrHashPtr : public detail::NotDeletable<CrHashPtr> {
 public:
-    /// Owns a new hash of the provider, and none for null.
+    /// Makes and owns a new hash of the provider; owns none if `crypt` is null.
     CrHashPtr(Crypt* crypt);
-    /// Adopts the hash; null is none.
+    /// Adopts the hash, which may be null.
     CrHashPtr(CrHash* hash) : hash_(hash) {}
     ~CrHashPtr();
 

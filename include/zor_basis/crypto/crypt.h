@@ -1,5 +1,5 @@
 /// \file
-/// `Crypt`: a provider of hashes and of keys. From secret text to encrypted bytes it is four steps:
+/// `Crypt`: a provider of hashes and keys. Four steps lead from secret text to encrypted bytes:
 ///
 ///     Crypt* crypt = Crypt::make("");
 ///     CrHashPtr hash(crypt);
@@ -8,18 +8,18 @@
 ///     key->encrypt(plain, encrypted);
 ///     delete key;
 ///
-/// **What it computes**: the hash is MD5. The key is RC2 with 128 bits, all of them effective, and is the 16 bytes of the
-/// digest. Data is encrypted in blocks of 8 bytes, each chained to the one before (CBC, from 8 zero bytes), after it has
-/// been padded to whole blocks with 1 to 8 bytes that say how many they are (PKCS#5). Sources: RFC 1321, RFC 2268. On
-/// Windows that is what the system's cryptographic service yields by default, on Linux the same bytes come from nettle.
+/// **What it computes.** The hash is MD5. The key is an RC2 key of 128 effective bits, the 16 bytes of the digest. The
+/// data is padded to whole blocks of 8 bytes with 1 to 8 bytes that each give their number (PKCS#5), and encrypted in
+/// CBC mode with an initialisation vector of zeros. Sources: RFC 1321, RFC 2268. On Windows these are the defaults of
+/// the system's cryptographic service; on Linux nettle computes the same bytes.
 ///
-/// **What it is good for**: reading what other modules wrote, and writing what they can read. MD5 and RC2 keep nothing
-/// secret from someone who wants it, and nothing tells whether a message has been changed (docs/cryptography.md).
+/// **What it is good for.** It reads what other modules wrote, and writes what they can read. MD5 and RC2 do not
+/// protect a secret against a determined attacker, and nothing detects a changed message (docs/cryptography.md).
 ///
-/// Secrets come from the caller and are stored nowhere. What the library keeps of them is filled with zeros before its
-/// memory is released.
+/// The caller supplies the secrets; the library stores them nowhere. Memory in which it keeps anything of them is
+/// filled with zeros before it is released.
 ///
-/// \thread  one thread at a time; objects of their own may be used by any number of threads
+/// \thread one thread at a time for each object; different threads may use different objects
 
 #ifndef ZOR_BASIS_CRYPTO_CRYPT_H
 #define ZOR_BASIS_CRYPTO_CRYPT_H
@@ -37,25 +37,27 @@ public:
     Crypt(Crypt const&) = default;
     Crypt& operator=(Crypt const&) = default;
 
-    /// A new hash, owned by the caller. It may outlive the provider.
-    /// \error never null but where memory is short; `CrHash::isValid` tells whether the hash can be used
+    /// Makes a hash, owned by the caller. It may outlive the provider.
+    /// \error null only if memory is short; `CrHash::isValid` tells whether the hash can be used
     virtual CrHash* createHash() = 0;
-    /// A new key of what has been hashed so far, owned by the caller. Equal secrets give equal keys. The key may outlive
-    /// hash and provider.
-    /// \param hash  made by `createHash` of a provider; it takes no more data from now on. Null gives an invalid key
-    /// \error never null but where memory is short; `CrKey::isValid` tells whether the key can be used
+    /// Derives a key from the data hashed so far; the caller owns it. Equal secrets give equal keys. The key may
+    /// outlive hash and provider.
+    /// \param hash  comes from `createHash` of a provider and accepts no more data afterwards. Null gives an invalid
+    ///     key
+    /// \error null only if memory is short; `CrKey::isValid` tells whether the key can be used
     virtual CrKey* deriveKey(CrHash* hash) = 0;
-    /// Whether there is a cryptographic service behind it.
+    /// Tells whether the cryptographic service is available.
     virtual bool isValid() const = 0;
 
     virtual ~Crypt();
 
-    /// A new provider, owned by the caller.
-    /// \param name  \kept crypto-01: ignored, null included: there is one service only
-    /// \kept crypto-02: what the system keeps for a provider is never given back, so that its hashes and keys need no
-    ///     order of destruction. Make one for a process rather than one for a message
-    /// \kept crypto-03: where the service cannot be had, an invalid provider comes back and nobody is told why
-    /// \error null only where memory is short
+    /// Makes a provider, owned by the caller.
+    /// \param name  \kept crypto-01: the name is ignored and may be null: there is only one service
+    /// \kept crypto-02: the system's resources for a provider are never released, so its hashes and keys may be
+    ///     destroyed in any order. Make one provider per process rather than one per message
+    /// \kept crypto-03: if the service is not available, the function returns an invalid provider and does not report
+    ///     why
+    /// \error null only if memory is short
     static Crypt* make(char const* name);
 };
 

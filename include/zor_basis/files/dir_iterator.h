@@ -1,16 +1,16 @@
 /// \file
-/// `DirIteratorW`: lists one directory by wide names.
+/// `DirIteratorW`: lists the entries of one directory by wide name.
 ///
 ///     DirIteratorW list(LOOK_FILES, folder);
 ///     while (WChar const* name = list->next()) use(name, list->size());
 ///
-/// Entries come in the order of the system, unsorted, hidden ones included, "." and ".." never. The wildcard is the
-/// system's own under Windows (where "*.*" takes every name) and the one of `FPath::matchWildCard` on Linux, where a link
-/// is what it leads to, and a byte of a name that is not UTF-8 becomes U+DC80 to U+DCFF, which every function of this
-/// library that takes wide paths turns back.
+/// Entries come in the system's order, unsorted; hidden ones are included, "." and ".." are not. On Windows the system
+/// matches the wildcard ("*.*" matches every name), on Linux `FPath::matchWildCard` does. On Linux a link counts as its
+/// target, and a byte of a name that is not UTF-8 becomes U+DC80 to U+DCFF, which every function of this library that
+/// takes wide paths converts back.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
-/// \thread  one thread at a time
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_FILES_DIR_ITERATOR_H
 #define ZOR_BASIS_FILES_DIR_ITERATOR_H
@@ -24,56 +24,57 @@
 
 namespace ZOR_Basis {
 
-/// What a listing is, whatever the system. Made by `Make`, or held by a `DirIteratorW`.
+/// The interface of a listing on either system. `Make` creates one; a `DirIteratorW` holds one.
 class ZB_API DirIterImplW {
 public:
     virtual ~DirIterImplW() = default;
     DirIterImplW(DirIterImplW const&) = delete;
     DirIterImplW& operator=(DirIterImplW const&) = delete;
 
-    /// Ends a listing, so that the next `next()` begins again in the same directory.
+    /// Ends the listing; the next `next()` begins again in the same directory.
     virtual void finish() = 0;
-    /// The name of the next entry, valid until the next call.
-    /// \return null at the end, when `lastError()` tells why
+    /// Returns the name of the next entry, valid until the next call.
+    /// \return null at the end; `lastError()` then tells why
     virtual WChar const* next() = 0;
     /// \name What `next()` gave last
-    /// \pre it gave a name
+    /// \pre the last `next()` returned a name
     /// @{
     virtual bool isDir() = 0;
     virtual bool isFile() = 0;
-    /// Last write, seconds since 1970 UTC.
+    /// The time of the last write, in seconds since 1970 UTC.
     virtual std::int64_t time() = 0;
-    /// Bytes; 0 for a directory.
+    /// The size in bytes; 0 for a directory.
     virtual std::uint64_t size() = 0;
     /// @}
 
-    /// A listing of the system's kind. \return owned by the caller; null when memory runs out
+    /// Makes a listing for this system.
+    /// \return owned by the caller; null if memory runs out
     static DirIterImplW* Make(LookForType type, WChar const* path);
 
     void setPath(WStr const& path);
     void setPath(WChar const* path) { setPath(WStr(path)); }
-    /// Which entries to report; `LOOK_ANYCASE` is ignored here.
+    /// Sets which entries to report; `LOOK_ANYCASE` has no effect here.
     void setType(LookForType type) { type_ = type; }
-    /// The names to report; empty means "*".
+    /// Sets the names to report; empty means "*".
     void setWildCard(WStr const& wildcard) { wildcard_ = wildcard; }
     void setWildCard(WChar const* wildcard) { wildcard_ = wildcard; }
-    /// The same in the local encoding; what cannot be converted means "*".
+    /// The same in the local encoding; a text that cannot be converted means "*".
     void setWildCard(char const* wildcard);
 
     /// The directory.
-    /// \kept list-dir-01: from the first `next()` to `finish()` with the wildcard behind it
+    /// \kept list-dir-01: between the first `next()` and `finish()` the wildcard follows the directory
     WcPath const& getPath() const { return path_; }
-    /// Why the listing ended: 0 while it has not, 18 at its normal end, 2 where no name fits the wildcard, 3 where there is
-    /// no such directory, else the system's own code for the failure.
+    /// Tells why the listing ended: 0 if it has not, 18 at its normal end, 2 if no name matches the wildcard, 3 if
+    /// there is no such directory, otherwise the system's code for the failure.
     std::uint32_t lastError() const { return lastError_; }
 
 protected:
     DirIterImplW(LookForType type, WChar const* path) : path_(path), type_(type) {}
 
-    /// Appends the wildcard to the path for the length of a listing, and takes it away again.
+    /// Append the wildcard to the path for the duration of a listing, and remove it again.
     void appendWildCard();
     void removeWildCard();
-    /// Whether entries of a kind are reported.
+    /// Tells whether entries of a kind are reported.
     bool isWanted(bool isDirectory) const;
 
     WcPath path_;
@@ -95,7 +96,7 @@ public:
     DirIteratorW(DirIteratorW const&) = delete;
     DirIteratorW& operator=(DirIteratorW const&) = delete;
 
-    /// Null when memory ran out.
+    /// The listing; null if memory ran out.
     DirIterImplW* operator->() const { return impl_; }
 
 private:

@@ -1,14 +1,17 @@
 /// \file
-/// `FStat`: a snapshot of one entry of the file system.
+/// `FStat`: the status of one entry of the file system, as a snapshot.
 ///
-/// Kind, times and size come from one look and never change until the next `update`. A missing or unreachable entry
+/// Kind, times and size come from one query and do not change until the next `update`. A missing or unreachable entry
 /// gives a cleared snapshot: `ST_NONE`, all numbers 0.
 ///
-/// **Links.** Under Windows the system follows links. On Linux narrow paths do not, so that a link is `ST_LINK` and
-/// neither a file nor a directory, while wide paths do.
+///     FStat const stat(path);
+///     if (stat.isFile() && stat.size() > 0) print(path);
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
-/// \thread  one thread at a time for each object; the static forms are thread-safe
+/// **Links.** On Windows the system follows links. On Linux narrow paths do not follow a link, so that it is `ST_LINK`
+/// and neither a file nor a directory; wide paths do.
+///
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
+/// \thread one thread at a time for each object; the static forms are thread-safe
 
 #ifndef ZOR_BASIS_FILES_F_STAT_H
 #define ZOR_BASIS_FILES_F_STAT_H
@@ -31,53 +34,54 @@ public:
         ST_OTHER = 4, ///< any other kind
     };
 
-    /// Not examined yet.
+    /// Constructs a cleared status; nothing is examined.
     FStat() = default;
-    /// `update` and `updateW` at once.
+    /// Construct the status and examine the entry, by `update` or `updateW`.
     FStat(char const* path) { update(path, true); }
     FStat(char const* path, bool platformFallback) { update(path, platformFallback); }
     FStat(WChar const* path) { updateW(path); }
 
     /// Takes a new snapshot.
-    /// \param platformFallback  asks the platform layer where the system finds nothing: it may reach shares with other
-    ///        credentials
-    /// \return whether there is an entry; a null path is the empty one, which has none
-    /// \cost one system call for an entry that is there
+    /// \param platformFallback  asks the platform layer if the system finds nothing; that layer may reach shares with
+    ///     other credentials
+    /// \return whether the entry exists; a null path counts as empty, and nothing exists there
+    /// \cost one system call for an existing entry
     bool update(char const* path) { return update(path, true); }
     bool update(char const* path, bool platformFallback);
 
-    /// `update` that rides out transient errors of the network and of logging on: it tries again after a second for as
-    /// long as the system's last error is one of these.
+    /// `update` that survives transient network and logon errors: it tries again after a second as long as the last
+    /// error is one of these.
     ///
-    /// | last error | given up |
+    /// | last error | the call gives up |
     /// |---|---|
-    /// | 64, the network name is gone | when more than 5 further tries have failed so |
-    /// | 1326, logon failure | at the 101st, or at one that comes more than two minutes after the first failure |
-    /// | 5, access denied | at the sixth |
-    /// | any other | at once |
+    /// | 64, the network name is gone | when more than 5 further tries have failed with it |
+    /// | 1326, logon failure | at the 101st failure, or at one more than two minutes after the first |
+    /// | 5, access denied | at the sixth failure |
+    /// | any other | immediately |
     ///
-    /// On Linux ESTALE and the errors of unreachable hosts and networks stand for 64, EKEYREJECTED and its like for
-    /// 1326, EACCES for 5.
+    /// On Linux, ESTALE and the errors for unreachable hosts and networks count as 64, EKEYREJECTED and its like as
+    /// 1326, EACCES as 5.
     /// \cost blocks the calling thread for up to about two minutes
     bool updateMultiRetryNetwork(char const* path) { return updateMultiRetryNetwork(path, true); }
     bool updateMultiRetryNetwork(char const* path, bool platformFallback);
 
-    /// Takes a new snapshot by a wide path, following links.
-    /// \kept stat-02: the kind is `ST_DIR` or `ST_FILE`, whatever else there may be; the platform layer is not asked
+    /// Takes a new snapshot by wide path and follows links.
+    /// \kept stat-02: the kind of an existing entry is `ST_DIR` or `ST_FILE`, whatever else it may be; the platform
+    ///     layer is not asked
     bool updateW(WChar const* path);
 
     StatMode type() const { return type_; }
     bool exist() const { return type_ != ST_NONE; }
     bool isFile() const { return type_ == ST_FILE; }
     bool isDir() const { return type_ == ST_DIR; }
-    /// Bytes.
+    /// The size in bytes.
     std::uint64_t size() const { return size_; }
     /// Times in seconds since 1970 UTC. `created` is the time of the last change of status on Linux.
     std::int64_t modified() const { return modified_; }
     std::int64_t created() const { return created_; }
     std::int64_t accessed() const { return accessed_; }
 
-    /// The same of a snapshot taken now, with the platform layer as fallback.
+    /// The same for a snapshot taken by this call, with the platform layer as fallback.
     static StatMode type(char const* path) { return FStat(path).type(); }
     static bool exist(char const* path) { return FStat(path).exist(); }
     static bool isFile(char const* path) { return FStat(path).isFile(); }

@@ -1,5 +1,5 @@
 /// \file
-/// `FileEntry`: the record of one entry that a walk or a listing has found.
+/// `FileEntry`: the record of one entry that a walk or a listing has found: directory, name, kind, size and time.
 
 #ifndef ZOR_BASIS_FILES_FILE_ENTRY_H
 #define ZOR_BASIS_FILES_FILE_ENTRY_H
@@ -13,26 +13,26 @@
 
 namespace ZOR_Basis {
 
-/// One thread at a time.
+/// \thread one thread at a time
 class ZB_API FileEntry {
 public:
     using EntryType = FStat::StatMode;
 
-    /// Stores what is given and joins the full path; the file system is not asked.
-    /// \param size  bytes, 0 for a directory
-    /// \param time  last write, seconds since 1970 UTC
+    /// Stores the arguments and joins the full path; the file system is not asked.
+    /// \param size  counts bytes; 0 for a directory
+    /// \param time  is that of the last write, in seconds since 1970 UTC
     FileEntry(EntryType type, Str const& dir, char const* name, std::uint64_t size, std::int64_t time);
-    /// Stores directory, name and time, and takes kind and size from the file system (`Refresh`).
+    /// Stores directory, name and time, and reads kind and size from the file system (`Refresh`).
     FileEntry(Str const& dir, Str const& name, std::int64_t time);
     FileEntry(Str const& dir, char const* name, std::int64_t time);
-    /// Splits the full path into directory and name, and takes kind and size from the file system. The time is 0.
+    /// Splits the full path into directory and name, and reads kind and size from the file system. The time is 0.
     FileEntry(Str const& fullPath);
     FileEntry(FileEntry const& other) = default;
     FileEntry(FileEntry&& other) = default;
     FileEntry& operator=(FileEntry const& other) = default;
     FileEntry& operator=(FileEntry&& other) = default;
 
-    /// The directory that holds the entry.
+    /// The directory that contains the entry.
     FPath const& getDir() const { return dir_; }
     BufStr<255> const& getName() const { return name_; }
     FPath const& getFullPath() const { return fullPath_; }
@@ -43,14 +43,14 @@ public:
     bool isFile() const { return type_ == FStat::ST_FILE; }
     bool isDir() const { return type_ == FStat::ST_DIR; }
 
-    /// Joins the full path of directory and name.
+    /// Joins the full path from directory and name.
     void updateFullPath();
 
-    /// Takes kind and size from the file system, with the platform layer as fallback. The full path is joined first if it
-    /// is empty; otherwise directory and name are split from it.
-    /// \kept entry-01: of a regular file the size is refreshed and the time is not; of what is gone both become 0; of
-    ///     anything else only the size does
-    /// \return whether the kind has changed, or the size of what is a regular file now
+    /// Reads kind and size from the file system, with the platform layer as fallback. If the full path is empty it is
+    /// joined first; otherwise directory and name are split from it.
+    /// \kept entry-01: for a regular file the size is refreshed and the time is not; for an entry that is gone both
+    ///     become 0; for any other entry only the size becomes 0
+    /// \return whether the kind has changed, or the size of an entry that is a regular file now
     bool Refresh();
 
 private:

@@ -1,5 +1,5 @@
 /// \file
-/// `LookForType`: which entries a listing reports.
+/// `LookForType`: selects the entries that a listing or a walk reports.
 
 #ifndef ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
 #define ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
@@ -12,8 +12,8 @@ enum LookForType : std::uint32_t {
     LOOK_ALL = 0,
     LOOK_FILES = 1,
     LOOK_DIRS = 2,
-    LOOK_BOTH = 3,    ///< the same as `LOOK_ALL`
-    LOOK_ANYCASE = 4, ///< may be added: the wildcard matches whatever the case of the letters, where a listing heeds it
+    LOOK_BOTH = 3,    ///< in a listing the same as `LOOK_ALL`, which a walk takes for `LOOK_DIRS`
+    LOOK_ANYCASE = 4, ///< may be added: the wildcard ignores case, in listings that support this
 };
 
 constexpr LookForType operator|(LookForType a, LookForType b) {

@@ -1,5 +1,5 @@
 /// \file
-/// The step by which paths grow: a component with a separator before it. Users have no need of it.
+/// The step by which paths grow: a component with a separator before it. Not meant for users.
 
 #ifndef ZOR_BASIS_FILES_PATH_JOIN_H
 #define ZOR_BASIS_FILES_PATH_JOIN_H
@@ -10,7 +10,8 @@
 
 namespace ZOR_Basis::detail {
 
-/// Appends a component, with "/" before it where `separate` asks for one. One block at most, of exactly the new length.
+/// Appends a component, with "/" before it if `separate` is true. Allocates one block at most, of exactly the new
+/// length.
 template <class String, class Char>
 void joinPath(String& path, Char const* text, std::uint64_t len, bool separate) {
     using Text = InlineText<String, Char, 255>;

@@ -1,5 +1,5 @@
 /// \file
-/// `Size`: an unsigned 64-bit count as a value that can be a key.
+/// `Size`: an unsigned 64-bit count as a value type that can be a key of ordered and hashed containers.
 
 #ifndef ZOR_BASIS_FILES_SIZE_H
 #define ZOR_BASIS_FILES_SIZE_H
@@ -16,8 +16,8 @@ public:
     Size() = default;
     Size(std::uint64_t value) : value_(value) {}
     /// The absolute value of an `int`.
-    /// \kept stat-01: it is taken in 32 bits and then widened with its sign, so that the most negative `int` becomes
-    ///     0xFFFFFFFF80000000
+    /// \kept stat-01: the absolute value is computed in 32 bits and then sign-extended, so the most negative `int`
+    ///     becomes 0xFFFFFFFF80000000
     Size(int value) : value_(absolute(value)) {}
     /// Any other integer by its value.
     template <std::integral I>

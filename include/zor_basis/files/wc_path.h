@@ -1,11 +1,12 @@
 /// \file
-/// `WcPath`: a wide path, the twin of `FPath` in 16-bit code units, for names beyond the local encoding.
+/// `WcPath`: a path as wide text, the counterpart of `FPath` in 16-bit code units, for names that the local encoding
+/// lacks.
 ///
-/// The members do what those of `FPath` do, except where a `\kept` line says otherwise; there are no wide forms of
-/// `ParseUrl`, `addDecodedUrl` and the translating constructors.
+/// The members behave like those of `FPath` unless a `\kept` line says otherwise. `ParseUrl`, `addDecodedUrl` and the
+/// translating constructors have no wide form.
 ///
-/// \thread  one thread at a time for each object. `pathRoot` is filled once, whichever thread asks first; an application sets
-///     or clears it while no other thread uses wide paths
+/// \thread one thread at a time for each object. `pathRoot` is filled once, whichever thread asks first; an application
+///     may set or clear it only while no other thread uses wide paths
 
 #ifndef ZOR_BASIS_FILES_WC_PATH_H
 #define ZOR_BASIS_FILES_WC_PATH_H
@@ -33,9 +34,9 @@ public:
     static constexpr WChar slashGood = BACK_SLASH;
     static constexpr WChar slashBad = FORW_SLASH;
 
-    /// The root folder in wide form. Filled at the first test for a fake root from `Sys::root()`, which is UTF-8; while
-    /// that cannot be converted, or is empty, this stays empty and the next test tries again. What an application puts here
-    /// is the root of all wide paths from then on; once it is cleared the next test fills it again.
+    /// The root folder in wide form. The first test for a fake root fills it from `Sys::root()`, which is UTF-8; while
+    /// that is empty or cannot be converted, this stays empty and the next test tries again. An application may assign
+    /// another root, which then holds for all wide paths; if it clears the root, the next test fills it again.
     static WcPath pathRoot;
 
     WcPath() = default;
@@ -56,15 +57,15 @@ public:
     WcPath& assign(WStr const& a, WStr const& b);
     WcPath& assign(WStr const& a, WChar const* b) { return assign(a, WStr(b)); }
 
-    /// Appends a component, with "/" before it where the path is not empty and does not end in a slash.
-    /// \kept path-07: unlike `FPath`, either kind counts as an end: "dir\" and "x" give "dir\x"
+    /// Appends a component, with "/" before it unless the path is empty or ends in a slash.
+    /// \kept path-07: unlike in `FPath`, either kind of slash counts as a separator: "dir\" and "x" give "dir\x"
     WcPath& add(WChar const* text, std::uint64_t len = 0) {
         // kept path-07: wide paths come from the system, which ends folders in a backslash
         detail::joinPath<WBStr>(*this, text, len, size_ != 0 && !isSlash(text_[size_ - 1]));
         return *this;
     }
     WcPath& add(WStr const& text) { return add(text.wstr(), text.size()); }
-    /// Appends a component of one unit; 0 is none.
+    /// Appends a component of one code unit; 0 appends nothing.
     template <std::same_as<WChar> C>
     WcPath& add(C c) {
         return add(&c, 1);
@@ -85,15 +86,15 @@ public:
     static void replaceSlashes(WChar* text);
     WcPath& normalize(WChar const* source, bool url);
 
-    /// Puts `pathRoot` in place of a path that is a fake root.
-    /// \kept path-08: unlike for `FPath`, the whole path is compared: "/scsi0" becomes the root while "/scsi0/tmp" stays;
-    ///       and a path that equals `pathRoot` counts as fake, so that its first six characters, or all that it has, make
-    ///       place for the root
+    /// Replaces a path that is a fake root by `pathRoot`.
+    /// \kept path-08: unlike in `FPath`, the whole path is compared: "/scsi0" becomes the root, "/scsi0/tmp" does not
+    ///     change. A path that equals `pathRoot` counts as fake, so its first six characters, or all if it has fewer,
+    ///     are replaced by the root
     WcPath& translateRoot();
     WcPath& translateRoot(WStr const& text) { return translateRoot(text.wstr(), text.size()); }
     WcPath& translateRoot(WChar const* text, std::uint64_t len = 0);
 
-    /// Becomes the network path of a "file" URL, with its percent escapes decoded as `FPath::addDecodedUrl` does; each
+    /// Assigns the network path of a "file" URL, with its percent escapes decoded like `FPath::addDecodedUrl`; each
     /// escape gives one code unit.
     bool ConvertFileURLtoUNC(WChar const* url);
     bool ConvertFileURLtoUNC(WStr const& url);
@@ -110,7 +111,7 @@ public:
     static bool isDos(WChar const* text);
     bool isURL() const { return isURL(text_); }
     static bool isURL(WChar const* text);
-    /// Is, as a whole, a slash and a fake root, or equals `pathRoot` and begins with a slash.
+    /// Tells whether the whole path is a slash and a fake root, or equals `pathRoot` and begins with a slash.
     bool isFake() const { return isFake(text_); }
     static bool isFake(WChar const* text);
     bool isWildCard() const { return isWildCard(text_); }

@@ -1,6 +1,6 @@
 /// \file
-/// The compiler's words under one name each: inlining, targets, tests of the processor, sanitizers. Users have no need of
-/// them.
+/// The compiler's words under one name each: inlining, targets, tests of the processor, sanitizers. They are for the library's
+/// own headers.
 ///
 /// A function that carries a target runs only where the test of the same name holds; it may inline plain functions, while
 /// plain functions cannot inline it.

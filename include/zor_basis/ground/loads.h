@@ -1,6 +1,6 @@
 /// \file
-/// Loads, stores and tests for zeros, of words and of vectors of 16 bytes, at any alignment. Users have no need of them.
-/// basis/ground/wide_loads.h has the same for longer vectors.
+/// Loads, stores and tests for zeros, of words and of vectors of 16 bytes, at any alignment, for the library's own
+/// headers. basis/ground/wide_loads.h has the same for longer vectors.
 
 #ifndef ZOR_BASIS_GROUND_LOADS_H
 #define ZOR_BASIS_GROUND_LOADS_H

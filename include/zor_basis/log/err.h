@@ -1,5 +1,5 @@
 /// \file
-/// `Err`: the entry points of an error log that is switched off.
+/// `Err`: the entry points of an error log that is always off.
 
 #ifndef ZOR_BASIS_LOG_ERR_H
 #define ZOR_BASIS_LOG_ERR_H
@@ -8,9 +8,9 @@
 
 namespace ZOR_Basis {
 
-/// Callers may keep their calls: nothing is looked at and nothing happens.
+/// Callers may keep their calls; the functions ignore their arguments and do nothing.
 ///
-/// \thread  thread-safe
+/// \thread thread-safe
 class ZB_API Err {
 public:
     static void err(char const* text);

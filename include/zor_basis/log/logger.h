@@ -1,5 +1,5 @@
 /// \file
-/// `Logger`: what a `Log` writes to.
+/// `Logger`: the interface that a `Log` writes to.
 
 #ifndef ZOR_BASIS_LOG_LOGGER_H
 #define ZOR_BASIS_LOG_LOGGER_H
@@ -8,19 +8,20 @@
 
 namespace ZOR_Basis {
 
-/// \thread  thread-safe until it has been closed
+/// \thread thread-safe until it has been closed
 class ZB_API Logger {
 public:
     Logger() = default;
     Logger(Logger const&) = delete;
     Logger& operator=(Logger const&) = delete;
 
-    /// What follows goes to a file of its own.
+    /// Begins a new file for all lines that follow.
     virtual void newSession() = 0;
     /// Adds one line.
-    /// \param line  text with room for two characters behind it, where the logger puts the line's end and a terminator
+    /// \param line  has room for two characters behind the text, where the logger puts the end of the line and a
+    ///     terminator
     virtual void out(char* line) = 0;
-    /// Asks the logger to write out what it has and to end itself. The caller forgets it.
+    /// Asks the logger to write its lines and then delete itself. The caller must not use it afterwards.
     virtual void close() = 0;
     virtual ~Logger();
 };

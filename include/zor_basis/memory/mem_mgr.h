@@ -1,15 +1,18 @@
 /// \file
-/// `MemMgr`: allocation policies that are chosen at run time; `MemMgrPtr`: the owner of one.
+/// `MemMgr`: an allocation policy that is chosen at run time. `MemMgrPtr`: owns one.
 ///
 /// | made by | `alloc(size)` | `alloc()` | `free(p, size)` | `free(p)` |
 /// |---|---|---|---|---|
 /// | `makeStd` | the runtime's heap | null | the runtime's heap | the runtime's heap |
-/// | `makeSmlBlk` | an element, null for more than its size | an element | gives it back | gives it back |
-/// | `makeStack` | always the end of the current block | null | the runtime's heap | nothing |
+/// | `makeSmlBlk` | an element; null if `size` exceeds it | an element | returns it | returns it |
+/// | `makeStack` | always the end of the current block | null | the runtime's heap | does nothing |
 ///
-/// Sizes are in bytes. Null is what comes back where memory runs short, and freeing null does nothing.
+/// Sizes are in bytes. If memory is short, `alloc` returns null. Freeing null does nothing.
 ///
-/// \thread  the standard manager as the runtime's heap; the others one thread at a time
+///     MemMgrPtr nodes(MemMgr::makeSmlBlk(sizeof(Node), 100, 10000, alignof(Node)));
+///     if (void* place = nodes->alloc()) list = new (place) Node;
+///
+/// \thread the standard manager: like the runtime's heap; the others: one thread at a time
 
 #ifndef ZOR_BASIS_MEMORY_MEM_MGR_H
 #define ZOR_BASIS_MEMORY_MEM_MGR_H
@@ -22,45 +25,48 @@
 
 namespace ZOR_Basis {
 
-/// The interface, and the standard manager.
+/// The interface and the standard manager.
 class ZB_API MemMgr {
 public:
     MemMgr(MemMgr const&) = delete;
     MemMgr& operator=(MemMgr const&) = delete;
 
     virtual void* alloc(std::uint64_t size);
-    /// One element of the manager's fixed size, where it has one.
+    /// Allocates one element of the manager's fixed size, if it has one.
     virtual void* alloc();
     virtual void free(void* p, std::uint64_t size);
     virtual void free(void* p);
-    /// Releases everything that a manager has taken, given back or not.
+    /// Releases all memory that the manager has allocated, freed by the user or not.
     virtual ~MemMgr();
 
-    /// The standard manager, one for the whole process. Never deleted, never given to a `MemMgrPtr`.
+    /// Returns the standard manager, one for the whole process. It must not be deleted or passed to a `MemMgrPtr`.
     static MemMgr* makeStd();
 
-    /// A manager of elements of one size, carved from chunks of memory without any header.
+    /// Makes a manager of elements of one size, carved from chunks without a header for each element.
     ///
-    /// The last element freed is the first to be allocated again. Chunks are carved from their end downwards; the first is
-    /// made at once and has room for the larger of `count` and 16 elements, at most 1 MiB; each next one has twice the
-    /// size, up to room for `maxCount`, at most 4 MiB. Nothing goes back to the heap before the manager is deleted.
-    /// \param elemSize  rounded up to the alignment
-    /// \param count     elements expected at first
-    /// \param maxCount  elements expected at most; counts only from four times the first number on, else chunks stop
-    ///                  growing at four times the first
-    /// \param align     2 for less than 4, 4 for less than 8, else 8
-    /// \kept memory-01: elements smaller than a pointer are not widened, so that freeing one writes into its neighbour;
-    ///     such elements are only allocated
-    /// \error elements that do not fit the largest chunk are refused: `alloc` gives null
-    /// \pre what is freed came from this manager and is freed once
-    /// \return owned by the caller; null when memory runs out
+    /// The element freed last is allocated again first. Chunks are carved from their end downwards. This function
+    /// allocates the first one, with room for the larger of `count` and 16 elements, at most 1 MiB; each further chunk
+    /// has twice the size, up to room for `maxCount` elements, at most 4 MiB. No memory returns to the heap before the
+    /// manager is deleted.
+    /// \param elemSize  is rounded up to the alignment
+    /// \param count  is the number of elements expected at first
+    /// \param maxCount  is the largest number of elements expected; it has an effect only from four times the first
+    ///     number on, otherwise chunks stop growing at four times the first
+    /// \param align  selects the alignment: 2 if less than 4, 4 if less than 8, otherwise 8
+    /// \kept memory-01: elements smaller than a pointer are not widened, so freeing one writes into its neighbour; such
+    ///     elements must only be allocated
+    /// \error `alloc` returns null for elements that do not fit the largest chunk
+    /// \pre an element that is freed came from this manager and is freed once
+    /// \return owned by the caller; null if memory is short
     static MemMgr* makeSmlBlk(std::uint64_t elemSize, std::uint64_t count, std::uint64_t maxCount, std::uint64_t align);
 
-    /// A manager that hands out the end of a block.
-    /// \kept memory-02: it never advances: every `alloc(size)` gives the same address, one past the block, whatever the size
-    /// \param blockSize  of the buffer, or of the block that the first `alloc(size)` takes from the heap without one
-    /// \param buffer  borrowed until the manager is deleted; may be null
-    /// \return owned by the caller; null when memory runs out
+    /// Makes a manager that returns the end of a block.
+    /// \kept memory-02: the manager never advances: every `alloc(size)` returns the same address, one past the block,
+    ///     whatever the size
+    /// \param blockSize  is the size of the buffer, or, without one, of the block that the first `alloc(size)` takes
+    ///     from the heap
+    /// \param buffer  is borrowed until the manager is deleted; may be null
+    /// \return owned by the caller; null if memory is short
     static MemMgr* makeStack(std::uint64_t blockSize, void* buffer);
 
 protected:
@@ -69,10 +75,10 @@ protected:
     static MemMgr _Only;
 };
 
-/// Owns a manager for the length of a scope. Lives on the stack or in another object, never on the heap by itself.
+/// Owns a manager for the duration of a scope. It lives on the stack or in another object, never on the heap by itself.
 class ZB_API MemMgrPtr : public detail::NotDeletable<MemMgrPtr> {
 public:
-    /// \param manager  adopted; may be null, is never the standard manager
+    /// \param manager  is adopted; may be null, must not be the standard manager
     MemMgrPtr(MemMgr* manager = nullptr) : manager_(manager) {}
     MemMgrPtr(MemMgrPtr const&) = delete;
     MemMgrPtr& operator=(MemMgrPtr const&) = delete;

@@ -1,7 +1,7 @@
 /// \file
-/// `DictEntry<Blob, Blob>`: a key of a dictionary with its value.
+/// `DictEntry<Blob, Blob>`: a key and its value in a dictionary.
 ///
-/// \thread  one thread at a time
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_STORE_DICT_ENTRY_H
 #define ZOR_BASIS_STORE_DICT_ENTRY_H
@@ -13,7 +13,7 @@ namespace ZOR_Basis {
 template <class K, class V>
 class DictEntry {
 public:
-    /// With an empty value. A moved entry is copied, as blobs are.
+    /// Constructs an entry with an empty value. Moving an entry copies it, like a blob.
     DictEntry(K const& newKey) : key(newKey) {}
     DictEntry(K const& newKey, V const& newValue) : key(newKey), value(newValue) {}
     DictEntry(DictEntry const& other) = default;
@@ -22,12 +22,12 @@ public:
     DictEntry& operator=(DictEntry&& other) noexcept = default;
 
     bool eq(K const& other) const { return key == other; }
-    /// Copies a value, unless it is the entry's own.
+    /// Assigns a copy of a value, unless it is the entry's own.
     void set(V const& other) {
         if (&other != &value) value = other;
     }
 
-    /// Whether key or value differ.
+    /// Tells whether key or value differ.
     bool operator!=(DictEntry const& other) const { return key != other.key || value != other.value; }
     /// Orders by the keys alone.
     bool operator<(DictEntry const& other) const { return key < other.key; }

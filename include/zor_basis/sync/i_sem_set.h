@@ -1,7 +1,7 @@
 /// \file
-/// `ISemSet`: what a set of locks by number offers. Held by a `SemSet`.
+/// `ISemSet`: the interface of a set of locks by number. A `SemSet` holds one.
 ///
-/// \thread  thread-safe, destruction excepted
+/// \thread thread-safe, except destruction
 
 #ifndef ZOR_BASIS_SYNC_I_SEM_SET_H
 #define ZOR_BASIS_SYNC_I_SEM_SET_H
@@ -19,12 +19,13 @@ public:
     ISemSet& operator=(ISemSet const&) = delete;
     virtual ~ISemSet();
 
-    /// Locks a key; waits without limit. The holder may take it again.
-    /// \return false where the platform layer fails. Every take that reached the key's own mutex wants its `give`, even
-    ///         one that failed there, or the key's book-keeping stays until the set is destroyed
+    /// Locks a key; waits without limit. The holder may take the key again.
+    /// \return false if the platform layer fails. Every `take` that reached the key's own mutex must be matched by a
+    ///     `give`, even one that failed there; otherwise the key's entry stays until the set is destroyed
     virtual bool take(std::uint64_t key) = 0;
-    /// Unlocks a key. \pre this thread took it
-    /// \return false where the platform layer fails, and for a key that nobody took
+    /// Unlocks a key.
+    /// \pre this thread has taken the key
+    /// \return false if the platform layer fails, and for a key that is not taken
     virtual bool give(std::uint64_t key) = 0;
 };
 

@@ -1,7 +1,12 @@
 /// \file
-/// `Lock`: one semaphore of the platform layer, locked and unlocked by hand.
+/// `Lock`: one semaphore of the platform layer, locked and unlocked explicitly.
 ///
-/// \thread  thread-safe, construction and destruction excepted
+///     Lock lock(Lock::Mutex, false);
+///     lock.lock();
+///     ++shared;
+///     lock.unlock();
+///
+/// \thread thread-safe, except construction and destruction
 
 #ifndef ZOR_BASIS_SYNC_LOCK_H
 #define ZOR_BASIS_SYNC_LOCK_H
@@ -16,16 +21,17 @@ class ZB_API Lock {
 public:
     enum Type : std::uint32_t {
         Binary = 0, ///< any thread may unlock
-        Mutex = 1,  ///< the locking thread unlocks, and may lock again meanwhile; so is any other value
+        Mutex = 1,  ///< the locking thread unlocks, and may lock again meanwhile; any other value means the same
     };
 
-    /// \param locked  begins locked: a mutex by the calling thread, a binary semaphore by nobody, so that the first `lock`
-    ///        of whatever thread waits for an `unlock`
-    /// \error a semaphore that cannot be made leaves a lock that locks nothing
+    /// \param locked  makes the lock begin locked: a mutex by the calling thread; a binary semaphore without an owner,
+    ///     so that the first `lock` by any thread waits for an `unlock`
+    /// \error if the semaphore cannot be made, the lock locks nothing
     Lock(Type type, bool locked);
     Lock(Lock const&) = delete;
-    /// Shares the semaphore.
-    /// \kept sync-01: both objects destroy it, so a lock that is in use is never assigned; what this one had is lost
+    /// Shares the other's semaphore.
+    /// \kept sync-01: both objects destroy the shared semaphore, so a lock in use must not be assigned; the semaphore
+    ///     that this object had is leaked
     Lock& operator=(Lock const& other);
     /// Destroys the semaphore, locked or not.
     ~Lock();

@@ -1,5 +1,9 @@
 /// \file
-/// `MTQ_Dat`: one job of a `MultiTaskQueue`; `MTQ_Arg`: the base of arguments that a queue may own.
+/// `MTQ_Dat`: one job of a `MultiTaskQueue`. `MTQ_Arg`: the base class of arguments that a queue may own.
+///
+///     for (MTQ_Dat* job = queue->first(); job != nullptr; job = queue->next()) {
+///         if (job->finished() && !job->result()) report(job->argument());
+///     }
 
 #ifndef ZOR_BASIS_SYNC_MTQ_DAT_H
 #define ZOR_BASIS_SYNC_MTQ_DAT_H
@@ -14,37 +18,39 @@ namespace ZOR_Basis {
 class JobEntry;
 class MultiTaskQueue;
 
-/// A job's argument that its queue deletes.
+/// The base class of a job's argument that the queue deletes.
 class ZB_API MTQ_Arg {
 public:
     virtual ~MTQ_Arg();
 };
 
-/// Made and owned by its queue. What it tells may be asked for while the job runs.
+/// The queue makes and owns it. All queries are allowed while the job runs.
 ///
-/// \thread  thread-safe, as long as the queue keeps it
+/// \thread thread-safe, as long as the queue keeps it
 class ZB_API MTQ_Dat {
 public:
-    /// \return false when the job has failed
+    /// The work of a job.
+    /// \return false if the job has failed
     using Function = bool (*)(void* argument);
 
     MTQ_Dat(MTQ_Dat const&) = delete;
     MTQ_Dat& operator=(MTQ_Dat const&) = delete;
 
-    /// What the job's function returned; false until then.
+    /// The result of the job's function; false until it has returned.
     bool result() const { return result_.load(std::memory_order_acquire); }
-    /// Whether a task has been asked for.
+    /// Tells whether a task has been requested.
     bool started() const { return started_.load(std::memory_order_acquire); }
-    /// Whether the function has returned, or its task could not be made. What the function wrote can be read then.
+    /// Tells whether the function has returned, or its task could not be made. If so, everything that the function
+    /// wrote is visible.
     bool finished() const { return finished_.load(std::memory_order_acquire); }
     void* argument() const { return argument_; }
 
-    /// Has the queue drop this record when the job finishes; nothing if it has finished already.
+    /// Makes the queue drop this record when the job finishes; no effect if it has finished already.
     void setRemoveWhenDone() { removeWhenDone_.store(true, std::memory_order_release); }
 
-    /// Gives the job its task, whatever the queue's limit, policy and failures are.
-    /// \kept queue-03: the queue counts the end of such a job and not its start: its running count may become -1, `wait`
-    ///     does not wait for it, and a task that cannot be made is no failure of the queue
+    /// Creates the job's task, regardless of the queue's limit, policy and failures.
+    /// \kept queue-03: the queue counts the end of such a job but not its start: its running count may become -1,
+    ///     `wait` does not wait for the job, and a task that cannot be made is not a failure of the queue
     /// \pre the job has not been started
     /// \return whether the task was made
     bool start();
@@ -74,7 +80,7 @@ private:
     std::atomic<bool> removeWhenDone_;
     std::atomic<bool> result_{false};
     std::atomic<std::uint64_t> task_{0};
-    /// `start` is at work; the task may come to its end before it.
+    /// `start` is running; the task may end before `start` does.
     std::atomic<bool> starting_{false};
 };
 

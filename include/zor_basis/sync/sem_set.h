@@ -1,13 +1,13 @@
 /// \file
-/// `SemSet`: locks by number, for as many objects as there are, without a lock for each of them.
+/// `SemSet`: locks by number, for any number of objects, without a permanent lock for each of them.
 ///
 ///     SemSet jobs(1000);
 ///     if (jobs->take(jobNumber)) { ...; jobs->give(jobNumber); }
 ///
-/// A key has a mutex of its own from the first `take` to the last `give`. Keys are spread over buckets; two that share
-/// one share only a moment of book-keeping, never their mutexes.
+/// A key has its own mutex from the first `take` to the last `give`. Keys are spread over buckets; two keys in one
+/// bucket share only brief book-keeping, never a mutex.
 ///
-/// \thread  thread-safe, construction and destruction excepted
+/// \thread thread-safe, except construction and destruction
 
 #ifndef ZOR_BASIS_SYNC_SEM_SET_H
 #define ZOR_BASIS_SYNC_SEM_SET_H
@@ -21,14 +21,15 @@ namespace ZOR_Basis {
 
 class ZB_API SemSet {
 public:
-    /// \param size  keys that are held at once, roughly: there are as many buckets as the largest prime not above the
-    ///        largest power of 2 not above it. 0 and 1 give one bucket
-    /// \error  without memory for the buckets nothing can be taken
+    /// \param size  is roughly the number of keys held at the same time. The number of buckets is the largest prime not
+    ///     above the largest power of 2 not above `size`. 0 and 1 give one bucket
+    /// \error if memory for the buckets is short, no key can be taken
     SemSet(std::size_t size);
-    /// For 31 keys, in 13 buckets.
+    /// Makes a set for 31 keys, with 13 buckets.
     SemSet() : SemSet(31) {}
     SemSet(SemSet const&) = delete;
-    /// Shares the set; both objects delete it, so that one in use is never assigned, and what this one had is lost.
+    /// Shares the other's set. Both objects delete it, so a set in use must not be assigned; the set that this object
+    /// had is leaked.
     SemSet& operator=(SemSet const& other);
     ~SemSet();
 

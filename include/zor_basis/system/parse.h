@@ -1,14 +1,22 @@
 /// \file
 /// `ZB_Parse`: reads a text in memory line by line, forwards only: a job ticket, a list of files.
 ///
-/// Every reading call first skips white space as the runtime's `isspace` has it. Line ends are white space, so empty lines
-/// never show, and neither do blanks at a line's front. The line then goes up to, and does not take, a line feed, a
-/// carriage return, a byte 0 or the text's end; blanks at its end belong to it.
+/// Every call that reads first skips white space, as the runtime's `isspace` defines it. Line ends are white space, so
+/// empty lines and leading blanks are never returned. The line then extends up to a line feed, a carriage return, a
+/// byte 0 or the end of the text, which it does not include; trailing blanks belong to it.
 ///
-/// No byte at or behind the given size is ever looked at. At the end every line is empty.
+/// Bytes at and beyond the given size are never read. At the end of the text every line is empty.
 ///
-/// \kept parse-01: a byte 0 is neither white space nor part of a line, so nothing behind it is ever reached
-/// \thread  one thread at a time
+///     ZB_Parse ticket(data, size);
+///     if (!ticket.checkLine("BEGIN")) return false;
+///     char line[256];
+///     while (ticket.skipBlanks() != 0 && !ticket.isDataEnd()) { // a byte 0 ends the text, too
+///         ticket.getLine(255, line, nullptr);
+///         use(line);
+///     }
+///
+/// \kept parse-01: a byte 0 is neither white space nor part of a line, so nothing behind it is ever read
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_SYSTEM_PARSE_H
 #define ZOR_BASIS_SYSTEM_PARSE_H
@@ -23,38 +31,38 @@ class FPath;
 
 class ZB_API ZB_Parse {
 public:
-    /// Reads from the front.
-    /// \param data  borrowed for the life of this object; not null unless the size is 0
-    /// \param size  in bytes; below 0 is as 0
+    /// Begins at the front of the text.
+    /// \param data  is borrowed for the life of this object; may be null only if the size is 0
+    /// \param size  counts bytes; a negative one counts as 0
     ZB_Parse(char const* data, int size) : data_(data), size_(size) {}
 
     /// Skips white space.
-    /// \return 0 at the end of the text; else the last character that was looked at: the first that is no white space, or
-    ///         the text's last one; as a `char`, so above 127 below 0
+    /// \return 0 at the end of the text; otherwise the last character examined: the first that is not white space, or
+    ///     the last of the text. It is a `char` value, so bytes above 127 come out negative
     int skipBlanks();
 
     bool isDataEnd() const { return position_ >= size_; }
-    /// Line feed and carriage return only.
+    /// Tells whether a character is a line feed or a carriage return.
     static bool isEndOfLine(char c) { return c == '\n' || c == '\r'; }
 
-    /// Reads a line, or as much of it as is asked for; the next call goes on right behind that.
-    /// \param maximum  bytes to read at most
-    /// \param out  room for `maximum` + 1 bytes; receives the line and a terminator
-    /// \param length  null, or receives the line's length
-    /// \return whether a line end follows; false where the line goes on, and at a byte 0 and at the text's end
+    /// Reads a line, or its first part; the next call continues right behind it.
+    /// \param maximum  limits the bytes that are read
+    /// \param out  has room for `maximum` + 1 bytes; receives the line and a terminator
+    /// \param length  receives the line's length; may be null
+    /// \return whether a line end follows; false if the line continues, at a byte 0, and at the end of the text
     bool getLine(int maximum, char* out, int* length);
 
-    /// Reads a line, of a longer one the first 256 bytes, and compares it with a text; it is read whatever comes out.
-    /// \kept parse-02: blanks at the line's end count, as do upper and lower case: "BEGIN " is not "BEGIN"
-    /// \param expected  null is the empty text
+    /// Reads a line, at most 256 bytes of it, and compares it with a text. The line is consumed whatever the result.
+    /// \kept parse-02: trailing blanks and letter case count: "BEGIN " does not equal "BEGIN"
+    /// \param expected  is the text to compare with; null counts as the empty text
     bool checkLine(char const* expected);
 
-    /// Reads a line, of a longer one the first 255 bytes, as a path, with the root folder in place of a fake root, and looks
-    /// whether it is there.
-    /// \param path  receives the path, whether it is there or not; stays as it was at the end of the text
-    /// \param fileOnly  does without directories
-    /// \param forwardSlashes  turns every "\" in the path into "/"
-    /// \return whether the path is that of a regular file or a directory
+    /// Reads a line, at most 255 bytes of it, as a path, replaces a fake root by the root folder, and checks whether
+    /// the path exists.
+    /// \param path  receives the path, whether it exists or not; unchanged at the end of the text
+    /// \param fileOnly  rejects directories
+    /// \param forwardSlashes  replaces every "\" in the path by "/"
+    /// \return whether the path names a regular file or, without `fileOnly`, a directory
     bool getCleanFileName(FPath& path, bool fileOnly, bool forwardSlashes);
 
 private:

@@ -1,23 +1,30 @@
 /// \file
-/// `Process`: starting, awaiting and ending other programs, and functions of libraries found by name.
+/// `Process`: starts, awaits and ends other programs, and finds functions of shared libraries by name.
 ///
-/// A process is known by its identifier, which the system may give to another one once it has ended. The library keeps
-/// nothing open between two calls.
+/// A process is known by its identifier. Once it has ended the system may give that identifier to another process. The
+/// library keeps nothing open between two calls.
 ///
 /// | | Windows | Linux |
 /// |---|---|---|
-/// | the command line | the program's own runtime takes it apart | taken apart by the same rules, without a shell |
-/// | no `application` | the first word is searched for in the program's folder, the current one, the system's and `PATH` | in `PATH`, unless it has a slash |
-/// | what is inherited | environment and current folder; the program gets a console of its own | the same, and descriptors 0 to 2 |
-/// | the exit code | the program's | the program's; of one that a signal ended 128 + the signal |
-/// | ended and not awaited | its identifier is soon unknown: `Wait` and `Terminate` fail | can be awaited once; of those that nobody awaits the oldest are forgotten when there are thousands |
+/// | the command line | the program's own runtime splits it | is split by the same rules, without a shell |
+/// | no `application`: search | own, current, system folders, `PATH` | `PATH`, unless the word has a slash |
+/// | inherited | environment, current folder; the console is a new one | the same, and descriptors 0 to 2 |
+/// | the exit code | the program's | the program's, or 128 + the number of the signal that ended it |
+/// | ended, not awaited | soon unknown: `Wait` and `Terminate` fail | can be awaited once (see below) |
 ///
-/// Two dangers: a path with blanks needs double quotes in a command line without `application`, as Windows else takes each
-/// blank for its end in turn ("C:\Program Files\x.exe" may start C:\Program.exe); and text from elsewhere that goes into a
-/// command line has to be quoted by whoever builds it.
+/// On Linux the library remembers thousands of children that were never awaited; beyond that it forgets the oldest.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
-/// \thread  thread-safe
+/// Two dangers. Without `application`, a path with blanks needs double quotes in the command line: Windows otherwise
+/// tries each blank in turn as the end of the path ("C:\Program Files\x.exe" may start C:\Program.exe). And the caller
+/// must quote any text from elsewhere that it puts into a command line.
+///
+///     unsigned long id = 0;
+///     int code = 0;
+///     Process::Create(nullptr, nullptr, "render \"page 1.ps\" 300", &code); // returns when it has ended
+///     if (Process::Create("./viewer", &id, nullptr, nullptr)) Process::Wait(id); // viewer runs by itself
+///
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
+/// \thread thread-safe
 
 #ifndef ZOR_BASIS_SYSTEM_PROCESS_H
 #define ZOR_BASIS_SYSTEM_PROCESS_H
@@ -29,34 +36,35 @@ namespace ZOR_Basis {
 class ZB_API Process {
 public:
     /// Starts a program.
-    /// \param application  the program's file; null: the first word of the command line names it
-    /// \param processId  receives the identifier, and the program runs on by itself; null: the call returns when the program
-    ///        has ended
-    /// \param commandLine  all words, the program's name first; null: just the program
-    /// \param exitCode  null, or receives the exit code of a program that was awaited; 0 where there is none, also on
-    ///        failure
-    /// \kept process-01: a program that runs on by itself leaves an exit code of 0, whatever it was before
-    /// \return whether the program was started; false with neither a program nor a command line
+    /// \param application  names the program's file; null: the first word of the command line names it
+    /// \param processId  receives the identifier, and the call returns as soon as the program runs; null: the call
+    ///     returns when the program has ended
+    /// \param commandLine  holds all words, the program's name first; null: the program gets no arguments
+    /// \param exitCode  receives the exit code if the call awaited the program, otherwise 0, also on failure; may be
+    ///     null
+    /// \kept process-01: when the call does not await the program, it sets `*exitCode` to 0, whatever was in it
+    /// \return whether the program was started; false if both `application` and `commandLine` are null
     static bool Create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode);
 
-    /// Waits without limit until a process has ended, a child or any other. On Linux the exit status of a child that the
-    /// application made without `Create` stays for the application to take.
-    /// \return false where there is no such process, or none that may be awaited
+    /// Waits without limit until a process has ended. The process need not be a child. On Linux this leaves the exit
+    /// status of a child that the application made without `Create` for the application to collect.
+    /// \return false if there is no such process, or if it may not be awaited
     static bool Wait(unsigned long processId);
 
-    /// Ends a process at once, without giving it a chance to clean up: on Windows with exit code 0, on Linux by SIGKILL.
-    /// \return false where there is no such process, where it has ended already, or where that is not allowed
+    /// Kills a process, which gets no chance to clean up: on Windows with exit code 0, on Linux by SIGKILL.
+    /// \return false if there is no such process, if it has already ended, or if the caller may not end it
     static bool Terminate(unsigned long processId);
 
-    /// Loads a shared library, for the life of the process.
-    /// \param name  a path; a bare name is searched for in the system's order, of which others may be able to write a folder
-    /// \return the system's handle of it, for `ptrFunc`; null on failure
+    /// Loads a shared library, which stays loaded for the life of the process.
+    /// \param name  is a path, or a bare name that the system searches for; the search path may contain a folder that
+    ///     others can write
+    /// \return the system's handle of the library, for `ptrFunc`; null on failure
     static void* loadLib(char const* name);
 
     /// Finds an exported function by name.
-    /// \param name  null and empty names are nowhere found in a module
-    /// \param module  from `loadLib`; null: the resolver of the platform layer is asked, where there is one
-    /// \return null where there is no such function
+    /// \param name  is the exported name; no module has a null or empty one
+    /// \param module  comes from `loadLib`; null: the platform layer's resolver is asked, if there is one
+    /// \return the function's address; null if there is no such function
     static void* ptrFunc(char const* name, void* module);
 };
 

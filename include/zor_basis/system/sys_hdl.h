@@ -1,7 +1,8 @@
 /// \file
-/// `SysHdl`: a user who has been logged on. Made by `Sys::loginUser`, owned by its caller; deleting it logs the user off.
+/// `SysHdl`: a user who is logged on. `Sys::loginUser` creates it, the caller owns it, and deleting it logs the user
+/// off.
 ///
-/// \thread  one thread at a time
+/// \thread one thread at a time
 
 #ifndef ZOR_BASIS_SYSTEM_SYS_HDL_H
 #define ZOR_BASIS_SYSTEM_SYS_HDL_H
@@ -16,7 +17,7 @@ public:
     SysHdl(SysHdl const&) = delete;
     SysHdl& operator=(SysHdl const&) = delete;
 
-    /// Whether there is a user behind it; of the base class itself there is none.
+    /// Tells whether the handle stands for a user; false in this base class.
     virtual bool isValid();
     virtual ~SysHdl();
 };

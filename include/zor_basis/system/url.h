@@ -1,7 +1,9 @@
 /// \file
-/// `Url`: fetches what a URL names.
+/// `Url`: fetches the resource that a URL names.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
+///     if (!Url::Get("spool/page.ps", "http://host/page.ps", nullptr, nullptr, true, true)) report();
+///
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_SYSTEM_URL_H
 #define ZOR_BASIS_SYSTEM_URL_H
@@ -15,19 +17,22 @@ public:
     Url() = default;
     Url(Url const&) = default;
     Url(Url&&) noexcept = default;
-    /// There is nothing to assign.
+    /// Does nothing: the class has no state.
     Url& operator=(Url const&) { return *this; }
     Url& operator=(Url&&) noexcept { return *this; }
 
-    /// Fetches into a file, through the platform layer, which decides which URLs it can fetch.
-    /// \param target  the file's path; null is the empty one
-    /// \param first  handed on to the platform layer with `second`; stand-alone they are user name and password, or null
-    /// \param overwrite  may replace what is at the target
-    /// \param makeDirectory  first makes the directory that is to hold the target, with its parents; stays also when fetching
-    ///        fails. A bare name ("page.ps") has no directory in it that could be made, and fails: write "./page.ps"
-    /// \return false, with nothing fetched, where that cannot be made, or something is there that may not be replaced; else
-    ///         whether the platform layer has fetched it
-    /// \error stand-alone an unknown host, a refused connection and the status of an answer have codes of their own
+    /// Fetches a resource into a file through the platform layer, which decides which URLs it supports.
+    /// \param target  is the file's path; null counts as the empty path
+    /// \param first  is passed to the platform layer, as is `second`; the stand-alone layer takes them as user name and
+    ///     password, or null
+    /// \param overwrite  allows the target to be replaced
+    /// \param makeDirectory  makes the directory of the target, with its parents, first; the directory stays even
+    ///     if the fetch fails. A bare name ("page.ps") contains no directory to make, so the call fails: write
+    ///     "./page.ps"
+    /// \return false, with nothing fetched, if the directory cannot be made or the target exists and may not be
+    ///     replaced; otherwise whether the platform layer fetched the resource
+    /// \error the stand-alone layer has distinct codes for an unknown host, a refused connection and the status of a
+    ///     response
     /// \thread any
     static bool Get(char const* target, char const* url, char const* first, char const* second, bool overwrite,
                     bool makeDirectory);

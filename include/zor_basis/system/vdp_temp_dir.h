@@ -1,21 +1,26 @@
 /// \file
-/// `VDPTempDir`: a folder of its own for a job, made with the object and, unless told otherwise, gone with it.
+/// `VDPTempDir`: a temporary folder for a job. The constructor makes it; the destructor removes it unless told
+/// otherwise.
 ///
-/// The folders lie in one common folder and are called after a number that the process counts up, with the suffix ".r":
-/// "1.r", "2.r" and so on in the temporary folder (`Sys::temp()`). An instance of the component that shares this folder
-/// with others calls `Init` with a number of its own first: from then on its folders lie in "vdp_tmp" there and have that
-/// number behind the suffix, as "12.r3".
+/// All folders lie in one common folder, by default the temporary folder (`Sys::temp()`). Their names are a number that
+/// the process counts up and the suffix ".r": "1.r", "2.r" and so on. An instance of the component that shares the
+/// temporary folder with others first calls `Init` with its own number: from then on its folders lie in the sub-folder
+/// "vdp_tmp" and have that number after the suffix, as in "12.r3".
 ///
-/// Two programs with one root share their folders unless each calls `Init` with a number of its own: both then begin with
-/// "tmp/1.r", the second uses the first one's folder with all that lies in it (`temp-02`), and whichever job ends first
-/// removes it under the other. That holds for two runs of one program, too, and for programs without a root that are started
-/// in one folder.
+/// Two programs with the same root share their folders unless each calls `Init` with its own number. Both then begin
+/// with "tmp/1.r", the second uses the first one's folder with all its contents (`temp-02`), and the job that ends
+/// first removes it while the other still uses it. The same holds for two runs of one program, and for programs without
+/// a root that are started in the same folder.
 ///
-/// The class may be used until the process ends, in static destructors too.
+///     VDPTempDir folder;
+///     render(folder.path()); // the folder is removed at the end of the scope
 ///
-/// \thread  thread-safe: one thread at a time makes a folder, and one process of a user at a time chooses its common
-///     folder. `Init` does not wait for a `Create` that still tries; from then on that one tries names of the new kind.
-///     Where the platform layer makes no mutex, one thread at a time may call. An object belongs to one thread at a time
+/// The class may be used until the process ends, including in static destructors.
+///
+/// \thread thread-safe: one thread at a time makes a folder, and one process of a user at a time chooses its common
+///     folder. `Init` does not wait for a `Create` that is still trying; from then on that call tries names of the new
+///     kind. If the platform layer cannot make a mutex, one thread at a time may call. An object belongs to one thread
+///     at a time
 
 #ifndef ZOR_BASIS_SYSTEM_VDP_TEMP_DIR_H
 #define ZOR_BASIS_SYSTEM_VDP_TEMP_DIR_H
@@ -31,38 +36,40 @@ namespace ZOR_Basis {
 
 class ZB_API VDPTempDir {
 public:
-    /// Chooses the common folder, once in a process.
-    /// \param n  the instance's number; 1, which starts before the others, has "vdp_tmp" removed with all that is in it and
-    ///        made anew, with its parents. 0 and below keep the temporary folder itself
-    /// \kept temp-01: the first positive number stays, and 0 changes nothing where a folder has been chosen
+    /// Chooses the common folder, once per process.
+    /// \param n  is the instance's number. Instance 1, which starts before the others, removes "vdp_tmp" with all its
+    ///     contents and makes it again, with its parents. 0 and negative numbers keep the temporary folder itself
+    /// \kept temp-01: the first positive number is final, and 0 changes nothing once a folder has been chosen
     static void Init(int n);
 
     /// Makes a folder under a new name.
-    /// \param path  receives it
-    /// \kept temp-02: a folder that has the name already is used as it is, with what lies in it; any other entry is left
-    ///     alone, and the next number tried
-    /// \kept temp-03: tries on until a folder is there: where none can ever be made the call does not return, and no other
-    ///     thread gets a folder either
+    /// \param path  receives the folder's path
+    /// \kept temp-02: an existing folder of that name is used as it is, with its contents; any other entry is left
+    ///     alone, and the next number is tried
+    /// \kept temp-03: the call tries until it has a folder: if none can be made it never returns, and no other thread
+    ///     gets a folder either
     static void Create(FPath& path);
 
-    /// The common folder; the empty path before `Init` and the first folder. The reference lives as long as the process.
-    /// \thread  not while another thread is in `Init` or makes the first folder
+    /// Returns the common folder; the empty path until `Init` or the first folder. The reference stays valid as long as
+    /// the process.
+    /// \thread not while another thread is in `Init` or makes the first folder
     static FPath const& Root();
 
     /// Makes a folder by `Create`.
     VDPTempDir() : VDPTempDir(true) {}
     VDPTempDir(bool deleteOnDestroy) : deletes_(deleteOnDestroy) { Create(path_); }
-    /// \kept temp-04: a copy has the same folder and deletes it too, so one of the two gives that up
+    /// \kept temp-04: a copy has the same folder and also deletes it, so one of the two must be told not to
+    ///     (`deleteOnDestroy`)
     VDPTempDir(VDPTempDir const& other) = default;
-    /// The same; a folder that this object had is left behind.
+    /// The same; the folder that this object had before is left behind.
     VDPTempDir& operator=(VDPTempDir const& other) = default;
-    /// Removes the folder with all that is in it, where it deletes and a directory is there.
+    /// Removes the folder with all its contents if the object deletes it and the path is a directory.
     ~VDPTempDir();
 
-    /// Says whether the folder goes with the object.
+    /// Sets whether the destructor removes the folder.
     void deleteOnDestroy(bool deletes) { deletes_ = deletes; }
     FPath const& path() const { return path_; }
-    /// Whether there is an entry of any kind at the path.
+    /// Tells whether an entry of any kind exists at the path.
     bool status() const;
 
 private:

@@ -1,5 +1,9 @@
 /// \file
-/// `Auto_ptr_CStr`: owns one character array, for calls that fill a zero-terminated buffer.
+/// `Auto_ptr_CStr`: owns a character array, for calls that fill a zero-terminated buffer.
+///
+///     Auto_ptr_CStr name(255);
+///     readName(name, name.length());
+///     name.assureTerm0();
 
 #ifndef ZOR_BASIS_TEXT_AUTO_PTR_CSTR_H
 #define ZOR_BASIS_TEXT_AUTO_PTR_CSTR_H
@@ -10,14 +14,14 @@
 #include <cstdint>
 #include <string>
 
-/// Not copyable. The buffer comes from the runtime's `malloc`, tried again through the new-handler of the library's own
-/// runtime, and goes back through `free`.
+/// Not copyable. The buffer comes from the runtime's `malloc`, which is retried through the new-handler of the
+/// library's own runtime, and is released by `free`.
 class ZB_API Auto_ptr_CStr : public ZOR_Basis::detail::NotDeletable<Auto_ptr_CStr> {
 public:
-    /// A buffer of n + 2 bytes that begins with a terminator; its length is n.
+    /// Allocates a buffer of n + 2 bytes that begins with a terminator; its length is n.
     /// \error throws `std::bad_alloc` where memory is short and no new-handler helps
     Auto_ptr_CStr(std::uint64_t n);
-    /// A buffer that holds the text and a terminator; its length is the text's size.
+    /// Allocates a buffer that contains the text and a terminator; its length is the text's size.
     /// \error throws `std::bad_alloc` where memory is short and no new-handler helps
     Auto_ptr_CStr(std::string text);
     ~Auto_ptr_CStr();
@@ -27,8 +31,9 @@ public:
     operator char*() noexcept { return buffer_; }
     std::uint64_t length() const noexcept { return length_; }
 
-    /// Makes sure that what a callee has filled to the brim is terminated.
-    /// \kept text-14: the last counted byte gives way, so "abc" becomes "ab"; with a length of 0 nothing happens
+    /// Terminates a buffer that a callee may have filled completely.
+    /// \kept text-14: the terminator replaces the last counted byte, so "abc" becomes "ab"; with a length of 0 nothing
+    ///     happens
     void assureTerm0() noexcept;
 
 private:

@@ -1,17 +1,20 @@
 /// \file
 /// `BufStr<15>` and `BufStr<255>`: narrow strings that keep short text inside the object.
 ///
-/// Up to N bytes lie in the object itself, mostly on the stack; longer text goes to a heap block of exactly the size
-/// that the moment asks for. A string never moves back: `clear`, `cut` and shorter texts keep the block and its capacity
-/// for the next long text. No text is ever truncated.
+/// Up to N bytes lie in the object itself, usually on the stack; longer text lies in a heap block of exactly the
+/// required size. A string never returns from the heap: `clear`, `cut` and shorter texts keep the block and its
+/// capacity for the next long text. No text is ever truncated.
 ///
-/// A source may lie inside the string's own text, in every member: nothing is released or overwritten before it has
-/// been copied. A source with a length is copied up to its terminator, see text-06. Where memory is short the program
-/// is aborted. There are no move operations: a move copies.
+///     BufStr<15> name("page-");
+///     name << 7 << ".ps"; // "page-7.ps", without an allocation
 ///
-/// A `std::string_view` is a source like a `std::string` with the same bytes: an empty one is the empty text, a zero in it
-/// follows text-06, and nothing behind its end is read. How texts compare, and how containers of them are searched for a
-/// literal, stands at `Str`; a `std::string_view` compares as the `std::string` would.
+/// In every member a source may lie inside the string's own text: nothing is released or overwritten before it has been
+/// copied. A source with a length is copied up to its terminator, see text-06. If memory is short, the program is
+/// aborted. There are no move operations: a move copies.
+///
+/// A `std::string_view` is treated like a `std::string` with the same bytes: an empty one is the empty text, a zero in
+/// it follows text-06, and nothing behind its end is read. `Str` describes how texts compare, and how to search a
+/// container of texts for a literal; a `std::string_view` compares as the `std::string` would.
 
 #ifndef ZOR_BASIS_TEXT_BUF_STR_H
 #define ZOR_BASIS_TEXT_BUF_STR_H
@@ -30,14 +33,14 @@
 
 namespace ZOR_Basis {
 
-/// \kept text-04: a text of N bytes or more that is assigned goes to the heap: 15 bytes into a `BufStr<15>` give a
-///       capacity of 16
-/// \kept text-05: a text that is built by appending stays inside up to exactly N bytes
-/// \kept text-06: a source that was given with a length is copied up to its terminator and padded with zeros, while the
-///       size becomes the given length
-/// \kept text-07: once on the heap, always on the heap, with a capacity that never shrinks
-/// \kept text-08: growth is exact, without doubling or rounding: a byte appended to a full block makes a block that is
-///       one byte larger
+/// \kept text-04: an assigned text of N bytes or more lies on the heap: 15 bytes in a `BufStr<15>` give a capacity of
+///     16
+/// \kept text-05: appending keeps a text inside the object up to exactly N bytes
+/// \kept text-06: a source with a given length is copied up to its terminator and padded with zeros, and the size
+///     becomes the given length
+/// \kept text-07: a text that is on the heap stays on the heap, with a capacity that never shrinks
+/// \kept text-08: growth is exact, without doubling or rounding: appending a byte to a full block allocates a block
+///     that is one byte larger
 template <std::uint64_t N>
 requires(N == 15 || N == 255) class BufStr : public Str {
     using Text = detail::InlineText<BufStr, char, N>;
@@ -46,7 +49,7 @@ requires(N == 15 || N == 255) class BufStr : public Str {
 public:
     /// Empty, inside the object.
     BufStr() noexcept { Text::start(*this); }
-    /// Copies of texts, each made as by assigning to an empty string.
+    /// Copy a text, with the same result as assigning it to an empty string.
     BufStr(char const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
     BufStr(Str const& text) noexcept { Text::make(*this, text.c_str(), text.size()); }
     BufStr(std::string const& text) noexcept { Text::makeOwned(*this, text.c_str(), text.size()); }
@@ -57,7 +60,7 @@ public:
     BufStr(BufStr const& other) noexcept : Str(other) { Text::makeOwned(*this, other.text_, other.size_); }
     ~BufStr() { Text::end(*this); }
 
-    /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
+    /// Assigns a copy of the text. Assigning the string itself or its own text pointer changes nothing.
     BufStr& operator=(BufStr const& other) {
         if (this != &other) Text::assignOwned(*this, other.text_, other.size_);
         return *this;
@@ -129,8 +132,8 @@ public:
     BufStr& operator<<(View text) {
         return add(text);
     }
-    /// Appends the decimal digits of an integer of any size; characters, truth values and enumerators count as the numbers
-    /// that they are. What would lose something as an integer, a floating-point number above all, does not compile.
+    /// Appends the decimal digits of an integer of any size; characters, Boolean values and enumerators count as
+    /// numbers. Types whose conversion to an integer loses information, above all floating-point types, do not compile.
     BufStr& operator<<(int number) { return addNumber(std::int64_t{number}); }
     template <detail::Number I>
     BufStr& operator<<(I number) {
@@ -152,18 +155,18 @@ public:
         return i < size_ ? text_[i] : '\0';
     }
 
-    /// The text for writing directly, capacity + 1 bytes; `resize` has to follow.
+    /// The text for direct writing, capacity + 1 bytes; must be followed by `resize`.
     char* getBuf() noexcept { return Text::text(*this); }
-    /// The capacity: N inside the object, else the block's; the terminator is not counted.
+    /// The capacity: N inside the object, otherwise the block's; the terminator is not counted.
     std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
-    /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
+    /// Ensures a capacity of at least max(n, size + 1); keeps the text up to an inner terminator.
     BufStr& extendBuf(std::uint64_t n) {
         CopyIfTooLong(text_, n, size_);
         return *this;
     }
     /// Measures the text again after direct writes, at most n bytes of it; n = 0 sets no bound.
-    /// \kept text-10: first stores a terminator at the index of the capacity, so that the last byte of a buffer filled to
-    ///       the brim is lost rather than the end of the text
+    /// \kept text-10: first stores a terminator at the index of the capacity, so a completely filled buffer loses its
+    ///     last byte but is terminated
     BufStr& resize(std::uint64_t n = 0) noexcept {
         Text::resize(*this, n);
         return *this;
@@ -173,7 +176,7 @@ public:
         Text::setSize(*this, 0);
         return *this;
     }
-    /// Takes away the last byte, if there is one.
+    /// Removes the last byte, if there is one.
     BufStr& cut() noexcept {
         Text::cutLast(*this);
         return *this;
@@ -184,14 +187,14 @@ public:
         return *this;
     }
 
-    /// Inserts a text; behind the size nothing happens. What follows moves byte for byte, inner zeros included.
+    /// Inserts a text; a position behind the size has no effect. The bytes that follow move, including inner zeros.
     BufStr& insert(std::uint64_t pos, char const* text, std::uint64_t n = 0) {
         Text::insert(*this, pos, text, n);
         return *this;
     }
     BufStr& insert(std::uint64_t pos, Str const& text) { return insert(pos, text.c_str(), text.size()); }
-    /// Puts a text in place of `count` bytes, or of those that there are; a count of 0 inserts, and an empty source only
-    /// removes. At the size it appends, behind it nothing happens.
+    /// Replaces `count` bytes, or as many as there are, by a text; a count of 0 inserts, and an empty source only
+    /// removes. At the size the text is appended; a position behind the size has no effect.
     BufStr& replace(std::uint64_t pos, std::uint64_t count, char const* text, std::uint64_t n = 0) {
         Text::replace(*this, pos, count, text, n);
         return *this;
@@ -199,7 +202,7 @@ public:
     BufStr& replace(std::uint64_t pos, std::uint64_t count, Str const& text) {
         return replace(pos, count, text.c_str(), text.size());
     }
-    /// Cuts to `pos` bytes where the text is longer, then appends.
+    /// Cuts a text that is longer than `pos` bytes to `pos` bytes, then appends.
     BufStr& replaceTail(std::uint64_t pos, char const* text, std::uint64_t n = 0) {
         Text::replaceTail(*this, pos, text, n);
         return *this;
@@ -216,29 +219,32 @@ public:
         return *this;
     }
 
-    /// Becomes the bytes of a zero-terminated text as two lower-case hexadecimal digits each: "AZ" gives "415a".
+    /// Assigns the bytes of a zero-terminated text as two lower-case hexadecimal digits each: "AZ" gives "415a".
     BufStr& toHex(char const* text);
-    /// Appends one byte for each pair of hexadecimal digits, by the rule of `decodeHexChar`. An odd last digit is ignored.
+    /// Appends one byte for each pair of hexadecimal digits, decoded like `decodeHexChar`. An odd last digit is
+    /// ignored.
     /// \kept text-11: a pair that gives 0 appends nothing: "41004200" appends "AB"
     BufStr& fromHex(char const* digits);
 
-    /// Counts on in the letters a to z: "" to "a", "a" to "b", "az" to "ba", "zz" to "aaa".
-    /// \kept text-12: whatever is not "z" is incremented, letter or not: "Z" becomes "["
+    /// Increments the text as a number with digits a to z: "" becomes "a", "a" becomes "b", "az" becomes "ba", "zz"
+    /// becomes "aaa".
+    /// \kept text-12: every character other than "z" is incremented, letter or not: "Z" becomes "["
     BufStr& NextLatin() {
         NextLatin(*this, size_ != 0 ? size_ - 1 : 0);
         return *this;
     }
-    /// The same step from the byte at `pos` leftwards; an empty string becomes "a", behind the last byte nothing happens.
+    /// The same from the byte at `pos` to the left; an empty string becomes "a", and a position behind the last byte
+    /// has no effect.
     static void NextLatin(BufStr& text, std::uint64_t pos) { Text::nextLatin(text, pos); }
 
 protected:
-    /// The capacity check, through which every block comes: where max(need, keep + 1) is beyond the capacity, moves to a
-    /// new block of exactly that capacity with `keep` bytes of the source, by text-06, and a terminator behind them.
-    /// \return whether it did; the size is the caller's business
+    /// Checks the capacity; every block is allocated here. If max(need, keep + 1) exceeds the capacity, moves to a new
+    /// block of exactly that capacity and copies `keep` bytes of the source, by text-06, and a terminator.
+    /// \return whether there is a new block; the caller sets the size
     bool CopyIfTooLong(char const* source, std::uint64_t need, std::uint64_t keep) {
         return Text::copyIfTooLong(*this, source, need, keep);
     }
-    /// n bytes from the runtime's heap.
+    /// Allocates n bytes from the runtime's heap.
     char* alloc(std::uint64_t n) noexcept { return static_cast<char*>(std::malloc(n)); }
     /// Releases the text.
     void free() noexcept { std::free(getBuf()); }
@@ -277,7 +283,7 @@ std::weak_ordering operator<=>(BufStr<N> const& a, BufStr<N> const& b) noexcept 
     return detail::compareOwned<N>(a.c_str(), a.size(), b.c_str(), b.size()) <=> 0;
 }
 
-/// The everyday string: names, extensions, small numbers.
+/// The string for everyday use: names, extensions, small numbers.
 ZB_EXTERN_TEMPLATE detail::InlineText<BufStr<15>, char, 15>;
 ZB_EXTERN_TEMPLATE BufStr<15>;
 /// The string for paths.

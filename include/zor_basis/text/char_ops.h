@@ -1,10 +1,10 @@
 /// \file
-/// What narrow and wide text have in common, as functions over the character type. The text classes are made of these;
-/// users have no need of them.
+/// Functions that narrow and wide text share, as templates over the character type. The text classes are built on them;
+/// they are not meant for users.
 ///
-/// Copies come in two kinds. A text that has just been measured has no terminator inside and is moved whole
-/// (`moveText`). A text whose length somebody gave is copied up to its terminator and padded with zeros (`copyText`);
-/// nothing behind its terminator is read, as there may be nothing.
+/// There are two ways to copy. A text that has just been measured has no terminator inside and is moved as a whole
+/// (`moveText`). A text whose length the caller gave is copied up to its terminator and padded with zeros (`copyText`);
+/// nothing behind its terminator is read, because there may be nothing.
 
 #ifndef ZOR_BASIS_TEXT_CHAR_OPS_H
 #define ZOR_BASIS_TEXT_CHAR_OPS_H
@@ -20,7 +20,7 @@
 
 namespace ZOR_Basis::detail {
 
-/// Everything that may stand as an index: all integers, and enumerations that turn into integers by themselves.
+/// Every type that may be an index: all integers, and enumerations that convert to integers implicitly.
 template <class T>
 concept Index = std::integral<T> ||(std::is_enum_v<T>&& std::is_convertible_v<T, std::int64_t>);
 
@@ -28,7 +28,7 @@ concept Index = std::integral<T> ||(std::is_enum_v<T>&& std::is_convertible_v<T,
 template <class T>
 concept Number = Index<T> && sizeof(T) <= sizeof(std::int64_t);
 
-/// Everything else that the language would make an `int` of, although not every value survives that.
+/// Every other type that converts to `int` implicitly, although not every value survives the conversion.
 template <class T>
 concept LosesAsInt = !Number<T> && std::is_convertible_v<T, int> && !requires(T const& value) {
     int{value};
@@ -40,13 +40,13 @@ inline std::uint64_t textLength(Char const* text) noexcept {
     return std::char_traits<Char>::length(text);
 }
 
-/// Null or empty.
+/// Tells whether a text is null or empty.
 template <class Char>
 inline bool isNothing(Char const* text) noexcept {
     return text == nullptr || *text == Char();
 }
 
-/// The length that a (text, length) source stands for: 0 for a null or empty text, and a length of 0 means measured.
+/// The length of a (text, length) source: 0 for a null or empty text; otherwise a length of 0 means "measure it".
 template <class Char>
 inline std::uint64_t sourceLength(Char const* text, std::uint64_t length) noexcept {
     if (isNothing(text)) return 0;
@@ -60,14 +60,14 @@ ZB_API std::uint64_t textLengthUpTo(WChar const* text, std::uint64_t limit) noex
 /// Less than 0, 0 or greater than 0, by unsigned units, up to the terminators. Null counts as the empty text.
 ZB_API int compareTexts(char const* a, char const* b) noexcept;
 ZB_API int compareTexts(WChar const* a, WChar const* b) noexcept;
-/// The same; the sizes only tell how far the texts are likely to reach.
+/// The same; the sizes are only a hint how long the texts are.
 ZB_API int compareTexts(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept;
 
 /// The same over at most `limit` units.
 ZB_API int compareTextsUpTo(char const* a, char const* b, std::uint64_t limit) noexcept;
 ZB_API int compareTextsUpTo(WChar const* a, WChar const* b, std::uint64_t limit) noexcept;
 
-/// Whether the texts are equal in so many units, or up to a terminator at the same place before.
+/// Tells whether the texts are equal over so many units, or up to a common terminator before that.
 ZB_API bool sameTexts(char const* a, char const* b, std::uint64_t length) noexcept;
 ZB_API bool sameTexts(WChar const* a, WChar const* b, std::uint64_t length) noexcept;
 
@@ -80,7 +80,7 @@ ZB_API WChar const* findText(WChar const* text, WChar const* wanted) noexcept;
 ZB_API_STRAIGHT void copyText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API void copyText(WChar* target, WChar const* source, std::uint64_t length) noexcept;
 
-// The compiler cannot see that the wide moves are not reached for short texts.
+// The compiler cannot see that short texts never reach the wide moves.
 #if defined(__GNUC__) && !defined(__clang__)
 #pragma GCC diagnostic push
 #pragma GCC diagnostic ignored "-Warray-bounds"
@@ -100,7 +100,7 @@ inline void moveEnds(void* target, void const* source, std::uint64_t bytes) noex
     std::memcpy(static_cast<char*>(target) + last, &tail, sizeof(Block));
 }
 
-/// Moves bytes between places that may overlap; short texts without a call.
+/// Moves bytes between ranges that may overlap; short texts without a call.
 inline void moveBytes(void* target, void const* source, std::uint64_t bytes) noexcept {
     struct Sixteen {
         std::uint64_t half[2];

@@ -1,9 +1,11 @@
 /// \file
-/// The machinery of the strings that keep short text inside the object: `BufStr` and `WBStr`. Users have no need of it.
+/// The implementation shared by the strings that keep short text inside the object: `BufStr` and `WBStr`. Not meant for
+/// users.
 ///
-/// The owner has the fields `size_`, `text_` and `area_`. The text is in the area, or in a heap block whose capacity the
-/// area then holds; comparing `text_` with the area tells which. Blocks come from the owner's `alloc` and go back through
-/// its `free`. Short texts are handled here, in the caller's code; whatever needs a block is in the library.
+/// The owner has the members `size_`, `text_` and `area_`. The text lies in the area, or in a heap block whose capacity
+/// is then stored in the area; comparing `text_` with the area tells which. The owner's `alloc` and `free` manage the
+/// blocks. Short texts are handled inline in the caller's code; everything that needs a block is compiled into the
+/// library.
 
 #ifndef ZOR_BASIS_TEXT_INLINE_TEXT_H
 #define ZOR_BASIS_TEXT_INLINE_TEXT_H
@@ -68,7 +70,7 @@ public:
         o.text_ = o.area_.text;
         setSize(o, 0);
     }
-    /// What a constructor does: assigns to an empty string.
+    /// The work of a constructor: assigns to an empty string.
     static void make(Owner& o, Char const* source, std::uint64_t length) {
         o.text_ = o.area_.text;
         assign(o, source, length);
@@ -82,7 +84,7 @@ public:
             o.free();
     }
 
-    /// Makes the text a copy of the source; a length of 0 is measured.
+    /// Assigns a copy of the source; a length of 0 means "measure it".
     static void assign(Owner& o, Char const* source, std::uint64_t length) {
         if (isNothing(source)) [[unlikely]] {
             setSize(o, 0);
@@ -93,7 +95,7 @@ public:
         }
     }
 
-    /// The same from a text that another string owns, so that all of its length may be read.
+    /// The same for a text that another string owns, all of which may therefore be read.
     static void assignOwned(Owner& o, Char const* source, std::uint64_t length) {
         if (length == 0 || *source == Char()) [[unlikely]] {
             assign(o, source, length);
@@ -102,7 +104,7 @@ public:
         }
     }
 
-    /// Appends a copy of the source; a length of 0 is measured.
+    /// Appends a copy of the source; a length of 0 means "measure it".
     static void append(Owner& o, Char const* source, std::uint64_t length) {
         if (isNothing(source)) return;
         if (length != 0) {
@@ -130,10 +132,11 @@ public:
     }
     static void cutTo(Owner& o, std::uint64_t n) noexcept { setSize(o, n < o.size_ ? n : o.size_); }
 
-    // What follows is compiled into the library.
+    // The following functions are compiled into the library.
 
-    /// The capacity check: makes sure of a capacity of max(need, keep + 1), moving `keep` units of the source into a
-    /// new block where there is not enough. \return whether it did
+    /// Ensures a capacity of max(need, keep + 1): if the present one is too small, allocates a new block and copies
+    /// `keep` units of the source.
+    /// \return whether there is a new block
     static bool copyIfTooLong(Owner& o, Char const* source, std::uint64_t need, std::uint64_t keep);
     /// Makes the text exactly `length` units of the source, in a new block of that capacity unless the capacity is
     /// larger than the length.
@@ -148,12 +151,12 @@ public:
     static void replaceTail(Owner& o, std::uint64_t position, Char const* source, std::uint64_t length);
     static void nextLatin(Owner& o, std::uint64_t position);
 
-    /// Whether a place lies in the text's own area or block.
+    /// Tells whether an address lies in the text's own area or block.
     static bool holds(Owner const& o, Char const* place) noexcept;
 
 private:
-    /// Whether `length` units fit behind a text of `size` units. A block is never smaller than the area, so that the
-    /// state need not be known for short texts.
+    /// Tells whether `length` units fit behind a text of `size` units. A block is never smaller than the area, so short
+    /// texts need no look at the state.
     static bool hasRoom(Owner const& o, std::uint64_t size, std::uint64_t length) noexcept {
         if (length < N && size <= N - length) return true;
         return length <= capacity(o) - size;

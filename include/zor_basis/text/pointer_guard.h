@@ -1,8 +1,8 @@
 /// \file
-/// What a text that converts to a pointer must not be taken for. Users have no need of it.
+/// Prevents a text from being used as any other pointer. Not meant for users.
 ///
-/// The text types convert to a pointer to their text without being asked. The language would then accept them where any
-/// pointer will do: in `delete`, and in comparisons with pointers to something else, which compare addresses.
+/// The text types convert implicitly to a pointer to their text. The language would then accept them wherever any
+/// pointer is allowed: in `delete`, and in comparisons with pointers to other types, which compare addresses.
 
 #ifndef ZOR_BASIS_TEXT_POINTER_GUARD_H
 #define ZOR_BASIS_TEXT_POINTER_GUARD_H
@@ -15,8 +15,8 @@ namespace ZOR_Basis::detail {
 template <class>
 inline constexpr bool NEVER = false;
 
-/// An empty base of a class that converts to a pointer and must not be deleted through it. `delete` requires exactly one
-/// conversion to a pointer and finds two; the second one satisfies no call and so takes part in nothing else.
+/// An empty base of a class that converts to a pointer and must not be deleted through it. `delete` requires exactly
+/// one conversion to a pointer and finds two; no call can use the second one, so it affects nothing else.
 template <class Derived>
 class NotDeletable {
 public:
@@ -27,7 +27,7 @@ public:
 template <class Pointer, class Char>
 concept PointerToOther = std::is_pointer_v<Pointer> && !std::is_convertible_v<Pointer, Char const*>;
 
-/// The empty base of the views. Whatever is deleted here would otherwise compile into a comparison of addresses.
+/// The empty base of the views. Each comparison deleted here would otherwise compile as a comparison of addresses.
 template <class Char>
 class PointerGuard : public NotDeletable<PointerGuard<Char>> {
     template <PointerToOther<Char> Pointer>

@@ -1,8 +1,8 @@
 /// \file
-/// Comparing texts with a `std::string_view`, for the strings that own their text. Users have no need of it.
+/// Compares the strings that own their text with a `std::string_view`. Not meant for users.
 ///
-/// A view compares as a `std::string` that holds its bytes; nothing behind its end is read. A view of a part of a text
-/// therefore never equals the whole text, although both may begin at the same address.
+/// A view compares like a `std::string` with the same bytes; nothing behind its end is read. A view of a part of a text
+/// therefore never equals the whole text, even if both begin at the same address.
 
 #ifndef ZOR_BASIS_TEXT_VIEW_OPS_H
 #define ZOR_BASIS_TEXT_VIEW_OPS_H
@@ -15,7 +15,7 @@
 
 namespace ZOR_Basis::detail {
 
-/// A `std::string_view` itself, and nothing that merely converts to one.
+/// `std::string_view` itself, not a type that merely converts to it.
 template <class T>
 concept StringView = std::same_as<T, std::string_view>;
 

@@ -1,9 +1,13 @@
 /// \file
-/// `WBStr`: a wide string that keeps up to 255 code units inside the object; the wide twin of `BufStr<255>`.
+/// `WBStr`: a wide string that keeps up to 255 code units inside the object; the wide counterpart of `BufStr<255>`.
 ///
-/// Assigning, appending, growing, inserting and replacing follow the rules of `BufStr` with code units in place of bytes:
-/// text-04 to text-09 and text-12 hold here too. What differs: blocks come from a virtual operation and are zeroed, and
-/// text whose case is changed while it is stored follows wide-03. A source may lie inside the string's own text.
+/// Assigning, appending, growing, inserting and replacing follow the rules of `BufStr` with code units instead of
+/// bytes: text-04 to text-09 and text-12 also hold here. Two things differ: a virtual function allocates the blocks and
+/// zeroes them, and text whose case changes while it is stored follows wide-03. A source may lie inside the string's
+/// own text.
+///
+///     WBStr name(ZB_W("page"));
+///     name += ZB_W("-7");
 
 #ifndef ZOR_BASIS_TEXT_WB_STR_H
 #define ZOR_BASIS_TEXT_WB_STR_H
@@ -32,13 +36,13 @@ class ZB_API WBStr : public WStr {
 public:
     /// Empty, inside the object.
     WBStr() noexcept { Text::start(*this); }
-    /// Copies of texts, each made as by assigning to an empty string.
+    /// Copy a text, with the same result as assigning it to an empty string.
     WBStr(WChar const* text, std::uint64_t n = 0) noexcept { Text::make(*this, text, n); }
     WBStr(WStr const& text) noexcept { Text::make(*this, text.wstr(), text.size()); }
     WBStr(WBStr const& other) noexcept : WStr(other) { Text::makeOwned(*this, other.text_, other.size_); }
     ~WBStr() { Text::end(*this); }
 
-    /// Makes this a copy of the text. Assigning the string itself or its own text pointer changes nothing.
+    /// Assigns a copy of the text. Assigning the string itself or its own text pointer changes nothing.
     WBStr& operator=(WBStr const& other) {
         if (this != &other) Text::assignOwned(*this, other.text_, other.size_);
         return *this;
@@ -71,14 +75,14 @@ public:
         return *this;
     }
 
-    /// Inserts a text; behind the size nothing happens. What follows moves unit for unit, inner zeros included.
+    /// Inserts a text; a position behind the size has no effect. The units that follow move, including inner zeros.
     WBStr& insert(std::uint64_t pos, WChar const* text, std::uint64_t n = 0) {
         Text::insert(*this, pos, text, n);
         return *this;
     }
     WBStr& insert(std::uint64_t pos, WStr const& text) { return insert(pos, text.wstr(), text.size()); }
-    /// Puts a text in place of `count` units, or of those that there are; a count of 0 inserts, and an empty source only
-    /// removes. At the size it appends, behind it nothing happens.
+    /// Replaces `count` units, or as many as there are, by a text; a count of 0 inserts, and an empty source only
+    /// removes. At the size the text is appended; a position behind the size has no effect.
     WBStr& replace(std::uint64_t pos, std::uint64_t count, WChar const* text, std::uint64_t n = 0) {
         Text::replace(*this, pos, count, text, n);
         return *this;
@@ -99,22 +103,22 @@ public:
         return i < size_ ? text_[i] : WChar();
     }
 
-    /// The text for writing directly, capacity + 1 units; `resize` or `setSize` has to follow.
+    /// The text for direct writing, capacity + 1 units; must be followed by `resize` or `setSize`.
     WChar* getBuf() noexcept { return Text::text(*this); }
-    /// The capacity in code units: 255 inside the object, else the block's; the terminator is not counted.
+    /// The capacity in code units: 255 inside the object, otherwise the block's; the terminator is not counted.
     std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
-    /// Makes sure of a capacity of at least max(n, size + 1); the text stays, up to an inner terminator.
+    /// Ensures a capacity of at least max(n, size + 1); keeps the text up to an inner terminator.
     WBStr& extendBuf(std::uint64_t n) {
         CopyIfTooLong(text_, n, size_);
         return *this;
     }
-    /// Measures the text again after direct writes, then cuts it to n units; n = 0 sets no bound. A terminator is first
-    /// stored at the index of the capacity, as text-10 has it.
+    /// Measures the text again after direct writes, then cuts it to n units; n = 0 sets no bound. First stores a
+    /// terminator at the index of the capacity, as in text-10.
     WBStr& resize(std::uint64_t n = 0) noexcept {
         Text::resize(*this, n);
         return *this;
     }
-    /// The size becomes n, and a terminator is stored there.
+    /// Sets the size to n and stores a terminator there.
     /// \pre n is at most the capacity; nothing is checked
     WBStr& setSize(std::uint64_t n) noexcept {
         Text::setSize(*this, n);
@@ -125,7 +129,7 @@ public:
         Text::setSize(*this, 0);
         return *this;
     }
-    /// Takes away the last unit, if there is one.
+    /// Removes the last unit, if there is one.
     WBStr& cut() noexcept {
         Text::cutLast(*this);
         return *this;
@@ -145,28 +149,29 @@ public:
         WStr::toUpper(getBuf());
         return *this;
     }
-    /// Becomes the text in the other case: n units of it, or all of it where n is 0. The units from a terminator on are
+    /// Assign the text in the other case: n units of it, or all of it if n is 0. The units from a terminator on are
     /// zeros. Null gives the empty string.
-    /// \kept wide-03: a capacity below n + 1 is replaced by a block of n + 1 units, that is by a capacity of n, which is
-    ///       replaced again by the next text of n units
+    /// \kept wide-03: if the capacity is below n + 1, a block of n + 1 units replaces it, that is a capacity of n,
+    ///     which the next text of n units replaces again
     WBStr& toLower(WChar const* text, std::uint64_t n = 0);
     WBStr& toUpper(WChar const* text, std::uint64_t n = 0);
 
-    /// Counts on in the letters a to z: "" to "a", "az" to "ba", "zz" to "aaa".
+    /// Increments the text as a number with digits a to z: "" becomes "a", "az" becomes "ba", "zz" becomes "aaa".
     WBStr& NextLatin() {
         NextLatin(*this, size_ != 0 ? size_ - 1 : 0);
         return *this;
     }
-    /// The same step from the unit at `pos` leftwards; an empty string becomes "a", behind the last unit nothing happens.
+    /// The same from the unit at `pos` to the left; an empty string becomes "a", and a position behind the last unit
+    /// has no effect.
     static void NextLatin(WBStr& text, std::uint64_t pos) { Text::nextLatin(text, pos); }
 
 protected:
-    /// A zeroed block of `count` units.
+    /// Allocates a zeroed block of `count` units.
     virtual WChar* alloc(std::uint64_t count);
     /// Releases the block that holds the text.
     virtual void free();
 
-    /// The capacity check, through which every growing goes; see `BufStr`.
+    /// Checks the capacity whenever the text grows; see `BufStr`.
     bool CopyIfTooLong(WChar const* source, std::uint64_t need, std::uint64_t keep) {
         return Text::copyIfTooLong(*this, source, need, keep);
     }

@@ -1,5 +1,5 @@
 /// \file
-/// `WFxStr`: a view of wide text owned elsewhere that can be pointed at another text. Never copies.
+/// `WFxStr`: a view of wide text owned elsewhere that can be set to another text. It never copies text.
 
 #ifndef ZOR_BASIS_TEXT_WFX_STR_H
 #define ZOR_BASIS_TEXT_WFX_STR_H
@@ -15,7 +15,7 @@ class ZB_API WFxStr : public WStr {
 public:
     /// Views the shared empty text.
     WFxStr() noexcept = default;
-    /// Views a text of n units, or measures it where n is 0; null views the shared empty text.
+    /// Views a text of n units; measures the text if n is 0. Null views the shared empty text.
     WFxStr(WChar const* text, std::uint64_t n = 0) noexcept {
         if (text != nullptr) set(text, n != 0 ? n : Len(text));
     }
@@ -31,10 +31,10 @@ public:
     }
     /// Views the shared empty text.
     WFxStr& clear() noexcept { return set(StrEmpty, 0); }
-    /// Whether this is the very text that is viewed.
-    /// \kept wide-02: addresses are compared, never texts
+    /// Tells whether the view points at exactly this text.
+    /// \kept wide-02: the function compares addresses, never texts
     bool equal(WChar const* text) const noexcept {
-        // kept wide-02: callers ask whether they have to follow a moved buffer
+        // kept wide-02: callers use this to learn whether their buffer has moved
         return text_ == text;
     }
 };

@@ -1,7 +1,7 @@
 /// \file
-/// Short narrow texts by words of 8 bytes, in the caller's code: copying and comparing strings that own their text. All
-/// bytes of an owned text may be read, whatever lies among them; what is longer goes into the library. Users have no need
-/// of it.
+/// Copies and compares short narrow texts in words of 8 bytes, inline in the caller's code, for strings that own their
+/// text. All bytes of an owned text may be read, including bytes behind a zero; longer texts are handled in the
+/// library. Not meant for users.
 
 #ifndef ZOR_BASIS_TEXT_WORD_OPS_H
 #define ZOR_BASIS_TEXT_WORD_OPS_H
@@ -15,8 +15,8 @@
 
 namespace ZOR_Basis::detail {
 
-/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read. For the order
-/// that is the size of the shorter one, and the terminator behind it may be read too.
+/// `copyText`, `sameTexts` and the order of `compareTexts` for texts whose `length` bytes may all be read. For the
+/// order, `length` is the size of the shorter text, whose terminator may be read too.
 ZB_API_STRAIGHT void copyOwnedText(char* target, char const* source, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT bool sameOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
 ZB_API_STRAIGHT int compareOwnedTexts(char const* a, char const* b, std::uint64_t length) noexcept;
@@ -32,9 +32,11 @@ inline std::uint64_t firstByteHighest(std::uint64_t word) noexcept {
 struct WordPair {
     WordPair(std::uint64_t a, std::uint64_t b) noexcept : word(a), different(a ^ b), decided(different | zerosIn(a)) {}
 
-    /// Whether they end together, before any difference; where they are decided.
+    /// Tells whether both texts end together, before any difference.
+    /// \pre `decided` is not 0
     bool endTogether() const noexcept { return (decided & (0 - decided) & different) == 0; }
-    /// -1, 0 or 1; where they are decided.
+    /// Returns -1, 0 or 1.
+    /// \pre `decided` is not 0
     int order() const noexcept {
         std::uint64_t const a = firstByteHighest(word);
         std::uint64_t const b = firstByteHighest(word ^ different);
@@ -46,7 +48,7 @@ struct WordPair {
     std::uint64_t decided;
 };
 
-/// The first 4 and the last 4 of 4 to 8 bytes; bytes keep their order, though some may be there twice.
+/// Loads the first 4 and the last 4 of 4 to 8 bytes; the bytes keep their order, though some may occur twice.
 inline std::uint64_t loadEnds(char const* text, std::uint64_t length) noexcept {
     return loadWord<std::uint32_t>(text) | std::uint64_t{loadWord<std::uint32_t>(text + length - 4)} << 32;
 }
@@ -141,8 +143,8 @@ inline void copyGiven(char* target, char const* source, std::uint64_t length) no
     copyText(target, source, length);
 }
 
-/// Of strings with room for N bytes inside. Where that is little, their texts are mostly short and compared here; longer
-/// ones go straight into the library.
+/// Compares texts of strings with N inline bytes. If N is small, texts are usually short and compared here; other texts
+/// go straight to the library.
 template <std::uint64_t N>
 inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexcept {
     if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
@@ -158,8 +160,8 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
     return sameOwnedTexts(a, b, length);
 }
 
-/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size, so that the terminator of the shorter
-/// one decides at the latest.
+/// The same for the order: -1, 0 or 1. Both texts have a terminator at their size, so the terminator of the shorter one
+/// decides at the latest.
 template <std::uint64_t N>
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
     std::uint64_t const length = aSize < bSize ? aSize : bSize;

@@ -1,10 +1,11 @@
 /// \file
-/// `WStr`: a read-only view of wide text, the twin of `Str` in 16-bit code units.
+/// `WStr`: a read-only view of wide text, the counterpart of `Str` in 16-bit code units.
 ///
-/// As for narrow text a length of 0 in a source means "measure it", and a null or empty text is an empty source. What
-/// differs from `Str`: the order is reversed (wide-01), `==` with a length of 0 on the right compares whole texts as
-/// there, and only the comparisons declared here exist. Every other one is refused, through `std::less<>` and its like too,
-/// as it would compare addresses. In conditions, in `delete` and beside other pointers the rules of `Str` hold.
+/// As for narrow text, a length of 0 in a source means "measure it", and a null or empty text is an empty source. `==`
+/// with a length of 0 on the right compares whole texts, as in `Str`. Two things differ from `Str`: the order is
+/// reversed (wide-01), and only the comparisons declared here exist. All others are deleted, also for `std::less<>` and
+/// its like, because they would compare addresses. In conditions, in `delete` and with other pointers the rules of
+/// `Str` apply.
 
 #ifndef ZOR_BASIS_TEXT_WSTR_H
 #define ZOR_BASIS_TEXT_WSTR_H
@@ -24,35 +25,35 @@ namespace ZOR_Basis {
 
 class ZB_API WStr : public detail::PointerGuard<WChar> {
 public:
-    /// Bytes of a code unit.
+    /// The number of bytes in a code unit.
     static constexpr std::uint64_t SizeWChar = 2;
-    /// The one empty wide text that all views and strings share. Never written, never released.
+    /// The one empty wide text that all views and strings share. It is never written or released.
     static WChar const* const StrEmpty;
 
     /// Views the empty text.
     WStr() noexcept : size_(0), text_(StrEmpty) {}
     /// Views a zero-terminated text and measures it.
-    /// \param text  null gives the empty text
+    /// \param text  is zero-terminated; null gives the empty text
     WStr(WChar const* text) noexcept
         : size_(text != nullptr ? detail::textLength(text) : 0), text_(text != nullptr ? text : StrEmpty) {}
-    /// Stores both words as given; nothing is measured.
+    /// Stores pointer and size as given; nothing is measured.
     WStr(WChar const* text, std::uint64_t size) noexcept : size_(size), text_(text) {}
     /// Views the text of a standard string with its size.
     WStr(std::basic_string<WChar> const& text) noexcept : size_(text.size()), text_(text.c_str()) {}
 
-    /// Code units of text, without the terminator.
+    /// The number of code units of text, without the terminator.
     std::uint64_t size() const noexcept { return size_; }
     WChar const* wstr() const noexcept { return text_; }
     operator WChar const*() const noexcept { return text_; }
-    /// Whether the pointer is not null, as the conversion to a pointer has it.
+    /// Tells whether the pointer is not null, like the conversion to a pointer.
     [[deprecated("tells whether there is a pointer, not whether there is text: ask empty()")]] explicit
     operator bool() const noexcept {
         return text_ != nullptr;
     }
-    /// The text with the size as it is, inner zeros included.
+    /// The text with its size unchanged, including inner zeros.
     explicit operator std::basic_string_view<WChar>() const noexcept { return {text_, size_}; }
     bool empty() const noexcept { return size_ == 0; }
-    /// The first unit; the terminator where the text is empty.
+    /// The first unit; the terminator if the text is empty.
     WChar first() const noexcept { return *text_; }
     /// The last unit.
     /// \pre not empty
@@ -63,25 +64,27 @@ public:
         return text_[static_cast<std::uint64_t>(index)];
     }
 
-    /// Whether this text equals the source. Not 0: this size must be n, and so many units must be the same, compared up to
-    /// a common terminator. 0: the two texts up to their terminators. The same pointer is always equal.
+    /// Tells whether this text equals the source. If n is not 0, this size must be n, and n units must be equal,
+    /// compared up to a common terminator. If n is 0, the two texts are compared up to their terminators. Two equal
+    /// pointers are always equal texts.
     bool eq(WChar const* text, std::uint64_t n = 0) const noexcept {
         if (text_ == text) return true;
         if (n != 0) return size_ == n && detail::sameTexts(text_, text, n);
         return detail::compareTexts(text_, text) == 0;
     }
-    /// The right-hand size alone chooses the comparison, as for `Str`.
+    /// The right-hand size alone selects the comparison, as for `Str`.
     bool operator==(WStr const& other) const noexcept { return eq(other.text_, other.size_); }
     bool operator==(WChar const* other) const noexcept { return eq(other, 0); }
     bool operator!=(WStr const& other) const noexcept { return !(*this == other); }
     bool operator!=(WChar const* other) const noexcept { return !(*this == other); }
-    // The same from the other side; here the `WStr` is the right-hand operand, whose size decides.
+    // The same with the operands exchanged; here the `WStr` is the right-hand operand, whose size decides.
     friend bool operator==(WChar const* a, WStr const& b) noexcept { return WStr(a) == b; }
     friend bool operator!=(WChar const* a, WStr const& b) noexcept { return !(a == b); }
 
-    /// -1 where the argument's text sorts before this one, 1 where behind, by unsigned code units up to the terminators.
-    /// \kept wide-01: this is the reverse of `Str::compare`, and `<` and `>` follow it: `a < b` holds where b's text
-    ///       sorts before a's
+    /// Returns -1 if the argument's text sorts before this one, 1 if after it, by unsigned code units up to the
+    /// terminators.
+    /// \kept wide-01: this is the reverse of `Str::compare`, and `<` and `>` follow it: `a < b` holds if b's text sorts
+    ///     before a's
     int compare(WStr const& other) const noexcept { return compare(other.text_); }
     int compare(WChar const* other) const noexcept {
         if (text_ == other) return 0;
@@ -96,7 +99,7 @@ public:
     bool operator<(WStr const& other) const noexcept { return compare(other) < 0; }
     bool operator>(WStr const& other) const noexcept { return compare(other) > 0; }
 
-    // Without these the texts' addresses would be compared.
+    // Without these declarations the language would compare the texts' addresses.
     bool operator<=(WStr const&) const = delete;
     bool operator>=(WStr const&) const = delete;
     bool operator<(WChar const*) const = delete;
@@ -116,7 +119,7 @@ public:
     WChar const* find(WStr const& text) const noexcept { return find(text.text_); }
     WChar const* find(WChar const* text) const noexcept { return detail::findText(text_, text); }
 
-    /// Code units before the terminator; 0 for null.
+    /// The number of code units before the terminator; 0 for null.
     static std::uint64_t Len(WChar const* text) noexcept { return text != nullptr ? detail::textLength(text) : 0; }
     /// Change each unit up to the terminator by the runtime's `towlower` and `towupper`.
     static void toLower(WChar* text) noexcept;
@@ -131,7 +134,7 @@ static_assert(sizeof(WStr) == 16);
 
 } // namespace ZOR_Basis
 
-/// Over the units before the terminator, at most `size` of them; so do the hashes of all wide text types, and they agree.
+/// Hashes the units before the terminator, at most `size` of them, as for all wide text types, whose hashes agree.
 template <>
 struct std::hash<ZOR_Basis::WStr> {
     std::size_t operator()(ZOR_Basis::WStr const& text) const noexcept {

@@ -1,11 +1,16 @@
 /// \file
-/// `BaseTimer`: one measurement in progress. It keeps no statistics; a finished measurement is handed to a `PileTimer`.
+/// `BaseTimer`: one measurement in progress. It keeps no statistics; `stop` adds the finished measurement to a
+/// `PileTimer`.
 ///
-/// Elapsed time is stop − start, suspensions included; the suspended time goes beside it. Misuse is absorbed in silence;
-/// only a pile's own measurement complains.
+///     BaseTimer timer(true, false);
+///     render(page);
+///     timer.stop(pile);
 ///
-/// \thread  one thread at a time
-/// \cost  a reading of the performance counter or two and a few stores; no memory, and no lock but the pile's
+/// The elapsed time is stop - start, including suspensions; the suspended time is counted separately. Misuse is ignored
+/// silently; only a pile's own measurement reports it.
+///
+/// \thread one thread at a time
+/// \cost one or two readings of the performance counter and a few stores; no allocation, and no lock except the pile's
 
 #ifndef ZOR_BASIS_TIMERS_BASE_TIMER_H
 #define ZOR_BASIS_TIMERS_BASE_TIMER_H
@@ -20,13 +25,13 @@ namespace ZOR_Basis {
 
 class PileTimer;
 
-/// The same in memory as the record that it is.
+/// Has the same memory layout as its base, the record.
 class ZB_API BaseTimer : public zbTimerDat {
 public:
-    /// Idle.
+    /// Constructs an idle timer.
     BaseTimer() : zbTimerDat{} {}
-    /// \param startNow  starts
-    /// \param beginSuspended  in suspension; without `startNow` it means nothing
+    /// \param startNow  starts the timer
+    /// \param beginSuspended  starts it suspended; no effect without `startNow`
     BaseTimer(bool startNow, bool beginSuspended);
     BaseTimer(BaseTimer const&) = default;
     BaseTimer(BaseTimer&&) = default;
@@ -35,34 +40,35 @@ public:
 
     bool started() const { return zbTimerDat::start > 0; }
     bool isSuspended() const { return suspendStart > 0; }
-    /// The ticks from start to stop.
-    /// \kept timers-01: 0 after every finished measurement, as `stop` leaves the record idle; it tells something only of
-    ///     a record that was filled in another way
+    /// Returns the ticks from start to stop.
+    /// \kept timers-01: 0 after every finished measurement, because `stop` leaves the record idle; the result is
+    ///     meaningful only for a record that was filled in another way
     std::int64_t total() const { return zbTimerDat::stop - zbTimerDat::start; }
-    /// The ticks of the suspensions that are over.
+    /// Returns the ticks of the suspensions that have ended.
     std::int64_t suspended() const { return zbTimerDat::suspended; }
 
-    /// Starts; a timer that runs keeps its start.
-    /// \param beginSuspended  then suspends, whether it ran before or not
+    /// Starts the timer; a running timer keeps its start.
+    /// \param beginSuspended  then suspends the timer, whether it ran before or not
     void start(bool beginSuspended);
     /// Opens a suspension, unless one is open.
-    /// \kept timers-02: also before the start; what was suspended then counts, and may exceed the elapsed time
+    /// \kept timers-02: this also works before the start; suspended time from before the start counts, and may exceed
+    ///     the elapsed time
     void suspend();
     /// Ends the suspension, if one is open.
     void resume();
-    /// Ends the measurement and the suspension that is open, at one reading, and leaves the timer idle. Idle already,
-    /// it does nothing.
-    /// \param pile  receives the measurement (`PileTimer::addTotal`); null: it is lost
+    /// Ends the measurement and an open suspension with the same reading, and leaves the timer idle. Does nothing if
+    /// the timer is idle.
+    /// \param pile  receives the measurement (`PileTimer::addTotal`); null: the measurement is discarded
     void stop(PileTimer* pile);
     /// Makes the timer idle.
     void reset() { static_cast<zbTimerDat&>(*this) = zbTimerDat{}; }
 
-    /// The performance counter, in ticks: `QueryPerformanceCounter` on Windows, the nanoseconds of `CLOCK_MONOTONIC`
-    /// elsewhere.
+    /// Reads the performance counter, in ticks: `QueryPerformanceCounter` on Windows, the nanoseconds of
+    /// `CLOCK_MONOTONIC` elsewhere.
     static std::int64_t Clock();
-    /// Asks for the counter's ticks per second. They are read so when the library is loaded, and never again.
-    /// \kept timers-03: the assertion that a missing counter raises (line 100) names `PileTimer::Clock()`
-    /// \return what the system answered, also after that assertion
+    /// Queries the counter's ticks per second. The library calls this when it is loaded, and never again.
+    /// \kept timers-03: the assertion for a missing counter (line 100) names `PileTimer::Clock()`
+    /// \return the system's answer, also after that assertion
     static std::int64_t Init();
 
 protected:

@@ -1,7 +1,9 @@
 /// \file
-/// `BaseTimerAuto`: measures a scope by a measurement of its own, so that nested and concurrent scopes may feed one pile.
+/// `BaseTimerAuto`: measures a scope with its own measurement, so nested and concurrent scopes may share one pile.
 ///
-/// \thread  one thread at a time; the pile is shared as its class allows
+///     BaseTimerAuto timer(pile, manager, true, false); // stops at the end of the scope
+///
+/// \thread one thread at a time; the pile may be shared as its class allows
 
 #ifndef ZOR_BASIS_TIMERS_BASE_TIMER_AUTO_H
 #define ZOR_BASIS_TIMERS_BASE_TIMER_AUTO_H
@@ -16,26 +18,26 @@ class TimerMgr;
 
 class ZB_API BaseTimerAuto : public detail::NotDeletable<BaseTimerAuto> {
 public:
-    /// Inert: without a pile, it does nothing ever.
+    /// Inert: without a pile, it never does anything.
     BaseTimerAuto() = default;
     /// \param pile  receives the measurement; null: inert
-    /// \param manager  inert if it is not null and inactive
-    /// \param startNow, beginSuspended  as for `BaseTimer`
-    /// \kept timers-12: the manager is asked here and never again: what it switches off stays off
+    /// \param manager  makes the timer inert if it is not null and inactive
+    /// \param startNow, beginSuspended  have the same meaning as for `BaseTimer`
+    /// \kept timers-12: only the constructor asks the manager: a timer that is inert then stays inert
     BaseTimerAuto(PileTimer* pile, TimerMgr* manager, bool startNow, bool beginSuspended);
     BaseTimerAuto(BaseTimerAuto const&) = delete;
-    /// Takes the pile and a copy of the measurement; its own measurement is lost.
+    /// Copies the pile and the measurement; its own measurement is discarded.
     BaseTimerAuto& operator=(BaseTimerAuto const&) = default;
-    /// `stop`.
+    /// Calls `stop`.
     ~BaseTimerAuto() { stop(); }
 
-    /// As `BaseTimer` has them, unless inert.
+    /// The same as in `BaseTimer`; no effect if inert.
     void start(bool beginSuspended);
     void stop();
     void suspend();
     void resume();
 
-    /// The pile; null when inert.
+    /// The pile; null if inert.
     operator PileTimer*() { return pile_; }
     PileTimer* operator->() { return pile_; }
 

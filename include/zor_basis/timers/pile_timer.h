@@ -1,9 +1,9 @@
 /// \file
-/// `PileTimer`: a named counter of the time that one piece of work takes. It is a measurement itself and piles up finished
-/// ones: how many, their sum, the longest and the shortest, and how long they were suspended.
+/// `PileTimer`: measures the time that a named piece of work takes. It has a measurement of its own and keeps
+/// statistics of finished ones: their number, sum, maximum and minimum, and how long they were suspended.
 ///
-/// Misuse of its own measurement is reported through `xos_Assert`, with the tag "zor_basis", where the timer's checks
-/// are on; the operation goes on afterwards:
+/// If the timer's checks are on, misuse of its own measurement is reported through `xos_Assert`, with the tag
+/// "zor_basis"; the operation then continues:
 ///
 /// | operation | condition | line | message |
 /// |---|---|---|---|
@@ -12,9 +12,9 @@
 /// | `suspend` | suspended already | 197 | "PileTimer::suspend() : already suspended" |
 /// | `resume` | not suspended | 204 | "PileTimer::resume() : not suspended" |
 ///
-/// \kept timers-04: the message of `stop` names `start()`, as those who search logs for it know it
-/// \thread  one thread at a time; a report may read and reset the statistics meanwhile. `PileTimerMT` tells what threads
-///     may share
+/// \kept timers-04: the message of `stop` names `start()`, because existing log searches expect that text
+/// \thread one thread at a time; a report may read and reset the statistics concurrently. `PileTimerMT` says what
+///     threads may share
 
 #ifndef ZOR_BASIS_TIMERS_PILE_TIMER_H
 #define ZOR_BASIS_TIMERS_PILE_TIMER_H
@@ -31,8 +31,8 @@ namespace ZOR_Basis {
 
 namespace detail {
 
-/// A number that one thread changes while others read or clear it. A change is no exchange: a clearing that falls between
-/// its reading and its writing is lost.
+/// A number that one thread changes while others read or clear it. A change is a read followed by a write, not an
+/// atomic exchange: a clear between the two is lost.
 template <class T>
 class Statistic {
 public:
@@ -53,41 +53,41 @@ private:
 
 class ZB_API PileTimer : public BaseTimer {
 public:
-    /// \param name  copied; null is the empty name
-    /// \param checks  whether misuse is reported
+    /// \param name  is copied; null counts as the empty name
+    /// \param checks  says whether misuse is reported
     PileTimer(char const* name, bool checks);
-    /// Copies everything: the measurement, the statistics, id, checks and name.
+    /// Copies all members: the measurement, the statistics, id, checks and name.
     PileTimer(PileTimer const&) = default;
     PileTimer& operator=(PileTimer const&) = default;
     virtual ~PileTimer();
 
     Str const& name() const { return name_; }
     char const* cname() const { return name_.c_str(); }
-    /// The slot in the timer's manager; 0 until a manager gives one.
+    /// The slot in the timer's manager; 0 until a manager assigns one.
     std::uint64_t id() const { return id_; }
     void setId(std::uint64_t id) { id_ = id; }
-    /// Whether the names are equal; nothing else is compared.
+    /// Tells whether the names are equal; nothing else is compared.
     bool eq(PileTimer const& other) const { return name() == other.name(); }
 
-    /// Starts the own measurement; one that runs keeps its start.
-    /// \param beginSuspended  then suspends, if that is not so already
-    /// \error the timer has started already: see above
+    /// Starts the timer's own measurement; a running one keeps its start.
+    /// \param beginSuspended  then suspends the timer, unless it is suspended
+    /// \error the timer has already started: see above
     void start(bool beginSuspended);
     /// Opens a suspension, also before the start.
-    /// \error one is open: see above; it goes on
+    /// \error a suspension is open: see above; it continues
     void suspend();
-    /// Ends the suspension.
-    /// \error none is open: see above
+    /// Ends the open suspension.
+    /// \error no suspension is open: see above
     void resume();
-    /// Ends the own measurement and piles it.
-    /// \error the timer has not started: see above; nothing is piled
+    /// Ends the timer's own measurement and adds it to the statistics.
+    /// \error the timer has not started: see above; nothing is added
     void stop();
-    /// Adds a finished measurement to the statistics and makes it idle. One that was not started is left as it is. Of
-    /// equal measurements the first keeps its place as the longest or the shortest.
-    /// \kept timers-05: a shortest time of 0 ticks counts as none yet, so the next measurement replaces it
-    /// \pre the measurement was stopped: else its elapsed time is negative
+    /// Adds a finished measurement to the statistics and makes it idle. A measurement that was not started is ignored.
+    /// Of equal measurements the first remains the longest or the shortest.
+    /// \kept timers-05: a minimum of 0 ticks counts as "none yet", so the next measurement replaces it
+    /// \pre the measurement was stopped; otherwise its elapsed time is negative
     void addTotal(BaseTimer& finished);
-    /// Clears the own measurement and all statistics; id, checks and name stay.
+    /// Clears the timer's own measurement and all statistics; id, checks and name stay.
     void reset();
 
     /// Formats one row of a report.
@@ -97,19 +97,19 @@ public:
     /// | 0 | name, from the left | |
     /// | 40 | count | 48 |
     /// | 50 | total | 63 |
-    /// | 65 | average: the converted total by the count | 78 |
+    /// | 65 | average: converted total divided by count | 78 |
     /// | 80 | maximum | 93 |
-    /// | 95 | which measurement was the longest, from 1 | 108 |
+    /// | 95 | number of the longest measurement, from 1 | 108 |
     /// | 110 | minimum | 123 |
     /// | 125 | suspended in total | 138 |
     /// | 140 | suspended at most, in one measurement | 153 |
-    /// | 155 | nothing | |
+    /// | 155 | empty | |
     ///
-    /// Digits come in groups of three (`thousandsSeparator`). With a count of 0 only the name and the count are there.
-    /// \param line  becomes the row, always 156 bytes
-    /// \param unitsPerSecond  the unit of the durations: 1000000 for microseconds; fractions are cut off
-    /// \kept timers-06: a row with a count has a zero byte at column 154
-    /// \kept timers-07: a name of 40 bytes or more runs into the columns behind it, whose digits overwrite it
+    /// Digits are grouped by three (`thousandsSeparator`). If the count is 0, the row has only name and count.
+    /// \param line  receives the row, always 156 bytes
+    /// \param unitsPerSecond  sets the unit of durations: 1000000 for microseconds; fractions are cut off
+    /// \kept timers-06: a row whose count is not 0 has a zero byte at column 154
+    /// \kept timers-07: a name of 40 bytes or more extends into the following columns, whose digits overwrite it
     void print(BufStr<255>& line, int unitsPerSecond) const;
 
     /// The same for a timer that may be null; then they do nothing.
@@ -120,7 +120,7 @@ public:
     static void reset(PileTimer* timer);
 
 protected:
-    /// Around each piling. Here they do nothing.
+    /// Called around each addition to the statistics. In this class they do nothing.
     virtual void lock();
     virtual void unlock();
 

@@ -1,8 +1,8 @@
 /// \file
-/// `PileTimerMT`: a pile that many threads feed at once. Managers make it (`TimerMgr::create`).
+/// `PileTimerMT`: a pile that many threads may feed concurrently. Managers make it (`TimerMgr::create`).
 ///
-/// \thread  each thread runs a `BaseTimer` or `BaseTimerAuto` of its own and stops it into the shared pile. Only the piling
-///     is locked; the pile's own measurement belongs to one thread, as with any `PileTimer`
+/// \thread each thread runs its own `BaseTimer` or `BaseTimerAuto` and stops it into the shared pile. Only adding to
+///     the pile is locked; the pile's own measurement belongs to one thread, as with any `PileTimer`
 
 #ifndef ZOR_BASIS_TIMERS_PILE_TIMER_MT_H
 #define ZOR_BASIS_TIMERS_PILE_TIMER_MT_H
@@ -13,8 +13,8 @@ namespace ZOR_Basis {
 
 class ZB_API PileTimerMT : public PileTimer {
 public:
-    /// As a `PileTimer`, with a mutex of the platform layer.
-    /// \error a mutex that cannot be made leaves a pile that is not locked
+    /// Constructs a `PileTimer` with a mutex of the platform layer.
+    /// \error if the mutex cannot be made, the pile is not locked
     PileTimerMT(char const* name, bool checks);
     PileTimerMT(PileTimerMT const&) = delete;
     PileTimerMT& operator=(PileTimerMT const&) = delete;

@@ -1,7 +1,7 @@
 /// \file
-/// The character between groups of three digits in reports, for the whole process.
+/// The character that separates groups of three digits in reports, for the whole process.
 ///
-/// \thread  thread-safe
+/// \thread thread-safe
 
 #ifndef ZOR_BASIS_TIMERS_THOUSANDS_SEPARATOR_H
 #define ZOR_BASIS_TIMERS_THOUSANDS_SEPARATOR_H
@@ -10,7 +10,7 @@
 
 namespace ZOR_Basis {
 
-/// "," at first; 0: digits are not grouped.
+/// The initial value is ","; 0 means that digits are not grouped.
 ZB_API char thousandsSeparator();
 ZB_API void setThousandsSeparator(char separator);
 

@@ -1,13 +1,13 @@
 /// \file
-/// `zbTimerDat`: the record of one measurement. C-clean.
+/// `zbTimerDat`: the record of one measurement. Valid C.
 
 #ifndef ZOR_BASIS_TIMERS_TIMER_DAT_H
 #define ZOR_BASIS_TIMERS_TIMER_DAT_H
 
 #include <stdint.h>
 
-/// Times are readings of the performance counter, in ticks. All zero: nothing is being measured, and so it is again after
-/// every end of a measurement.
+/// Times are readings of the performance counter, in ticks. If all are zero, no measurement is in progress; the end of
+/// a measurement sets all to zero.
 typedef struct zbTimerDat {
     int64_t start;        ///< reading at the start; 0: not started
     int64_t stop;         ///< reading at the stop

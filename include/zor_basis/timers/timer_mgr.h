@@ -1,20 +1,28 @@
 /// \file
 /// `TimerMgr`: a named group of pile timers, which it owns, finds by id, switches on and off as a whole, and reports.
 ///
-/// Managers are made by `New`, listed in one registry and live as long as the process, and so do their timers. A manager
-/// is inactive at first: nothing is measured through it until `setActive(true)`.
+/// `New` makes managers and lists them in one registry. They live as long as the process, and so do their timers. A
+/// manager is inactive at first: nothing is measured through it until `setActive(true)`.
 ///
-/// A report is a file in the folder "timer" of the root folder, named SECONDS_MANAGER_RIP.timer: the time in seconds since
-/// 1970 UTC as a signed 32-bit number, the manager's name, and the number that `setRip` gave. It is a head of two lines,
-/// the line of column titles, and a row (`PileTimer::print`, in microseconds) for every timer by rising id.
+///     TimerMgr* const manager = TimerMgr::New("render", 0);
+///     PileTimer* const pile = manager->createTimer("page", 0, true);
+///     manager->setActive(true);
+///     { BaseTimerAuto timer(pile, manager, true, false); render(); }
+///     manager->reset(true); // writes a report
+///
+/// A report is a file in the folder "timer" of the root folder, named SECONDS_MANAGER_RIP.timer: the time in seconds
+/// since 1970 UTC as a signed 32-bit number, the manager's name, and the number that `setRip` set. It consists of a
+/// header of two lines, the line of column titles, and a row (`PileTimer::print`, in microseconds) for every timer in
+/// ascending order of ids.
 ///
 ///     1700000000_render_0.timer
 ///
-/// \kept timers-08: reports of one manager within one second go into one file, each with its own head
-/// \thread  thread-safe: `Mgr`, `New`, `Get`, `setRip`, `setActive`, `active`; with each other `createTimer`, `create`,
-///     `reset` and `resetTimers`. Lookups by id (`get`, `getTimer`, `start(id)` and its siblings) take no lock: they are safe
-///     while another thread creates a timer in a slot that exists (`New` reserves slots), but not while one is created at
-///     a higher id or at the end, which may move all slots. One timer is driven by one thread at a time, as `PileTimer` says
+/// \kept timers-08: reports of one manager within one second go into the same file, each with its own header
+/// \thread thread-safe: `Mgr`, `New`, `Get`, `setRip`, `setActive`, `active`; with each other `createTimer`, `create`,
+///     `reset` and `resetTimers`. Lookups by id (`get`, `getTimer`, `start(id)` and its siblings) take no lock. They
+///     are safe while another thread creates a timer in an existing slot (`New` reserves slots), but not while a thread
+///     creates one at a higher id or at the end, which may move all slots. One thread at a time drives a timer, as
+///     `PileTimer` says
 
 #ifndef ZOR_BASIS_TIMERS_TIMER_MGR_H
 #define ZOR_BASIS_TIMERS_TIMER_MGR_H
@@ -35,46 +43,45 @@ public:
     TimerMgr(TimerMgr const&) = delete;
     TimerMgr& operator=(TimerMgr const&) = delete;
 
-    /// Makes a timer with its checks on, owned by the manager.
-    /// \param name  copied; null is the empty name
-    /// \param id  its slot; 0: the one behind the last, which in an empty manager is slot 0
+    /// Makes a timer with its checks on; the manager owns it.
+    /// \param name  is copied; null counts as the empty name
+    /// \param id  selects the slot; 0: the slot after the last, which in an empty manager is slot 0
     /// \param forThreads  makes a `PileTimerMT`
-    /// \kept timers-09: a timer that stood in the slot stays alive, for those who use it still, but its manager knows it
-    ///     no longer
+    /// \kept timers-09: an earlier timer of the slot stays alive for its users, but the manager no longer knows it
     /// \pre id is not the highest 64-bit number
-    /// \error the slot was taken: assertion "TimerMgr::add() - already registered!" (line 356), then as above
+    /// \error if the slot was taken: assertion "TimerMgr::add() - already registered!" (line 356), then as above
     virtual PileTimer* createTimer(char const* name, std::uint64_t id, bool forThreads) = 0;
-    /// The timer of a slot; null where there is none.
+    /// Returns the timer of a slot; null if there is none.
     virtual PileTimer* getTimer(std::uint64_t id) = 0;
     /// Resets all timers, as `PileTimer::reset` does.
     /// \param print  writes a report first
-    /// \kept timers-10: the timers are reset also where the report cannot be written
-    /// \error a report that cannot be opened: assertion "TimerMgr::reset() - cannot open the report PATH". The folder "timer"
-    ///     is made first where it is missing, the root is not
+    /// \kept timers-10: the timers are reset even if the report cannot be written
+    /// \error if the report cannot be opened: assertion "TimerMgr::reset() - cannot open the report PATH". The function
+    ///     first makes the folder "timer" if it is missing, but not the root
     virtual void resetTimers(bool print) = 0;
 
-    /// The registry of all managers, made at the first use of any manager together with the report folder.
+    /// Returns the registry of all managers. The first use of any manager makes it, together with the report folder.
     static TimerMgrMgr* Mgr();
-    /// Makes a manager, which the registry keeps. Names need not differ.
-    /// \param maxId  unless 0, slots 0 to maxId are reserved: a timer without an id of its own comes behind them
+    /// Makes a manager, which the registry keeps. Names need not be unique.
+    /// \param maxId  reserves slots 0 to maxId unless it is 0: timers without an id of their own come after them
     /// \pre maxId is not the highest 64-bit number
     static TimerMgr* New(char const* name, std::uint64_t maxId);
-    /// The first manager of that name; null if there is none, and for null.
+    /// Returns the first manager of that name; null if there is none, and for null.
     static TimerMgr* Get(char const* name);
-    /// Sets the number in the names of report files, which is 0 at first.
-    /// \kept timers-11: the first number other than 0 stays for the life of the process
+    /// Sets the number in the names of report files, initially 0.
+    /// \kept timers-11: the first number other than 0 is final for the life of the process
     static void setRip(int rip);
 
-    /// `createTimer`, and null for null.
+    /// Calls `createTimer`; null for a null manager.
     static PileTimer* create(TimerMgr* manager, char const* name, std::uint64_t id, bool forThreads);
-    /// `getTimer`, and null for null.
+    /// Calls `getTimer`; null for a null manager.
     static PileTimer* get(TimerMgr* manager, std::uint64_t id);
 
     void setActive(bool active) { active_.store(active, std::memory_order_relaxed); }
     bool active() const { return active_.load(std::memory_order_relaxed); }
 
-    /// `PileTimer::start(false)`, `stop()`, `suspend()` and `resume()` of the timer in a slot. They do nothing while the
-    /// manager is inactive and where the slot is empty.
+    /// Call `PileTimer::start(false)`, `stop()`, `suspend()` and `resume()` of the timer in a slot. They do nothing
+    /// while the manager is inactive, and if the slot is empty.
     void start(std::uint64_t id) {
         if (active()) startSlot(id);
     }
@@ -107,7 +114,7 @@ public:
     void resume(I id) {
         resume(static_cast<std::uint64_t>(id));
     }
-    /// The same of a timer given directly; null does nothing.
+    /// The same for a timer given directly; null does nothing.
     void start(PileTimer* timer);
     void stop(PileTimer* timer);
     void suspend(PileTimer* timer);
@@ -142,7 +149,7 @@ public:
     }
     static void resume(TimerMgr* manager, PileTimer* timer);
 
-    /// `resetTimers`, unless the manager is inactive.
+    /// Calls `resetTimers` unless the manager is inactive.
     void reset(bool print);
     static void reset(TimerMgr* manager, bool print);
 
@@ -151,7 +158,7 @@ protected:
     virtual ~TimerMgr();
 
 private:
-    /// Asks once more whether it is active, as that may change while the timer is looked up.
+    /// Checks again whether the manager is active, because that may change during the lookup.
     PileTimer* activeSlot(std::uint64_t id) {
         PileTimer* const timer = getTimer(id);
         return active() ? timer : nullptr;

@@ -1,7 +1,11 @@
 /// \file
-/// `FileCondition`: which of the entries that fit kind and wildcard are kept.
+/// `FileCondition`: decides which of the entries that match kind and wildcard are kept.
 ///
-/// \thread  called by the listing or walking thread
+///     struct NotHidden : FileCondition {
+///         bool acceptEntry(FileEntry* entry) override { return entry->getName().first() != '.'; }
+///     };
+///
+/// \thread called by the listing or walking thread
 
 #ifndef ZOR_BASIS_WALK_FILE_CONDITION_H
 #define ZOR_BASIS_WALK_FILE_CONDITION_H
@@ -13,7 +17,7 @@ namespace ZOR_Basis {
 
 class FileIterator;
 
-/// Keeps everything; derived classes choose.
+/// Keeps everything; derived classes decide.
 class ZB_API FileCondition {
 public:
     FileCondition() = default;
@@ -22,9 +26,11 @@ public:
     FileCondition& operator=(FileCondition const&) = default;
     FileCondition& operator=(FileCondition&&) = default;
 
-    /// Asked by the flat listing (`FileIterator::next`). \return whether to keep the name
+    /// Called by the flat listing (`FileIterator::next`).
+    /// \return whether to keep the name
     virtual bool acceptName(FileIterator* it, char const* name);
-    /// Asked by walks. \return whether to report the entry; a directory that is not reported is entered all the same
+    /// Called by walks.
+    /// \return whether to report the entry; a walk enters a directory even if it is not reported
     virtual bool acceptEntry(FileEntry* entry);
     virtual ~FileCondition();
 };

@@ -1,7 +1,10 @@
 /// \file
 /// `FileCopyVisitor`: copies the entries that a walk reports into one directory.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
+///     FileCopyVisitor copier("backup", true, true);
+///     FileIterator("jobs", LOOK_BOTH, nullptr, nullptr).doIt(&copier, false, true);
+///
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_COPY_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_COPY_VISITOR_H
@@ -12,18 +15,20 @@
 
 namespace ZOR_Basis {
 
-/// Nothing is taken back where a copy fails midway.
-/// \thread  the walking thread
+/// If a copy fails midway, what was copied stays.
+/// \thread the walking thread
 class ZB_API FileCopyVisitor : public FileVisitor {
 public:
-    /// \param target  the directory; it is not made
-    /// \param overwrite  what is at the destination is removed first, a directory with all that is in it
-    /// \param recursive  directories are copied with their sub-directories, else with their files only
+    /// \param target  names the directory; the visitor does not make it
+    /// \param overwrite  removes an existing destination first, a directory with all its contents
+    /// \param recursive  copies directories with their sub-directories; false: with their files only
     FileCopyVisitor(Str const& target, bool overwrite, bool recursive)
         : target_(target), overwrite_(overwrite), recursive_(recursive) {}
 
-    /// Copies one entry under its own name. An entry whose directory is the target, by its text, is left alone: true.
-    /// \return false where something is at the destination without `overwrite`, or cannot be removed or copied
+    /// Copies one entry under its own name. Leaves an entry whose directory has the same text as the target alone and
+    /// returns true.
+    /// \return false if the destination exists and `overwrite` is false, or if it cannot be removed, or if the copy
+    ///     fails
     bool perform(FileEntry* entry) override;
 
 private:

@@ -13,21 +13,22 @@
 
 namespace ZOR_Basis {
 
-/// \thread  the walking thread
+/// \thread the walking thread
 class ZB_API FileCountVisitor : public FileVisitor {
 public:
-    /// \param limit  ends the walk when so many are counted; 0: never
-    /// \kept walk-08: the low 32 bits of the limit are compared, with a sign, so that one of 2^31 or 2^32 ends the walk
-    ///     before its first entry
+    /// \param limit  ends the walk when so many entries are counted; 0: never
+    /// \kept walk-08: only the low 32 bits of the limit are compared, as a signed number, so a limit of 2^31 or 2^32
+    ///     ends the walk before its first entry
     FileCountVisitor(std::uint64_t limit) : limit_(limit) {}
 
-    /// Counts. \return true
+    /// Counts the entry.
+    /// \return true
     bool perform(FileEntry* entry) override;
     bool stop() override;
     int total() const { return count_; }
 
-    /// Counts one directory's own entries, of the kinds that a walk has for the type.
-    /// \return at most the limit; 0 for a directory that is missing; -1 when the walk fails
+    /// Counts the direct entries of one directory, of the kinds that a walk reports for the type.
+    /// \return the number of entries, at most the limit; 0 if the directory is missing; -1 if the walk fails
     static int Get(Str const& path, LookForType type, std::uint64_t limit);
 
 private:

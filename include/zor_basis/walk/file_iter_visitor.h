@@ -10,17 +10,17 @@
 
 namespace ZOR_Basis {
 
-/// \thread  the walking thread
+/// \thread the walking thread
 class ZB_API FileIterVisitor : public FileVisitor {
 public:
-    /// \param it  does the further walks; not owned, not null, and not the one that walks with this visitor
-    /// \param inner  the visitor of the further walks; not owned, not null
+    /// \param it  does the further walks; not owned, not null, and not the iterator that walks with this visitor
+    /// \param inner  visits the entries of the further walks; not owned, not null
     FileIterVisitor(FileIterator* it, FileVisitor* inner, bool deep, bool stopOnFalse)
         : it_(it), inner_(inner), deep_(deep), stopOnFalse_(stopOnFalse) {}
 
-    /// Walks a directory; of anything else nothing is done.
-    /// \kept walk-07: the iterator keeps the path of the directory that it walked last
-    /// \return the result of that walk; true for what is no directory
+    /// Walks the entry if it is a directory.
+    /// \kept walk-07: afterwards the iterator still has the path of the directory that it walked last
+    /// \return the result of that walk; true if the entry is not a directory
     bool perform(FileEntry* entry) override;
 
 private:

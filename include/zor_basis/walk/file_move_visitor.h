@@ -1,7 +1,7 @@
 /// \file
 /// `FileMoveVisitor`: moves the entries that a walk reports into one directory.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_MOVE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_MOVE_VISITOR_H
@@ -12,16 +12,18 @@
 
 namespace ZOR_Basis {
 
-/// Nothing is taken back where a move fails midway; `File::Move` and `Dir::Move` say what becomes of the source.
-/// \thread  the walking thread
+/// If a move fails midway, nothing is undone; `File::Move` and `Dir::Move` say what happens to the source.
+/// \thread the walking thread
 class ZB_API FileMoveVisitor : public FileVisitor {
 public:
-    /// \param target  the directory; it is not made
-    /// \param overwrite  what is at the destination is removed first, a directory with all that is in it
+    /// \param target  names the directory; the visitor does not make it
+    /// \param overwrite  removes an existing destination first, a directory with all its contents
     FileMoveVisitor(Str const& target, bool overwrite) : target_(target), overwrite_(overwrite) {}
 
-    /// Moves one entry under its own name. An entry whose directory is the target, by its text, is left alone: true.
-    /// \return false where something is at the destination without `overwrite`, or cannot be removed, or the move fails
+    /// Moves one entry under its own name. Leaves an entry whose directory has the same text as the target alone and
+    /// returns true.
+    /// \return false if the destination exists and `overwrite` is false, or if it cannot be removed, or if the move
+    ///     fails
     bool perform(FileEntry* entry) override;
 
 private:

@@ -1,7 +1,9 @@
 /// \file
-/// `FileSizeVisitor`: sums the sizes of the entries that a walk reports.
+/// `FileSizeVisitor`: adds up the sizes of the entries that a walk reports.
 ///
-/// \error  after a false, 0 or null that comes from the system the last error says why (docs/reasons.md)
+///     std::int64_t const bytes = FileSizeVisitor::Get(folder, true); // of a whole tree
+///
+/// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 
 #ifndef ZOR_BASIS_WALK_FILE_SIZE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_SIZE_VISITOR_H
@@ -14,21 +16,22 @@
 
 namespace ZOR_Basis {
 
-/// A link counts 0 on Linux: what it leads to lies elsewhere, or around the entry itself.
-/// \thread  the walking thread
+/// On Linux a link counts 0: its target lies elsewhere, or contains the entry itself.
+/// \thread the walking thread
 class ZB_API FileSizeVisitor : public FileVisitor {
 public:
-    /// \param recursive  of directories the whole trees, else only the files that lie in them directly
+    /// \param recursive  counts the whole tree of a directory; false: only the files directly in it
     FileSizeVisitor(bool recursive) : recursive_(recursive) {}
 
-    /// Adds the size of an entry, as `Get` has it. In a deep walk that reports directories, what lies in them is therefore
-    /// counted once for each report. \return true
+    /// Adds the size of an entry, as `Get` computes it. A deep walk that reports directories therefore counts their
+    /// contents once for each report.
+    /// \return true
     bool perform(FileEntry* entry) override;
-    /// Bytes.
+    /// The sum in bytes.
     std::int64_t total() const { return total_; }
 
-    /// The size of a file, or of all files in a directory; 0 where nothing is.
-    /// \param recursive  with those in its sub-directories, at any depth
+    /// Returns the size of a file, or of all files in a directory; 0 if nothing exists.
+    /// \param recursive  includes the files in sub-directories, at any depth
     static std::int64_t Get(Str const& path, bool recursive);
 
 private:

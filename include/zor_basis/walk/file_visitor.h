@@ -1,7 +1,11 @@
 /// \file
-/// `FileVisitor`: what a walk does with the entries that it finds.
+/// `FileVisitor`: handles the entries that a walk reports.
 ///
-/// \thread  called by the walking thread, inside the walk
+///     struct Printer : FileVisitor {
+///         bool perform(FileEntry* entry) override { return std::puts(entry->getFullPath().c_str()) >= 0; }
+///     };
+///
+/// \thread called by the walking thread, during the walk
 
 #ifndef ZOR_BASIS_WALK_FILE_VISITOR_H
 #define ZOR_BASIS_WALK_FILE_VISITOR_H
@@ -20,11 +24,12 @@ public:
     FileVisitor& operator=(FileVisitor&&) = default;
 
     /// Handles one entry.
-    /// \param entry  never null; valid during the call
-    /// \return false is a failure; it ends a walk with `stopOnFalse`
+    /// \param entry  is never null and valid during the call
+    /// \return false on failure, which ends a walk with `stopOnFalse`
     virtual bool perform(FileEntry* entry) = 0;
-    /// Asked before every name of a listing, also before the end of it is found, and once more in each directory when its
-    /// own entries are done. True ends the walk at all its levels, each of which asks again, and leaves its result as it is.
+    /// Called before every name of a listing, including the call that finds its end, and once more in each directory
+    /// after its own entries. True ends the walk at all levels, each of which asks again, and does not change the
+    /// walk's result.
     /// \return false in this class
     virtual bool stop();
     virtual ~FileVisitor();

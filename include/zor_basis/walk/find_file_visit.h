@@ -1,5 +1,8 @@
 /// \file
-/// `FindFileVisit`: searches by name or extension during a walk. And `zbFindFile`, which searches by wildcard.
+/// `FindFileVisit`: searches by name or extension during a walk. `zbFindFile`: searches by wildcard.
+///
+///     FPath ticket;
+///     if (zbFindFile(folder, "*.jdf", LOOK_FILES, ticket, true, true) != 0) open(ticket);
 
 #ifndef ZOR_BASIS_WALK_FIND_FILE_VISIT_H
 #define ZOR_BASIS_WALK_FIND_FILE_VISIT_H
@@ -15,28 +18,29 @@
 
 namespace ZOR_Basis {
 
-/// Letters match in either case. Without a name or extension every entry is a match.
-/// \thread  the walking thread
+/// The comparison ignores case. Without a name or an extension every entry matches.
+/// \thread the walking thread
 class ZB_API FindFileVisit : public FileVisitor {
 public:
-    /// \param keepLast  remembers the last match, else the first
-    /// \param maxCount  ends the walk after so many matches; 0 or below: never
+    /// \param keepLast  remembers the last match; false: the first
+    /// \param maxCount  ends the walk after so many matches; 0 or less: never
     FindFileVisit(bool keepLast, int maxCount) : keepLast_(keepLast), maxCount_(maxCount) {}
 
-    /// From now on entries of this whole name match; with an empty one all do.
+    /// From now on entries with exactly this name match; with an empty name all do.
     void searchName(Str const& name);
-    /// From now on entries of this extension match.
-    /// \kept walk-09: a "." is put before the extension even where it has one: ".txt" looks for "..txt"
+    /// From now on entries with this extension match.
+    /// \kept walk-09: the function puts a "." before the extension even if there is one: ".txt" searches for "..txt"
     void searchExt(char const* ext) { searchExt(Str(ext)); }
     void searchExt(Str const& ext);
-    /// Forgets the matches and what was searched for.
+    /// Forgets the matches and the search key.
     void clear();
-    /// The matches so far.
+    /// The number of matches so far.
     int getNum() const { return count_; }
-    /// The remembered match, directory and name; empty if there is none.
+    /// The full path of the remembered match; empty if there is none.
     FPath const& getPath() const { return path_; }
 
-    /// Looks at one entry. \return true: a search fails no walk
+    /// Examines one entry.
+    /// \return true: a search never fails a walk
     bool perform(FileEntry* entry) override;
     bool stop() override;
 
@@ -53,12 +57,13 @@ private:
 
 } // namespace ZOR_Basis
 
-/// Searches a directory, with `deep` its whole tree, for what a walk reports for the type and the wildcard, whose letters
-/// match in either case with `LOOK_ANYCASE` only.
-/// \param found  receives the path of a match, directory and name; empty where there is none
-/// \param firstOnly  ends at the first match; else all are counted and the last one is given. Both in the order of the walk.
-/// \return the number of matches; 0 for a directory that is missing
-/// \thread  thread-safe as far as the file system is
+/// Searches a directory, with `deep` its whole tree, for the entries that a walk reports for the type and the wildcard.
+/// The wildcard ignores case only with `LOOK_ANYCASE`.
+/// \param found  receives the full path of a match; empty if there is none
+/// \param firstOnly  ends the search at the first match; false: counts all matches and returns the last. Both in the
+///     order of the walk.
+/// \return the number of matches; 0 if the directory is missing
+/// \thread thread-safe as far as the file system is
 ZB_API int zbFindFile(ZOR_Basis::Str const& dir, char const* wildcard, ZOR_Basis::LookForType type,
                       ZOR_Basis::FPath& found, bool firstOnly, bool deep);
 
