@@ -1,21 +1,75 @@
 #!/usr/bin/env python3
-"""Runs clang-tidy over the sources that the library, the platform layer and the examples compile on Linux."""
+"""clang-tidy over what the library, the platform layer and the examples compile on Linux.
 
+A file that was clean is not read again before it, a header of the project that it includes, its compiler's command or the
+checks change; --all reads every file.
+"""
+
+import hashlib
 import json
+import os
+import sys
+import threading
+from pathlib import Path
 
 import common
 
-database = common.ROOT / "build/linux"
-entries = json.loads((database / "compile_commands.json").read_text())
-sources = sorted({e["file"] for e in entries if any(f"/{room}/" in e["file"].replace(str(common.ROOT), "")
-                                                    for room in ("basis", "host", "examples"))
-                  and "/tests/" not in e["file"].replace(str(common.ROOT), "")})
+BUILD = common.ROOT / "build/linux"
+CLEAN = BUILD / "tidy-clean.json"
+ROOMS = ("basis", "host", "examples")
+
+
+def sources():
+    """The compiler's command for each file."""
+    entries = json.loads((BUILD / "compile_commands.json").read_text())
+    return {e["file"]: e["command"] for e in entries
+            if any(Path(e["file"]).is_relative_to(common.ROOT / room) for room in ROOMS)}
+
+
+def included():
+    """The project's files behind each source, as the last build saw them."""
+    found, files = {}, []
+    for line in common.run("ninja", "-C", BUILD, "-t", "deps").stdout.split("\n"):
+        if line.startswith(" "):
+            files.append(os.path.normpath(BUILD / line.strip()))
+        elif files:
+            found[files[0]] = sorted(f for f in files if Path(f).is_relative_to(common.ROOT) and Path(f).is_file())
+            files = []
+    return found
+
+
+def state(path, command, headers):
+    """What the result for a file depends on; None where the build does not know its headers."""
+    if path not in headers:
+        return None
+    parts = [command.encode(), (common.ROOT / ".clang-tidy").read_bytes(), *(Path(f).read_bytes() for f in headers[path])]
+    return hashlib.sha256(b"\0".join(parts)).hexdigest()
+
+
+class CleanFiles:
+    """The state in which each file was clean, kept from run to run, also of one that is broken off."""
+
+    def __init__(self, known):
+        self.known = known
+        self.lock = threading.Lock()
+
+    def note(self, path, found):
+        with self.lock:
+            self.known[path] = found
+            CLEAN.write_text(json.dumps(self.known))
 
 
 def check(path):
-    result = common.run("clang-tidy", "-p", database, "--quiet", path)
-    return [result.stdout] if result.returncode else []
+    result = common.run("clang-tidy", "-p", BUILD, "--quiet", path)
+    if result.returncode:
+        return result.stdout
+    clean.note(path, states[path])
+    return ""
 
 
-problems = [text for found in common.in_parallel(check, sources) for text in found]
-common.finish("tidy", problems, len(sources))
+headers = included()
+states = {path: state(path, command, headers) for path, command in sources().items()}
+clean = CleanFiles({} if "--all" in sys.argv or not CLEAN.exists() else json.loads(CLEAN.read_text()))
+changed = sorted(path for path in states if states[path] is None or clean.known.get(path) != states[path])
+problems = [text for text in common.in_parallel(check, changed) if text]
+common.finish("tidy", problems, len(changed))
