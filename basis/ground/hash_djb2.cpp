@@ -7,9 +7,9 @@
 #include <bit>
 #include <cstdint>
 
-// The hash of a text is 33^n times the start, plus the sum of its bytes weighted with falling powers of 33. Sixteen bytes
-// are weighted in one step. The last block is filled with zeros, which weights its bytes too high by a power of 33; as 33 is
-// odd, that power has an inverse modulo 2^64.
+// The hash of a text is 33^n times the start, plus the sum of its bytes weighted with falling powers of 33. Sixteen
+// bytes are weighted in one step. The last block is filled with zeros, which weights its bytes too high by a power of
+// 33; as 33 is odd, that power has an inverse modulo 2^64.
 
 namespace ZOR_Basis {
 namespace {

@@ -113,8 +113,9 @@ public:
     /// \param makeDirs  calls `Dir::NewFor` for the destination first, which fails for a bare name: write "./name"
     static bool Copy(char const* dst, char const* src, bool overwrite, bool makeDirs);
 
-    /// Moves a file; if the platform layer cannot move it, copies it and removes the source. A refused move onto an existing
-    /// file is such a copy: it fails, and the source is gone. Check `FStat::exist(dst)` before, where it must survive.
+    /// Moves a file; if the platform layer cannot move it, copies it and removes the source. A refused move onto an
+    /// existing file is such a copy: it fails, and the source is gone. Check `FStat::exist(dst)` before, where it must
+    /// survive.
     /// \param makeDirs  calls `Dir::NewFor` for the destination first; for a bare name that fails, and the source stays
     /// \kept file-04: the source is removed even if the copy fails, or if the directories cannot be made a second time
     /// \return whether the move or the copy succeeded

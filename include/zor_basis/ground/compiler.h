@@ -1,9 +1,9 @@
 /// \file
-/// The compiler's words under one name each: inlining, targets, tests of the processor, sanitizers. They are for the library's
-/// own headers.
+/// The compiler's words under one name each: inlining, targets, tests of the processor, sanitizers. They are for the
+/// library's own headers.
 ///
-/// A function that carries a target runs only where the test of the same name holds; it may inline plain functions, while
-/// plain functions cannot inline it.
+/// A function that carries a target runs only where the test of the same name holds; it may inline plain functions,
+/// while plain functions cannot inline it.
 
 #ifndef ZOR_BASIS_GROUND_COMPILER_H
 #define ZOR_BASIS_GROUND_COMPILER_H
@@ -27,8 +27,8 @@
 #define ZB_VECTORS 0
 #endif
 
-/// `ZB_INLINE`: into every caller, also at low optimisation. `ZB_COLD`: never into a caller. `ZB_HIDE(pointer)`: from here
-/// on the compiler does not know what the pointer points to; only where `ZB_CAN_HIDE` is 1.
+/// `ZB_INLINE`: into every caller, also at low optimisation. `ZB_COLD`: never into a caller. `ZB_HIDE(pointer)`: from
+/// here on the compiler does not know what the pointer points to; only where `ZB_CAN_HIDE` is 1.
 #if defined(__GNUC__)
 #define ZB_INLINE [[gnu::always_inline]] inline
 #define ZB_COLD [[gnu::noinline]]

@@ -109,8 +109,8 @@ ZB_INLINE bool copy17To64(char*, char const*, std::uint64_t) noexcept { return f
 
 #endif
 
-/// Copies up to 64 bytes, all of which may be read; fewer than 4 by `copyUpTo3`. \return false, with nothing written, for
-/// more and where a zero is among them
+/// Copies up to 64 bytes, all of which may be read; fewer than 4 by `copyUpTo3`.
+/// \return false, with nothing written, for more bytes and if one of them is a zero
 template <auto copyUpTo3>
 ZB_INLINE bool copyInSteps(char* target, char const* source, std::uint64_t length) noexcept {
     if (length > 16) return length <= 64 && copy17To64(target, source, length);
@@ -120,7 +120,7 @@ ZB_INLINE bool copyInSteps(char* target, char const* source, std::uint64_t lengt
 
 ZB_INLINE bool copyNothing(char*, char const*, std::uint64_t) noexcept { return false; }
 
-/// The same in users' code, where the compiler decides what is worth its room and fewer than 4 bytes are not.
+/// The same in users' code, where the compiler decides what to inline, and fewer than 4 bytes are not worth it.
 inline bool copyWords(char* target, char const* source, std::uint64_t length) noexcept {
     return copyInSteps<copyNothing>(target, source, length);
 }
