@@ -10,9 +10,30 @@ using namespace ZOR_Basis;
 
 namespace {
 
-using LoggerThreads = DrivenLoggers;
-
 constexpr int WRITERS = 8;
+
+class LoggerThreads : public DrivenLoggers {
+protected:
+    /// Has eight threads write numbered lines while the alert writes them out as often as it can.
+    /// \param afterLine  is called behind each line, with its number
+    template <class AfterLine>
+    static void writeInThreads(LoggerImpl& logger, std::uint64_t lines, AfterLine afterLine) {
+        std::atomic<int> writing{WRITERS};
+        std::vector<std::thread> threads;
+        for (int writer = 0; writer < WRITERS; ++writer) {
+            threads.emplace_back([&, writer] {
+                std::string const who = "writer " + std::to_string(writer) + " line ";
+                for (std::uint64_t i = 0; i < lines; ++i) {
+                    write(logger, who + std::to_string(i) + " ends");
+                    afterLine(i);
+                }
+                --writing;
+            });
+        }
+        while (writing != 0) tickAfter(PERIOD, logger);
+        for (std::thread& thread : threads) thread.join();
+    }
+};
 
 /// Every line of every writer once, whole, and each writer's in their order.
 void expectAllLines(std::string const& text, std::uint64_t lines) {
@@ -35,20 +56,10 @@ void expectAllLines(std::string const& text, std::uint64_t lines) {
 TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
     LoggerImpl& logger = start();
     std::uint64_t const lines = randomSteps(2000);
-    std::atomic<int> writing{WRITERS};
-    std::vector<std::thread> threads;
-    for (int writer = 0; writer < WRITERS; ++writer) {
-        threads.emplace_back([&, writer] {
-            std::string const who = "writer " + std::to_string(writer) + " line ";
-            for (std::uint64_t i = 0; i < lines; ++i) {
-                write(logger, who + std::to_string(i) + " ends");
-                if (i % 500 == 77) logger.newSession();
-            }
-            --writing;
-        });
-    }
-    while (writing != 0) tickAfter(PERIOD, logger);
-    for (std::thread& thread : threads) thread.join();
+    auto const newSession = [&](std::uint64_t i) {
+        if (i % 500 == 77) logger.newSession();
+    };
+    writeInThreads(logger, lines, newSession);
     tickAfter(PERIOD, logger);
     tickAfter(PERIOD, logger);
     std::string all;
@@ -59,20 +70,10 @@ TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
 TEST_F(LoggerThreads, flush_each_line_once_and_in_order_while_the_alert_writes_too) {
     LoggerImpl& logger = start();
     std::uint64_t const lines = randomSteps(2000);
-    std::atomic<int> writing{WRITERS};
-    std::vector<std::thread> threads;
-    for (int writer = 0; writer < WRITERS; ++writer) {
-        threads.emplace_back([&, writer] {
-            std::string const who = "writer " + std::to_string(writer) + " line ";
-            for (std::uint64_t i = 0; i < lines; ++i) {
-                write(logger, who + std::to_string(i) + " ends");
-                if (i % 100 == 99) { EXPECT_TRUE(logger.flush()); }
-            }
-            --writing;
-        });
-    }
-    while (writing != 0) tickAfter(PERIOD, logger);
-    for (std::thread& thread : threads) thread.join();
+    auto const flush = [&](std::uint64_t i) {
+        if (i % 100 == 99) { EXPECT_TRUE(logger.flush()); }
+    };
+    writeInThreads(logger, lines, flush);
     EXPECT_TRUE(logger.flush());
     expectAllLines(content(0), lines);
 }
