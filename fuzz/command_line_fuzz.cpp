@@ -1,5 +1,5 @@
-// Any text as a command line: the words are those that a second reading finds, which looks at one character at a time and
-// remembers the backslashes before it.
+// Any text as a command line: the words are those that a second reading finds, which looks at one character at a time
+// and remembers the backslashes before it.
 
 #include "basis/system/command_line.h"
 

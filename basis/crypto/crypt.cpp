@@ -19,7 +19,8 @@ void describeFailure() {
 
 } // namespace
 
-// kept crypto-02: no release, here or in CryptWin; the handles that were made from a provider need it as long as they live.
+// kept crypto-02: no release, here or in CryptWin; the handles that were made from a provider need it as long as they
+// live.
 Crypt::~Crypt() = default;
 
 Crypt* Crypt::make(char const*) {

@@ -20,7 +20,8 @@ struct CryptService {
     bool (*createHash)(Handle provider, Handle& hash);
     bool (*hashData)(Handle hash, void const* data, std::uint32_t n);
     void (*destroyHash)(Handle hash);
-    /// \param exportable  asks for 128 bits and for a key that `exportKey` takes; otherwise the service's default length
+    /// \param exportable  asks for 128 bits and for a key that `exportKey` takes; otherwise the service's default
+    ///     length
     bool (*deriveKey)(Handle provider, Handle hash, bool exportable, Handle& key);
     /// \param n  the room in bytes; becomes the length of the key blob
     /// \param blob  null: only the length is wanted

@@ -12,8 +12,8 @@ namespace {
 
 using Path = PathText<NarrowPathKind>;
 
-/// Whether a path lies under the root already and so needs no translation. Every path begins with an unknown root's empty
-/// text: nothing can be translated to it. All absolute paths lie under "/", which says nothing about fake roots.
+/// Whether a path lies under the root already and so needs no translation. Every path begins with an unknown root's
+/// empty text: nothing can be translated to it. All absolute paths lie under "/", which says nothing about fake roots.
 bool isUnder(RootFolder::Root const& root, char const* text, std::uint64_t length) {
     std::uint64_t const size = root.text.size();
     return !root.isFileSystem && length >= size && std::memcmp(text, root.text.c_str(), size) == 0;

@@ -1,5 +1,6 @@
 /// \file
-/// The path by which the system knows an entry once it is open, and the owner of a file handle. For Windows sources only.
+/// The path by which the system knows an entry once it is open, and the owner of a file handle. For Windows sources
+/// only.
 
 #ifndef BASIS_FILES_OPENED_PATH_WIN_H
 #define BASIS_FILES_OPENED_PATH_WIN_H

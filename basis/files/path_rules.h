@@ -1,6 +1,6 @@
 /// \file
-/// The grammar of paths, as plain functions over the character type that touch no system. Narrow and wide paths are made
-/// of them. Texts are zero-terminated and not null; where a length is given it is exact.
+/// The grammar of paths, as plain functions over the character type that touch no system. Narrow and wide paths are
+/// made of them. Texts are zero-terminated and not null; where a length is given it is exact.
 
 #ifndef BASIS_FILES_PATH_RULES_H
 #define BASIS_FILES_PATH_RULES_H

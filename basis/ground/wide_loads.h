@@ -1,5 +1,6 @@
 /// \file
-/// Loads, stores and tests for zeros of vectors of 32 and 64 bytes, at any alignment, for functions that carry the target.
+/// Loads, stores and tests for zeros of vectors of 32 and 64 bytes, at any alignment, for functions that carry the
+/// target.
 
 #ifndef BASIS_GROUND_WIDE_LOADS_H
 #define BASIS_GROUND_WIDE_LOADS_H

@@ -39,8 +39,8 @@ namespace Detail {
 
 /// Matches one name against one pattern, in a time of at most their lengths' product and without memory.
 ///
-/// Only the last "*" that was taken as a wildcard is gone back to. That loses nothing: each step of the rule leads from a
-/// later place in the name to a later or the same place, so whatever an earlier "*" could still reach behind the last
+/// Only the last "*" that was taken as a wildcard is gone back to. That loses nothing: each step of the rule leads from
+/// a later place in the name to a later or the same place, so whatever an earlier "*" could still reach behind the last
 /// one, the last one has tried already.
 template <class Case, class Char>
 class WildcardMatch {

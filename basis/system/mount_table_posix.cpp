@@ -44,7 +44,8 @@ struct Free {
     void operator()(char* text) const { std::free(text); }
 };
 
-/// How much of the path a directory covers, with one more for the root, which covers all; 0 where the path lies elsewhere.
+/// How much of the path a directory covers, with one more for the root, which covers all; 0 where the path lies
+/// elsewhere.
 std::size_t covered(char const* directory, char const* path) {
     std::size_t const n = std::strlen(directory);
     if (n == 1 && *directory == '/') return 1;

@@ -18,8 +18,8 @@ struct Profile {
 /// \return false, with both texts empty, where there are no more
 bool profileOfSession(unsigned n, Profile& profile);
 
-/// Whether a profile is that of a domain: one of the domains that it names, in any case of the letters. True also where it
-/// names none.
+/// Whether a profile is that of a domain: one of the domains that it names, in any case of the letters. True also where
+/// it names none.
 bool isOfDomain(Profile const& profile, BufStr<15> const& domain);
 
 } // namespace ZOR_Basis

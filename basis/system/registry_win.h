@@ -16,7 +16,8 @@ namespace ZOR_Basis {
 /// Bytes with which a value is asked for.
 inline constexpr std::uint64_t VALUE_ROOM = 512;
 
-/// Makes the result of a call of the registry, which comes without, the last error if it is one. \return whether it is none
+/// Makes the result of a call of the registry, which comes without, the last error if it is one. \return whether it is
+/// none
 bool told(LSTATUS result);
 
 /// Makes room for what did not fit: as much as was reported, or twice as much where that is no more. The old bytes go.

@@ -1,6 +1,6 @@
 /// \file
-/// Two narrow texts side by side in vectors of 16 bytes, up to a common terminator. "May be read" says that all bytes of a
-/// length are readable, whatever lies among them.
+/// Two narrow texts side by side in vectors of 16 bytes, up to a common terminator. "May be read" says that all bytes
+/// of a length are readable, whatever lies among them.
 
 #ifndef BASIS_TEXT_TEXT_PAIR_H
 #define BASIS_TEXT_TEXT_PAIR_H

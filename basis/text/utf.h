@@ -18,8 +18,8 @@ inline constexpr std::uint64_t NO_ROOM = INVALID - 1;
 /// exceed before it finds the fault.
 std::uint64_t utf16Length(char const* text, std::uint64_t size);
 
-/// Writes the UTF-16 form of `size` bytes of UTF-8. Overlong forms, surrogates, values above U+10FFFF, stray and missing
-/// continuation bytes are invalid.
+/// Writes the UTF-16 form of `size` bytes of UTF-8. Overlong forms, surrogates, values above U+10FFFF, stray and
+/// missing continuation bytes are invalid.
 /// \param out  `room` units, none of which keeps its value; no terminator is written
 /// \return the units of the whole text; INVALID or NO_ROOM, whichever is met first
 std::uint64_t toUtf16(char const* text, std::uint64_t size, WChar* out, std::uint64_t room);

@@ -41,7 +41,7 @@ bool isAscii(__m128i block) { return bitsOf(without(block, 0xFF80)) == 0xFFFF; }
 
 __m128i packed(__m128i block) { return _mm_packus_epi16(block, block); }
 
-// ---- whole blocks: ASCII, and characters of two bytes among it --------------------------------------------------------
+// ---- whole blocks: ASCII, and characters of two bytes among it ------------------------------------------------------
 
 constexpr Selection SHORTENED_UNITS = makeSelection(1, 2);
 
@@ -161,7 +161,8 @@ ZB_INLINE void takeAsciiText(Progress& progress) {
     progress.advance(left, left);
 }
 
-/// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
+/// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its
+/// end.
 template <class Shuffle>
 ZB_INLINE void takeBlocks(Progress& progress) {
     while (progress.left() >= BLOCK_UNITS && progress.room() >= BLOCK_BYTES) {
@@ -212,7 +213,7 @@ ZB_INLINE void takeEnd(Progress& progress) {
     progress.advance(left, bytes - behind);
 }
 
-// ---- runs of longer characters, as in real text ----------------------------------------------------------------------
+// ---- runs of longer characters, as in real text ---------------------------------------------------------------------
 
 /// The three bytes of a unit above 0x7FF, the first one lowest.
 std::uint32_t threeBytes(std::uint32_t unit) {
@@ -285,7 +286,7 @@ ZB_INLINE void takePairs(Progress& progress) {
     }
 }
 
-// ---- one character ----------------------------------------------------------------------------------------------------
+// ---- one character --------------------------------------------------------------------------------------------------
 
 struct Encoded {
     std::uint32_t bytes; // the first one lowest
@@ -354,7 +355,7 @@ ZB_INLINE Utf8Text convert(WChar const* text, std::uint64_t size, char* out, std
                                                                        progress.hasZero);
 }
 
-// ---- lengths ----------------------------------------------------------------------------------------------------------
+// ---- lengths --------------------------------------------------------------------------------------------------------
 
 /// How far the bytes of the unit at `text[at]` fall short of three. A pair's six count as four.
 unsigned savedAt(WChar const* text, std::uint64_t at, std::uint64_t size) {

@@ -29,7 +29,7 @@ struct Progress {
 
 bool isContinuation(Byte byte) { return (byte & 0xC0) == 0x80; }
 
-// ---- whole blocks: ASCII, and characters of two bytes among it --------------------------------------------------------
+// ---- whole blocks: ASCII, and characters of two bytes among it ------------------------------------------------------
 
 constexpr Selection CHOSEN_UNITS = makeSelection(2, 0);
 
@@ -104,7 +104,8 @@ struct WithoutShuffle {
     ZB_INLINE static bool takeLong(__m128i, WChar*) { return false; }
 };
 
-/// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its end.
+/// Takes blocks until one begins with a character that has to be taken by itself, or the text or the room nears its
+/// end.
 template <class Shuffle>
 ZB_INLINE void takeBlocks(Progress& progress) {
     while (progress.left() >= BLOCK_BYTES && progress.room() >= BLOCK_BYTES) {
@@ -151,7 +152,7 @@ ZB_INLINE void takeEnd(Progress& progress) {
     }
 }
 
-// ---- runs of longer characters, as in real text: several in one step ----------------------------------------------------
+// ---- runs of longer characters, as in real text: several in one step ------------------------------------------------
 
 bool isThreeByteUnit(std::uint32_t unit) { return unit >= 0x800 && !isSurrogate(unit); }
 
@@ -199,7 +200,7 @@ ZB_INLINE void takeFourByteRun(Progress& progress) {
     }
 }
 
-// ---- one character ----------------------------------------------------------------------------------------------------
+// ---- one character --------------------------------------------------------------------------------------------------
 
 struct Decoded {
     std::uint32_t character;

@@ -1,7 +1,7 @@
 /// \file
-/// Sixteen bytes of text at a time, for the conversions between UTF-8 and UTF-16. Needs SSE2, which every x64 has; where
-/// bytes are dropped from a block, it takes SSSE3, and processors without it go character by character. AVX2 is used for
-/// long runs.
+/// Sixteen bytes of text at a time, for the conversions between UTF-8 and UTF-16. Needs SSE2, which every x64 has;
+/// where bytes are dropped from a block, it takes SSSE3, and processors without it go character by character. AVX2 is
+/// used for long runs.
 
 #ifndef BASIS_TEXT_UTF_BLOCK_H
 #define BASIS_TEXT_UTF_BLOCK_H

@@ -1,9 +1,9 @@
 /// \file
 /// Narrow text in vectors, for copying and comparing without a call of the runtime.
 ///
-/// The text may end before its given length, with nothing readable behind its terminator. So a vector is read only where
-/// it lies in the page of its first byte, which is readable, and what does not is left to the runtime. Texts of up to 64
-/// bytes are read by vectors that overlap each other; they never reach beyond the given length.
+/// The text may end before its given length, with nothing readable behind its terminator. So a vector is read only
+/// where it lies in the page of its first byte, which is readable, and what does not is left to the runtime. Texts of
+/// up to 64 bytes are read by vectors that overlap each other; they never reach beyond the given length.
 
 #ifndef BASIS_TEXT_VECTOR_TEXT_H
 #define BASIS_TEXT_VECTOR_TEXT_H

@@ -47,8 +47,8 @@ struct OrderOf {
     static int byRuntime(char const* a, char const* b, std::uint64_t) noexcept { return orderByRuntime(a, b); }
 };
 
-/// Two texts of more than 64 bytes. They go in runs of 64, of which the last begins in the one before, with a branch for
-/// each: texts that differ mostly do so early.
+/// Two texts of more than 64 bytes. They go in runs of 64, of which the last begins in the one before, with a branch
+/// for each: texts that differ mostly do so early.
 template <class Text, class Question>
 class WideRuns {
 public:

@@ -21,7 +21,8 @@ struct Values {
 /// Ticks in another unit, cut towards zero. Only a result beyond 64 bits overflows, and then it wraps.
 std::int64_t convert(std::int64_t ticks, int unitsPerSecond, std::int64_t frequency);
 
-/// Writes a number from the right: its last digit two places before `end`. The first place of the line is never reached.
+/// Writes a number from the right: its last digit two places before `end`. The first place of the line is never
+/// reached.
 /// \param separator  between groups of three digits; 0: none
 /// \param terminating  stores a zero byte one place before `end`
 void placeNumber(char* line, std::int64_t value, std::uint64_t end, char separator, bool terminating);

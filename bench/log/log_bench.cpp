@@ -1,6 +1,6 @@
-// What a caller pays for a line of a log, beside a logger that writes to its file on the caller's thread. Ours are written
-// out between the measurements, by the alert; what that costs its thread is in a row of its own. All rows are of 1,000
-// lines.
+// What a caller pays for a line of a log, beside a logger that writes to its file on the caller's thread. Ours are
+// written out between the measurements, by the alert; what that costs its thread is in a row of its own. All rows are
+// of 1,000 lines.
 
 #include "bench/support/scratch_root.h"
 

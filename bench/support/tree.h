@@ -1,6 +1,6 @@
 /// \file
-/// Places, trees and other programs for benchmarks. Everything lies in memory (/dev/shm, where there is one), so that no
-/// disk is measured.
+/// Places, trees and other programs for benchmarks. Everything lies in memory (/dev/shm, where there is one), so that
+/// no disk is measured.
 
 #ifndef BENCH_SUPPORT_TREE_H
 #define BENCH_SUPPORT_TREE_H

@@ -1,5 +1,5 @@
-// Strings beside std::string and llvm::SmallString. All sides get the same texts, at the same place where strings are made
-// of them, through pointers and lengths that the compiler cannot see through.
+// Strings beside std::string and llvm::SmallString. All sides get the same texts, at the same place where strings are
+// made of them, through pointers and lengths that the compiler cannot see through.
 
 #include <zor_basis/text.h>
 

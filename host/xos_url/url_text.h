@@ -15,7 +15,8 @@ enum class Scheme { http, https, file, other };
 /// Letters of either case.
 Scheme schemeOf(std::string_view url);
 
-/// The URL with blanks, control characters and bytes above 126 as percent escapes, so that every library reads it alike.
+/// The URL with blanks, control characters and bytes above 126 as percent escapes, so that every library reads it
+/// alike.
 std::string escapedUrl(std::string_view url);
 
 /// Where a `file:` URL leads.

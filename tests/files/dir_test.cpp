@@ -95,8 +95,8 @@ TEST_F(DirTest, has_its_parents_made_from_the_top) {
 }
 
 TEST_F(DirTest, has_its_parents_made_in_order) {
-    // With each call failing in turn, what is there is always the top of the tree. The first three are tried again on the
-    // way down.
+    // With each call failing in turn, what is there is always the top of the tree. The first three are tried again on
+    // the way down.
     Names const whole{"a/", "a/b/", "a/b/c/"};
     std::vector<Names> const left = {whole, whole, whole, {"a/"}, {"a/", "a/b/"}, whole};
     for (std::uint32_t skip = 0; skip < left.size(); ++skip) {

@@ -1,4 +1,5 @@
-// Names that only Linux has: links, bytes that are no UTF-8, long paths and long names. The sibling is names_win_test.cpp.
+// Names that only Linux has: links, bytes that are no UTF-8, long paths and long names. The sibling is
+// names_win_test.cpp.
 
 #include <zor_basis/files.h>
 

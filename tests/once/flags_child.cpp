@@ -1,4 +1,5 @@
-// flags_child STEP...: the mode flags from their very first use, each case in a process of its own. Prints one line a step.
+// flags_child STEP...: the mode flags from their very first use, each case in a process of its own. Prints one line a
+// step.
 //   set loaded vdp vps qdb vipp ppml    calls the function of that name and prints its result
 //   config=FOLDER                       where the configuration is from now on
 //   calls                               the loads, readings and releases so far

@@ -1,5 +1,5 @@
-// log_child HOW: closes a log that has a buffer and watches its alert, which never returns. HOW it got the buffer and was
-// closed: by a "line" and `init`, by a new "session" and `init`, by a line and being "destroyed".
+// log_child HOW: closes a log that has a buffer and watches its alert, which never returns. HOW it got the buffer and
+// was closed: by a "line" and `init`, by a new "session" and `init`, by a line and being "destroyed".
 
 #include <zor_basis/log.h>
 

@@ -20,7 +20,8 @@
 //   join             waits for that thread: prints its path
 //   remove=FILE      removes a file
 //   unblock=FILE     removes that file as soon as a hundred names have been tried in vain
-//   threads=COUNT    so many threads make 25 folders each, put a file into each and keep half of them until all threads are
+//   threads=COUNT    so many threads make 25 folders each, put a file into each and keep half of them until all threads
+//   are
 //                    done: prints the paths
 
 #include <zor_basis/system/vdp_temp_dir.h>

@@ -1,5 +1,5 @@
-// unload_child MODULE HOW: loads a module that uses the library, has it log, unloads it and fires the alerts that may be
-// left. HOW the log is left: "closed" or "kept". Nothing else here needs the library.
+// unload_child MODULE HOW: loads a module that uses the library, has it log, unloads it and fires the alerts that may
+// be left. HOW the log is left: "closed" or "kept". Nothing else here needs the library.
 
 #include "tests/once/loaded_module.h"
 #include "tests/once/unload_module.h"

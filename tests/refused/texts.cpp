@@ -1,5 +1,5 @@
-// What must not compile. Each line marked `refused` is an error, and no other line is: `./dev lint refused` shows this to
-// each compiler, with warnings as errors.
+// What must not compile. Each line marked `refused` is an error, and no other line is: `./dev lint refused` shows this
+// to each compiler, with warnings as errors.
 
 #include "zor_basis/crypto.h"
 #include "zor_basis/files.h"

@@ -188,7 +188,8 @@ private:
 
     /// All jobs come to their end, with results such that their order does not matter.
     void wait() {
-        // One ends, so that the others are started, and one runs until they are, so that there is something to wait for.
+        // One ends, so that the others are started, and one runs until they are, so that there is something to wait
+        // for.
         if (model_.running == 1 && model_.mayProceed()) add(true);
         if (model_.running != static_cast<int>(withTask().size())) return; // it would never end
         bool const result = stops_ || random_() % 4 != 0;

@@ -1,5 +1,5 @@
-// The root folder is found once in a process, so each case has a child of its own; the rule that makes a root of a folder
-// is tested directly.
+// The root folder is found once in a process, so each case has a child of its own; the rule that makes a root of a
+// folder is tested directly.
 
 #include "basis/files/root_folder.h"
 #include "basis/files/root_folder_impl.h"

@@ -1,5 +1,5 @@
-// Every stated way to make, assign, extend and stream a narrow text keeps its meaning, whatever other overloads there are.
-// Where two overloads could be taken their effects differ, so that the row tells which one was.
+// Every stated way to make, assign, extend and stream a narrow text keeps its meaning, whatever other overloads there
+// are. Where two overloads could be taken their effects differ, so that the row tells which one was.
 
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text.h"

@@ -65,7 +65,8 @@ private:
         return result;
     }
 
-    /// A source as the string gets it and as the model sees it: text of its own block, null, or part of the string's text.
+    /// A source as the string gets it and as the model sees it: text of its own block, null, or part of the string's
+    /// text.
     struct Given {
         Char const* pointer;
         Source model;

@@ -1,5 +1,5 @@
-// Linux only, as the page behind a text is taken away here: nothing behind a terminator is read, whatever length is given.
-// The Windows build has the same code.
+// Linux only, as the page behind a text is taken away here: nothing behind a terminator is read, whatever length is
+// given. The Windows build has the same code.
 
 #include "tests/text/last_page_posix.h"
 #include "zor_basis/text.h"

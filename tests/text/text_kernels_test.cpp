@@ -1,5 +1,5 @@
-// Copying and comparing narrow text at every length, at every place of a difference or a zero, and across pages: the short
-// cuts have seams at 4, 8, 16, 32, 64, 128 and 256 bytes and where a page ends.
+// Copying and comparing narrow text at every length, at every place of a difference or a zero, and across pages: the
+// short cuts have seams at 4, 8, 16, 32, 64, 128 and 256 bytes and where a page ends.
 
 #include "tests/text/string_kinds.h"
 #include "zor_basis/text.h"

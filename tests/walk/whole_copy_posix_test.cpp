@@ -1,4 +1,5 @@
-// Whole trees copied by one walk, links, read-only files and odd names among them, compared by the system's own program.
+// Whole trees copied by one walk, links, read-only files and odd names among them, compared by the system's own
+// program.
 
 #include <zor_basis/walk.h>
 

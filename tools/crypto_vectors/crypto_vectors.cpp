@@ -1,5 +1,6 @@
-// crypto_vectors: has the system's cryptographic service encrypt messages with keys derived from secrets, and prints what
-// came out as rows of a C++ table, {secret, plain, encrypted, key blob} in hexadecimal digits. Uses nothing of the library.
+// crypto_vectors: has the system's cryptographic service encrypt messages with keys derived from secrets, and prints
+// what came out as rows of a C++ table, {secret, plain, encrypted, key blob} in hexadecimal digits. Uses nothing of the
+// library.
 //
 //     cmake --build --preset windows --target crypto_vectors
 //     cmake/windows/wine-run build/windows/bin/crypto_vectors.exe > tests/crypto/service_vectors.inc

@@ -3,9 +3,9 @@
 ///
 /// Each thread writes its own records with plain stores: no two threads write one cache line and no instruction locks
 /// the bus. A record has two slots, which calls use in turn, so that the last call stands still while the next one is
-/// noted, however long that takes. A reader begins anew when the next one has been completed meanwhile. Every store of a
-/// payload releases and every load of it acquires, so a reader that sees anything of a call also sees all calls before it
-/// completed.
+/// noted, however long that takes. A reader begins anew when the next one has been completed meanwhile. Every store of
+/// a payload releases and every load of it acquires, so a reader that sees anything of a call also sees all calls
+/// before it completed.
 ///
 /// Records outlive their thread: the next new thread takes them over and counts on. Nothing a reader looks at is ever
 /// freed.

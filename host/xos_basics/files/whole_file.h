@@ -13,8 +13,8 @@ namespace host {
 /// Removes a file or a link, whatever its permissions.
 bool removeFile(char const* path);
 
-/// Copies the content, the permissions and the modification time of a regular file. The copy appears under its name when
-/// it is complete, or not at all.
+/// Copies the content, the permissions and the modification time of a regular file. The copy appears under its name
+/// when it is complete, or not at all.
 bool copyFile(char const* dst, char const* src, bool overwrite);
 
 /// Renames what is no directory within one file system.

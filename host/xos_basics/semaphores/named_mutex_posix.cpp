@@ -84,8 +84,8 @@ private:
 
 namespace {
 
-/// The parents of the users' run directories. All processes of a user must come to the same one, with or without a login
-/// session, so these are fixed places, and the first that serves is taken.
+/// The parents of the users' run directories. All processes of a user must come to the same one, with or without a
+/// login session, so these are fixed places, and the first that serves is taken.
 constexpr char const* const PARENTS[] = {"/run/lock", "/dev/shm", "/tmp"};
 
 /// A folder that others could write, or a link that others made, is not trusted.

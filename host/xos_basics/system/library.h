@@ -6,7 +6,8 @@
 
 namespace host {
 
-/// \return the system's handle of the library, for the process's life; null when there is none, the last error is then set
+/// \return the system's handle of the library, for the process's life; null when there is none, the last error is then
+///     set
 void* loadLibrary(char const* name);
 
 } // namespace host

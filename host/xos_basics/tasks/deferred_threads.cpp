@@ -27,7 +27,8 @@ void watchCreators(void*) {
     for (;;) {
         while (watch.load(std::memory_order_relaxed) == RESTING) { waitWhile(watch, RESTING); }
         std::this_thread::sleep_for(PATIENCE);
-        // Before the look under the pool's mutex: a creator whose job comes after that look reads it and starts the watch.
+        // Before the look under the pool's mutex: a creator whose job comes after that look reads it and starts the
+        // watch.
         watch.store(RESTING, std::memory_order_relaxed);
         askProvider();
     }

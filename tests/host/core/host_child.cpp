@@ -1,5 +1,5 @@
-// What tests need a process of their own for. host_child VERB [ARGUMENTS]: the exit code is the answer, or the answer is
-// written to a file.
+// What tests need a process of their own for. host_child VERB [ARGUMENTS]: the exit code is the answer, or the answer
+// is written to a file.
 
 #include "basis/platform/hq_basis.h"
 #include "basis/platform/xos_basics.h"

@@ -1,5 +1,5 @@
-// Answers without a length that are cut. WinHTTP takes what came before the cut for the whole answer, so this can hold on
-// this system only.
+// Answers without a length that are cut. WinHTTP takes what came before the cut for the whole answer, so this can hold
+// on this system only.
 
 #include "basis/platform/xos_url.h"
 #include "tests/host/url/http_server.h"
