@@ -44,7 +44,8 @@ def measure(program):
     for entry in json.loads(report.read_text())["benchmarks"]:
         if entry.get("aggregate_name") != "median":
             continue
-        name = re.sub(r"/(manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)|/\d+$",
+        name = re.sub(r"/(manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)"
+                      r"|/\d+$",
                       "", entry["run_name"])
         row, who = name.rsplit("/", 1)
         scale = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}[entry["time_unit"]]
@@ -72,7 +73,8 @@ def report(family, rows, goals):
                 print(f"  {'':44} goal: {ratio:g} x {'/'.join(peers)}, which was not measured")
                 continue
             reached = times["ours"] / min(present)
-            verdict = "met" if reached <= ratio else "tie" if reached <= ratio * tolerance(row, times["ours"]) else "MISSED"
+            is_tie = reached <= ratio * tolerance(row, times["ours"])
+            verdict = "met" if reached <= ratio else "tie" if is_tie else "MISSED"
             missed += verdict == "MISSED"
             print(f"  {'':44} {reached:.2f} x {'/'.join(peers)}, goal {ratio:g}: {verdict}")
     return missed

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment
-marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`). Writes
-docs/kept.md."""
+marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`).
+Writes docs/kept.md."""
 
 import re
 

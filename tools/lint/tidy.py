@@ -1,8 +1,8 @@
 #!/usr/bin/env python3
 """clang-tidy over what the library, the platform layer and the examples compile on Linux.
 
-A file that was clean is not read again before it, a header of the project that it includes, its compiler's command or the
-checks change; --all reads every file.
+A file that was clean is not read again until it changes, or a header of the project that it includes, its compiler's
+command or the checks do; --all reads every file.
 """
 
 import hashlib
@@ -42,7 +42,8 @@ def state(path, command, headers):
     """What the result for a file depends on; None where the build does not know its headers."""
     if path not in headers:
         return None
-    parts = [command.encode(), (common.ROOT / ".clang-tidy").read_bytes(), *(Path(f).read_bytes() for f in headers[path])]
+    checks = (common.ROOT / ".clang-tidy").read_bytes()
+    parts = [command.encode(), checks, *(Path(f).read_bytes() for f in headers[path])]
     return hashlib.sha256(b"\0".join(parts)).hexdigest()
 
 
