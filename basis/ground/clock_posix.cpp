@@ -1,4 +1,4 @@
-// Its sibling is clock_win.cpp.
+// The sibling is clock_win.cpp.
 #include "basis/ground/clock.h"
 
 #include <ctime>

@@ -1,4 +1,4 @@
-// Its sibling is clock_posix.cpp.
+// The sibling is clock_posix.cpp.
 #include "basis/ground/clock.h"
 
 #include "basis/platform/windows_api.h"

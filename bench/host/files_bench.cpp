@@ -89,13 +89,13 @@ int directoriesBySystemCalls(int at, char const* name) {
 void listByHost(benchmark::State& state) {
     std::string const& top = sourceTree();
     for (auto _ : state) {
-        if (directoriesByHost(top) != SOURCE_FOLDERS) { state.SkipWithError("failed"); }
+        if (directoriesByHost(top) != SOURCE_FOLDERS) state.SkipWithError("failed");
     }
 }
 void listBySystemCalls(benchmark::State& state) {
     std::string const& top = sourceTree();
     for (auto _ : state) {
-        if (directoriesBySystemCalls(AT_FDCWD, top.c_str()) != SOURCE_FOLDERS) { state.SkipWithError("failed"); }
+        if (directoriesBySystemCalls(AT_FDCWD, top.c_str()) != SOURCE_FOLDERS) state.SkipWithError("failed");
     }
 }
 

@@ -124,7 +124,7 @@ void runJobs(benchmark::State& state) {
             Task::start(unfinished);
         }
         unfinished.waitForAll();
-        if (unfinished.done() != JOBS) { state.SkipWithError("jobs were lost"); }
+        if (unfinished.done() != JOBS) state.SkipWithError("jobs were lost");
     }
     state.SetItemsProcessed(state.iterations() * JOBS);
 }

@@ -45,7 +45,7 @@ void timed(benchmark::State& state, Before before, Work work, After after) {
         auto const begin = std::chrono::steady_clock::now();
         bool const good = work();
         state.SetIterationTime(std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count());
-        if (!good) { state.SkipWithError("failed"); }
+        if (!good) state.SkipWithError("failed");
         after();
     }
 }

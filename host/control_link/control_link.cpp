@@ -11,7 +11,7 @@ bool failsNow(char const* function, std::initializer_list<std::uint64_t> argumen
 
 void offerAlertFire(int (*fire)(std::uint32_t id)) {
     auto* const offer = reinterpret_cast<decltype(&xos_HostOfferAlertFire)>(findControl("xos_HostOfferAlertFire"));
-    if (offer != nullptr) { offer(fire); }
+    if (offer != nullptr) offer(fire);
 }
 
 } // namespace host

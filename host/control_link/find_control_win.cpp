@@ -1,4 +1,4 @@
-// Sibling: find_control_posix.cpp.
+// The sibling is find_control_posix.cpp.
 
 #include "host/control_link/control_link.h"
 #include "host/windows_api.h"

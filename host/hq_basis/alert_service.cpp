@@ -23,66 +23,66 @@ AlertService::Clock::time_point AlertService::dueAfter(std::uint32_t periodMs) {
 }
 
 std::uint32_t AlertService::add(std::uint32_t periodMs, HQ_Basis::AlertTimer::Callback callback, void* context) {
-    Lock const lock{_mutex};
-    if (!startScheduler()) { return 0; }
+    Lock const lock{mutex_};
+    if (!startScheduler()) return 0;
     auto const alert = std::make_shared<Alert>();
     alert->shown = {freeId(), context};
     alert->callback = callback;
-    _alerts.emplace(alert->shown.id, alert);
+    alerts_.emplace(alert->shown.id, alert);
     plan(alert, dueAfter(periodMs));
     return alert->shown.id;
 }
 
 void AlertService::remove(std::uint32_t id) {
-    Lock lock{_mutex};
-    auto const found = _alerts.find(id);
-    if (found == _alerts.end()) { return; }
+    Lock lock{mutex_};
+    auto const found = alerts_.find(id);
+    if (found == alerts_.end()) return;
     AlertPointer const alert = found->second;
     alert->isRemoved = true;
-    _alerts.erase(found);
+    alerts_.erase(found);
     unplan(alert);
-    _callbackReturned.notify_all(); // for those who wait to fire it
+    callbackReturned_.notify_all(); // for those who wait to fire it
     if (alert->runner != std::this_thread::get_id()) {
-        _callbackReturned.wait_for(lock, LONGEST_WAIT, [&] { return alert->runner == std::thread::id{}; });
+        callbackReturned_.wait_for(lock, LONGEST_WAIT, [&] { return alert->runner == std::thread::id{}; });
     }
 }
 
 bool AlertService::fire(std::uint32_t id) {
-    Lock lock{_mutex};
-    auto const found = _alerts.find(id);
-    if (found == _alerts.end() || found->second->runner == std::this_thread::get_id()) { return false; }
+    Lock lock{mutex_};
+    auto const found = alerts_.find(id);
+    if (found == alerts_.end() || found->second->runner == std::this_thread::get_id()) return false;
     AlertPointer const alert = found->second;
-    _callbackReturned.wait(lock, [&] { return alert->runner == std::thread::id{} || alert->isRemoved; });
-    if (alert->isRemoved) { return false; }
+    callbackReturned_.wait(lock, [&] { return alert->runner == std::thread::id{} || alert->isRemoved; });
+    if (alert->isRemoved) return false;
     unplan(alert);
     run(lock, alert);
     return true;
 }
 
 std::uint32_t AlertService::freeId() {
-    do { ++_lastId; } while (_lastId == 0 || _alerts.count(_lastId) != 0);
-    return _lastId;
+    do { ++lastId_; } while (lastId_ == 0 || alerts_.count(lastId_) != 0);
+    return lastId_;
 }
 
 void AlertService::plan(AlertPointer const& alert, Clock::time_point due) {
     alert->due = due;
-    _plan.emplace(due, alert->shown.id);
-    _scheduleChanged.notify_one();
+    plan_.emplace(due, alert->shown.id);
+    scheduleChanged_.notify_one();
 }
 
 void AlertService::unplan(AlertPointer const& alert) {
-    _plan.erase({alert->due, alert->shown.id});
+    plan_.erase({alert->due, alert->shown.id});
     if (alert->isQueued) {
-        _queue.erase(std::find(_queue.begin(), _queue.end(), alert));
+        queue_.erase(std::find(queue_.begin(), queue_.end(), alert));
         alert->isQueued = false;
     }
 }
 
 bool AlertService::startScheduler() {
-    if (_schedulerRuns) { return true; }
+    if (schedulerRuns_) return true;
     try {
         std::thread([this] { schedule(); }).detach();
-        _schedulerRuns = true;
+        schedulerRuns_ = true;
     } catch (std::system_error const&) { return false; }
     return true;
 }
@@ -96,43 +96,43 @@ void AlertService::startWorker() {
 }
 
 void AlertService::schedule() {
-    Lock lock{_mutex};
+    Lock lock{mutex_};
     for (;;) {
         queueDue();
-        if (_plan.empty()) {
-            _scheduleChanged.wait(lock);
+        if (plan_.empty()) {
+            scheduleChanged_.wait(lock);
         } else {
-            Clock::time_point const next = _plan.begin()->first;
-            _scheduleChanged.wait_until(lock, next);
+            Clock::time_point const next = plan_.begin()->first;
+            scheduleChanged_.wait_until(lock, next);
         }
     }
 }
 
 void AlertService::queueDue() {
     Clock::time_point const now = Clock::now();
-    while (!_plan.empty() && _plan.begin()->first <= now) {
-        AlertPointer const alert = _alerts.at(_plan.begin()->second);
-        _plan.erase(_plan.begin());
+    while (!plan_.empty() && plan_.begin()->first <= now) {
+        AlertPointer const alert = alerts_.at(plan_.begin()->second);
+        plan_.erase(plan_.begin());
         alert->isQueued = true;
-        _queue.push_back(alert);
-        if (_idleWorkers < _queue.size()) { startWorker(); }
-        _workArrived.notify_one();
+        queue_.push_back(alert);
+        if (idleWorkers_ < queue_.size()) startWorker();
+        workArrived_.notify_one();
     }
 }
 
 void AlertService::work() {
-    Lock lock{_mutex};
+    Lock lock{mutex_};
     for (;;) {
-        while (!_queue.empty()) {
-            AlertPointer const alert = _queue.front();
-            _queue.pop_front();
+        while (!queue_.empty()) {
+            AlertPointer const alert = queue_.front();
+            queue_.pop_front();
             alert->isQueued = false;
             run(lock, alert);
         }
-        if (_idleWorkers >= MOST_IDLE) { return; }
-        ++_idleWorkers;
-        _workArrived.wait(lock);
-        --_idleWorkers;
+        if (idleWorkers_ >= MOST_IDLE) return;
+        ++idleWorkers_;
+        workArrived_.wait(lock);
+        --idleWorkers_;
     }
 }
 
@@ -142,8 +142,8 @@ void AlertService::run(Lock& lock, AlertPointer const& alert) {
     std::uint32_t const nextPeriodMs = alert->callback(alert->shown);
     lock.lock();
     alert->runner = {};
-    if (!alert->isRemoved) { plan(alert, dueAfter(nextPeriodMs)); }
-    _callbackReturned.notify_all();
+    if (!alert->isRemoved) plan(alert, dueAfter(nextPeriodMs));
+    callbackReturned_.notify_all();
 }
 
 } // namespace host

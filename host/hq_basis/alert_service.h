@@ -65,18 +65,18 @@ private:
     void plan(AlertPointer const& alert, Clock::time_point due);
     void unplan(AlertPointer const& alert);
 
-    std::mutex _mutex;
-    std::condition_variable _scheduleChanged;
-    std::condition_variable _workArrived;
-    std::condition_variable _callbackReturned;
-    std::map<std::uint32_t, AlertPointer> _alerts;
+    std::mutex mutex_;
+    std::condition_variable scheduleChanged_;
+    std::condition_variable workArrived_;
+    std::condition_variable callbackReturned_;
+    std::map<std::uint32_t, AlertPointer> alerts_;
     /// The alerts that wait for their time, earliest first.
-    std::set<std::pair<Clock::time_point, std::uint32_t>> _plan;
+    std::set<std::pair<Clock::time_point, std::uint32_t>> plan_;
     /// The alerts that wait for a worker.
-    std::deque<AlertPointer> _queue;
-    std::uint32_t _lastId{0};
-    unsigned _idleWorkers{0};
-    bool _schedulerRuns{false};
+    std::deque<AlertPointer> queue_;
+    std::uint32_t lastId_{0};
+    unsigned idleWorkers_{0};
+    bool schedulerRuns_{false};
 };
 
 } // namespace host

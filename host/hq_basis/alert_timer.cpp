@@ -20,7 +20,7 @@ std::uint32_t AlertTimer::New(std::uint32_t periodMs, Callback callback, void* c
 }
 
 void AlertTimer::Delete(std::uint32_t id) {
-    if (!host::failsNow("HQ_Basis::AlertTimer::Delete", {id})) { host::AlertService::instance().remove(id); }
+    if (!host::failsNow("HQ_Basis::AlertTimer::Delete", {id})) host::AlertService::instance().remove(id);
 }
 
 } // namespace HQ_Basis

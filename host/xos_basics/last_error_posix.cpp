@@ -1,4 +1,4 @@
-// Sibling: last_error_win.cpp.
+// The sibling is last_error_win.cpp.
 
 #include "host/xos_basics/last_error.h"
 

@@ -1,4 +1,4 @@
-// Sibling: last_error_posix.cpp.
+// The sibling is last_error_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/last_error.h"

@@ -1,4 +1,4 @@
-// Sibling: fetch_win.cpp.
+// The sibling is fetch_win.cpp.
 
 #include "host/xos_url/fetch.h"
 #include "host/xos_url/reason.h"
@@ -36,7 +36,7 @@ struct Body {
 std::size_t takeBody(char* data, std::size_t unit, std::size_t count, void* context) {
     auto& body = *static_cast<Body*>(context);
     std::size_t const size = unit * count;
-    if (body.sink.take(data, size)) { return size; }
+    if (body.sink.take(data, size)) return size;
     body.error = errno;
     return 0;
 }
@@ -58,7 +58,7 @@ bool set(Handle const& handle, CURLoption option, Value value) {
 }
 
 bool setCredentials(Handle const& handle, FetchRequest const& request) {
-    if (request.user == nullptr) { return true; }
+    if (request.user == nullptr) return true;
     return set(handle, CURLOPT_USERNAME, request.user) &&
            set(handle, CURLOPT_PASSWORD, request.password == nullptr ? "" : request.password);
 }
@@ -119,7 +119,7 @@ int errorOf(CURLcode code, Handle const& handle, Body const& body) {
 }
 
 bool failForCode(CURLcode code, Handle const& handle, Body const& body) {
-    if (code == CURLE_HTTP_RETURNED_ERROR) { return failForStatus(statusOf(handle)); }
+    if (code == CURLE_HTTP_RETURNED_ERROR) return failForStatus(statusOf(handle));
     errno = errorOf(code, handle, body);
     return false;
 }
@@ -128,10 +128,10 @@ bool isGoodAnswer(long status) { return status >= 200 && status < 300; }
 
 bool perform(Handle const& handle, FetchRequest const& request, Body& body) {
     bool hasHead = false;
-    if (!prepare(handle, request, body, hasHead)) { return failFor(Reason::badArgument); }
+    if (!prepare(handle, request, body, hasHead)) return failFor(Reason::badArgument);
     CURLcode const code = curl_easy_perform(handle.get());
-    if (code != CURLE_OK) { return failForCode(code, handle, body); }
-    if (!hasHead) { return failFor(Reason::badAnswer); }
+    if (code != CURLE_OK) return failForCode(code, handle, body);
+    if (!hasHead) return failFor(Reason::badAnswer);
     return isGoodAnswer(statusOf(handle)) || failForStatus(statusOf(handle));
 }
 
@@ -140,7 +140,7 @@ bool perform(Handle const& handle, FetchRequest const& request, Body& body) {
 bool fetch(FetchRequest const& request, BodySink& sink) {
     Handle const handle{isReady() ? curl_easy_init() : nullptr};
     Body body{sink};
-    if (handle != nullptr) { return perform(handle, request, body); }
+    if (handle != nullptr) return perform(handle, request, body);
     errno = ENOMEM;
     return false;
 }

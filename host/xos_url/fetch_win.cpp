@@ -1,4 +1,4 @@
-// Sibling: fetch_posix.cpp.
+// The sibling is fetch_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_url/fetch.h"
@@ -69,7 +69,7 @@ std::optional<Address> addressOf(std::wstring url, FetchRequest const& request) 
     // Asks for pointers into the URL.
     parts.dwHostNameLength = parts.dwUrlPathLength = parts.dwExtraInfoLength = DWORD(-1);
     parts.dwUserNameLength = parts.dwPasswordLength = DWORD(-1);
-    if (WinHttpCrackUrl(url.c_str(), static_cast<DWORD>(url.size()), 0, &parts) == FALSE) { return std::nullopt; }
+    if (WinHttpCrackUrl(url.c_str(), static_cast<DWORD>(url.size()), 0, &parts) == FALSE) return std::nullopt;
     Address address{{parts.lpszHostName, parts.dwHostNameLength},
                     parts.nPort,
                     std::wstring(parts.lpszUrlPath, parts.dwUrlPathLength) +
@@ -121,7 +121,7 @@ DWORD exchange(HINTERNET request) {
 DWORD bestScheme(DWORD offered) {
     for (DWORD const scheme : {DWORD{WINHTTP_AUTH_SCHEME_NEGOTIATE}, DWORD{WINHTTP_AUTH_SCHEME_NTLM},
                                DWORD{WINHTTP_AUTH_SCHEME_DIGEST}, DWORD{WINHTTP_AUTH_SCHEME_BASIC}}) {
-        if ((offered & scheme) != 0) { return scheme; }
+        if ((offered & scheme) != 0) return scheme;
     }
     return 0;
 }
@@ -166,10 +166,10 @@ bool readBody(HINTERNET request, BodySink& sink) {
     std::uint64_t received = 0;
     for (;;) {
         DWORD count = 0;
-        if (WinHttpReadData(request, piece.data(), static_cast<DWORD>(piece.size()), &count) == FALSE) { return false; }
-        if (count == 0) { return !announced.has_value() || *announced == received || failFor(Reason::badAnswer); }
+        if (WinHttpReadData(request, piece.data(), static_cast<DWORD>(piece.size()), &count) == FALSE) return false;
+        if (count == 0) return !announced.has_value() || *announced == received || failFor(Reason::badAnswer);
         received += count;
-        if (!sink.take(piece.data(), count)) { return false; }
+        if (!sink.take(piece.data(), count)) return false;
     }
 }
 
@@ -191,19 +191,19 @@ enum class Outcome { good, failed, leadsOn };
 /// \param url  where to ask; then, where the answer leads
 Outcome fetchOnce(HINTERNET session, FetchRequest const& wanted, std::wstring& url, BodySink& sink) {
     std::optional<Address> const address = addressOf(url, wanted);
-    if (!address.has_value()) { return Outcome::failed; }
+    if (!address.has_value()) return Outcome::failed;
     Handle const connection{WinHttpConnect(session, address->host.c_str(), address->port, 0)};
     Handle const request = connection == nullptr ? Handle{} : openRequest(connection.get(), *address);
-    if (request == nullptr) { return Outcome::failed; }
+    if (request == nullptr) return Outcome::failed;
     DWORD const status = exchangeWithCredentials(request.get(), *address);
     if (leadsOn(status)) {
         std::wstring const location = header(request.get(), WINHTTP_QUERY_LOCATION);
         url = combined(url, location);
-        if (!location.empty()) { return Outcome::leadsOn; }
+        if (!location.empty()) return Outcome::leadsOn;
     }
     // Without any status the system has said why.
     bool const isGood = status >= 200 && status < 300;
-    if (!isGood && status != 0) { failForStatus(static_cast<long>(status)); }
+    if (!isGood && status != 0) failForStatus(static_cast<long>(status));
     return isGood && readBody(request.get(), sink) ? Outcome::good : Outcome::failed;
 }
 

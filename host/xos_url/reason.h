@@ -31,7 +31,7 @@ public:
     ~KeepReason();
 
 private:
-    unsigned long _code;
+    unsigned long code_;
 };
 
 } // namespace host

@@ -1,4 +1,4 @@
-// Sibling: reason_win.cpp.
+// The sibling is reason_win.cpp.
 
 #include "host/xos_url/reason.h"
 
@@ -35,7 +35,7 @@ bool failFor(Reason reason) {
     return false;
 }
 
-KeepReason::KeepReason() : _code(static_cast<unsigned long>(errno)) {}
-KeepReason::~KeepReason() { errno = static_cast<int>(_code); }
+KeepReason::KeepReason() : code_(static_cast<unsigned long>(errno)) {}
+KeepReason::~KeepReason() { errno = static_cast<int>(code_); }
 
 } // namespace host

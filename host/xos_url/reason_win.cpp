@@ -1,4 +1,4 @@
-// Sibling: reason_posix.cpp.
+// The sibling is reason_posix.cpp.
 
 #include "host/xos_url/reason.h"
 
@@ -37,7 +37,7 @@ bool failFor(Reason reason) {
     return false;
 }
 
-KeepReason::KeepReason() : _code(GetLastError()) {}
-KeepReason::~KeepReason() { SetLastError(_code); }
+KeepReason::KeepReason() : code_(GetLastError()) {}
+KeepReason::~KeepReason() { SetLastError(code_); }
 
 } // namespace host

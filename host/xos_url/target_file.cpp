@@ -20,28 +20,28 @@ constexpr int MOST_ATTEMPTS = 100;
 
 } // namespace
 
-TargetFile::TargetFile(std::string path) : _path(std::move(path)) {}
+TargetFile::TargetFile(std::string path) : path_(std::move(path)) {}
 
 TargetFile::~TargetFile() {
     KeepReason const keep;
-    if (_file != nullptr) { std::fclose(_file); }
-    if (!_temporary.empty()) { removeFile(_temporary); }
+    if (file_ != nullptr) std::fclose(file_);
+    if (!temporary_.empty()) removeFile(temporary_);
 }
 
 bool TargetFile::open() {
-    for (int attempt = 0; attempt < MOST_ATTEMPTS && _file == nullptr; ++attempt) {
-        std::string const name = temporaryName(_path);
-        _file = createNewFile(name);
-        if (_file != nullptr) { _temporary = name; }
+    for (int attempt = 0; attempt < MOST_ATTEMPTS && file_ == nullptr; ++attempt) {
+        std::string const name = temporaryName(path_);
+        file_ = createNewFile(name);
+        if (file_ != nullptr) temporary_ = name;
     }
-    return _file != nullptr;
+    return file_ != nullptr;
 }
 
-bool TargetFile::write(void const* data, std::size_t size) { return std::fwrite(data, 1, size, _file) == size; }
+bool TargetFile::write(void const* data, std::size_t size) { return std::fwrite(data, 1, size, file_) == size; }
 
 bool TargetFile::commit() {
-    if (std::fclose(std::exchange(_file, nullptr)) != 0 || !replaceFile(_temporary, _path)) { return false; }
-    _temporary.clear();
+    if (std::fclose(std::exchange(file_, nullptr)) != 0 || !replaceFile(temporary_, path_)) return false;
+    temporary_.clear();
     return true;
 }
 

@@ -26,9 +26,9 @@ public:
     bool commit();
 
 private:
-    std::string const _path;
-    std::string _temporary;
-    std::FILE* _file{nullptr};
+    std::string const path_;
+    std::string temporary_;
+    std::FILE* file_{nullptr};
 };
 
 } // namespace host

@@ -1,4 +1,4 @@
-// Sibling: url_files_win.cpp.
+// The sibling is url_files_win.cpp.
 
 #include "host/xos_url/reason.h"
 #include "host/xos_url/url_files.h"
@@ -14,8 +14,8 @@ namespace {
 
 bool isRegular(int file) {
     struct stat status {};
-    if (fstat(file, &status) != 0) { return false; }
-    if (S_ISDIR(status.st_mode)) { return failFor(Reason::directory); }
+    if (fstat(file, &status) != 0) return false;
+    if (S_ISDIR(status.st_mode)) return failFor(Reason::directory);
     return S_ISREG(status.st_mode) || failFor(Reason::badArgument);
 }
 
@@ -36,7 +36,7 @@ std::FILE* createNewFile(std::string const& path) {
 std::FILE* openRegularFile(std::string const& path) {
     // Without waiting for a writer, should the name be a pipe's.
     int const file = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (file < 0 || isRegular(file)) { return file < 0 ? nullptr : fdopen(file, "rb"); }
+    if (file < 0 || isRegular(file)) return file < 0 ? nullptr : fdopen(file, "rb");
     KeepReason const keep;
     close(file);
     return nullptr;

@@ -1,4 +1,4 @@
-// Sibling: url_files_posix.cpp.
+// The sibling is url_files_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_url/url_files.h"
@@ -17,10 +17,10 @@ std::string systemPath(std::string path) {
 }
 
 std::string pathOfFileUrl(FileUrl const& url) {
-    if (!url.host.empty()) { return systemPath("//" + url.host + url.path); }
+    if (!url.host.empty()) return systemPath("//" + url.host + url.path);
     bool const hasDrive = url.path.size() >= 3 && std::isalpha(static_cast<unsigned char>(url.path[1])) != 0 &&
                           (url.path[2] == ':' || url.path[2] == '|');
-    if (!hasDrive) { return systemPath(url.path); }
+    if (!hasDrive) return systemPath(url.path);
     std::string path = url.path.substr(1);
     path[1] = ':';
     return systemPath(path);

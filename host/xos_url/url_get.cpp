@@ -18,18 +18,18 @@ constexpr std::uint32_t STALL_SECONDS = 60;
 
 class FileSink : public BodySink {
 public:
-    explicit FileSink(TargetFile& file) : _file(file) {}
-    bool take(void const* data, std::size_t size) override { return _file.write(data, size); }
+    explicit FileSink(TargetFile& file) : file_(file) {}
+    bool take(void const* data, std::size_t size) override { return file_.write(data, size); }
 
 private:
-    TargetFile& _file;
+    TargetFile& file_;
 };
 
 bool copyBytes(std::FILE* from, TargetFile& to) {
     char piece[65536];
     std::size_t count = 0;
     while ((count = std::fread(piece, 1, sizeof piece, from)) != 0) {
-        if (!to.write(piece, count)) { return false; }
+        if (!to.write(piece, count)) return false;
     }
     return std::ferror(from) == 0;
 }
@@ -49,7 +49,7 @@ bool readFile(FileUrl const& url, TargetFile& target) {
 
 bool getFile(char const* url, TargetFile& target) {
     std::optional<FileUrl> const parsed = parseFileUrl(url);
-    if (!parsed.has_value()) { return failFor(Reason::badArgument); }
+    if (!parsed.has_value()) return failFor(Reason::badArgument);
     return readFile(*parsed, target) && target.commit();
 }
 

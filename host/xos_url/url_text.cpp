@@ -23,10 +23,10 @@ std::optional<std::string> unescaped(std::string_view text) {
         if (byte == '%') {
             std::string_view const digits = text.substr(i + 1, 2);
             auto const parsed = std::from_chars(digits.data(), digits.data() + digits.size(), byte, 16);
-            if (digits.size() != 2 || parsed.ptr != digits.data() + 2) { return std::nullopt; }
+            if (digits.size() != 2 || parsed.ptr != digits.data() + 2) return std::nullopt;
             i += 2;
         }
-        if (byte == 0) { return std::nullopt; }
+        if (byte == 0) return std::nullopt;
         result += static_cast<char>(byte);
     }
     return result;
@@ -37,8 +37,8 @@ constexpr std::string_view FILE_SCHEME = "file:";
 } // namespace
 
 Scheme schemeOf(std::string_view url) {
-    if (startsWith(url, "http://")) { return Scheme::http; }
-    if (startsWith(url, "https://")) { return Scheme::https; }
+    if (startsWith(url, "http://")) return Scheme::http;
+    if (startsWith(url, "https://")) return Scheme::https;
     return startsWith(url, FILE_SCHEME) ? Scheme::file : Scheme::other;
 }
 
@@ -57,7 +57,7 @@ std::string escapedUrl(std::string_view url) {
 }
 
 std::optional<FileUrl> parseFileUrl(std::string_view url) {
-    if (!startsWith(url, FILE_SCHEME)) { return std::nullopt; }
+    if (!startsWith(url, FILE_SCHEME)) return std::nullopt;
     url.remove_prefix(FILE_SCHEME.size());
     url = url.substr(0, url.find_first_of("?#"));
     std::string host;
@@ -66,9 +66,9 @@ std::optional<FileUrl> parseFileUrl(std::string_view url) {
         host = url.substr(0, url.find('/'));
         url.remove_prefix(host.size());
     }
-    if (url.empty() || url.front() != '/') { return std::nullopt; }
+    if (url.empty() || url.front() != '/') return std::nullopt;
     std::optional<std::string> path = unescaped(url);
-    if (!path.has_value()) { return std::nullopt; }
+    if (!path.has_value()) return std::nullopt;
     return FileUrl{startsWith(host, "localhost") && host.size() == 9 ? std::string{} : host, std::move(*path)};
 }
 

@@ -25,9 +25,9 @@ constinit host::Setting directory{"XOS_CONFIG"};
 
 std::string configurationDirectory() {
     std::string set = directory.get();
-    if (!set.empty()) { return set; }
+    if (!set.empty()) return set;
     std::string root = host::configuredRoot();
-    if (root.empty()) { return "config"; }
+    if (root.empty()) return "config";
     bool const endsInSlash = root.back() == '/' || root.back() == '\\';
     return root + (endsInSlash ? "config" : "/config");
 }
@@ -39,7 +39,7 @@ bool isName(char const* name) {
 
 bool readFile(std::string const& path, std::string& text) {
     std::unique_ptr<std::FILE, int (*)(std::FILE*)> const file{std::fopen(path.c_str(), "rb"), std::fclose};
-    if (file == nullptr) { return false; }
+    if (file == nullptr) return false;
     char piece[4096];
     std::size_t count = 0;
     while ((count = std::fread(piece, 1, sizeof piece, file.get())) != 0) { text.append(piece, count); }
@@ -52,21 +52,21 @@ void report(cfg_Group const& group, int line, char const* mistake) {
     std::string const place = group.path + ":" + std::to_string(line);
     std::lock_guard const lock{mutex};
     static auto& reported = *new std::set<std::string>;
-    if (reported.insert(place).second) { std::fprintf(stderr, "%s: %s\n", place.c_str(), mistake); }
+    if (reported.insert(place).second) std::fprintf(stderr, "%s: %s\n", place.c_str(), mistake);
 }
 
 /// The last line of several with one key counts.
 host::GroupEntry const* findEntry(cfg_Group const& group, char const* key) {
     auto const& entries = group.text.entries;
     for (auto entry = entries.rbegin(); entry != entries.rend(); ++entry) {
-        if (entry->key == key) { return &*entry; }
+        if (entry->key == key) return &*entry;
     }
     return nullptr;
 }
 
 int switchOf(cfg_Group const& group, char const* key, int fallback) {
     host::GroupEntry const* const entry = findEntry(group, key);
-    if (entry == nullptr) { return fallback; }
+    if (entry == nullptr) return fallback;
     auto const value = host::switchValue(entry->value);
     if (!value.has_value()) {
         report(group, entry->line, "the value is none of true, yes, on, 1, false, no, off, 0; left out");
@@ -104,7 +104,7 @@ cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2,
 }
 
 int cfg_KeyGetOpt_Bool(cfg_Group* group, char const* key, int fallback) {
-    if (host::failsNow(host::Function::cfg_KeyGetOpt_Bool, group, key, fallback)) { return fallback; }
+    if (host::failsNow(host::Function::cfg_KeyGetOpt_Bool, group, key, fallback)) return fallback;
     return group == nullptr || key == nullptr ? fallback : switchOf(*group, key, fallback);
 }
 

@@ -10,7 +10,7 @@ constinit std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> soleCaller{};
 std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller) {
     std::atomic<ThreadCalls*>& sole = soleCaller[indexOf(function)];
     ThreadCalls* seen = sole.load(std::memory_order_relaxed);
-    if (seen == nullptr && sole.compare_exchange_strong(seen, &caller, std::memory_order_relaxed)) { return 0; }
+    if (seen == nullptr && sole.compare_exchange_strong(seen, &caller, std::memory_order_relaxed)) return 0;
     if (seen != &spareThreadCalls) {
         // From here on every call is stamped, the former sole caller's too: a call of its that comes after this one
         // sees the mark.

@@ -48,7 +48,7 @@ inline void leaveTime(ThreadCalls const& mine, std::atomic<std::uint64_t>& time)
 /// Adopts the time of the semaphore's last giver, if that is later.
 inline void learnTime(ThreadCalls& mine, std::atomic<std::uint64_t> const& time) {
     std::uint64_t const left = time.load(std::memory_order_relaxed);
-    if (left > mine.time.load(std::memory_order_relaxed)) { mine.time.store(left, std::memory_order_relaxed); }
+    if (left > mine.time.load(std::memory_order_relaxed)) mine.time.store(left, std::memory_order_relaxed);
 }
 
 /// Returns the stamp of a call by a thread that is not known to be its function's only caller.
@@ -56,7 +56,7 @@ inline void learnTime(ThreadCalls& mine, std::atomic<std::uint64_t> const& time)
 std::uint64_t stampOfSharedCall(Function function, ThreadCalls& caller);
 
 [[gnu::always_inline]] inline std::uint64_t stampOfCall(Function function, ThreadCalls& caller) {
-    if (isOrderedByEvents(function)) { return nextTime(caller); }
+    if (isOrderedByEvents(function)) return nextTime(caller);
     bool const alone = soleCaller[indexOf(function)].load(std::memory_order_relaxed) == &caller;
     return alone ? 0 : stampOfSharedCall(function, caller);
 }

@@ -12,7 +12,7 @@ namespace {
 constexpr std::size_t NUMBER_SIZE = 24;
 
 std::string textOf(std::uint64_t word, CallSnapshot const& call) {
-    if (word == NULL_TEXT) { return "null"; }
+    if (word == NULL_TEXT) return "null";
     return '"' + std::string(reinterpret_cast<char const*>(call.texts.data() + word)) + '"';
 }
 
@@ -54,7 +54,7 @@ std::string argumentText(char kind, std::uint64_t word, CallSnapshot const& call
 std::string callText(char const* kinds, CallSnapshot const& call) {
     std::string text;
     for (std::size_t i = 0; kinds[i] != '\0'; ++i) {
-        if (i != 0) { text += ", "; }
+        if (i != 0) text += ", ";
         text += argumentText(kinds[i], call.words[i], call);
     }
     return text;

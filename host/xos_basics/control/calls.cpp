@@ -21,10 +21,10 @@ struct Reading {
 bool textsAreWhole(char const* kinds, CallSnapshot const& call) {
     for (std::size_t i = 0; kinds[i] != '\0'; ++i) {
         std::uint64_t const word = call.words[i];
-        if (kinds[i] != 't' || word == NULL_TEXT) { continue; }
-        if (word >= call.texts.size()) { return false; }
+        if (kinds[i] != 't' || word == NULL_TEXT) continue;
+        if (word >= call.texts.size()) return false;
         auto const* const begin = reinterpret_cast<char const*>(call.texts.data() + word);
-        if (std::memchr(begin, '\0', (call.texts.size() - word) * sizeof(std::uint64_t)) == nullptr) { return false; }
+        if (std::memchr(begin, '\0', (call.texts.size() - word) * sizeof(std::uint64_t)) == nullptr) return false;
     }
     return true;
 }
@@ -46,7 +46,7 @@ bool tryRead(CallRecord const& record, char const* kinds, Reading& reading) {
     for (std::size_t i = 0; i < MAX_ARGUMENTS; ++i) {
         reading.call.words[i] = slot.words[i].load(std::memory_order_acquire);
     }
-    if (std::strchr(kinds, 't') != nullptr) { copyTexts(slot, reading.call.texts); }
+    if (std::strchr(kinds, 't') != nullptr) copyTexts(slot, reading.call.texts);
     return record.completed.load(std::memory_order_relaxed) == number && textsAreWhole(kinds, reading.call);
 }
 
@@ -91,7 +91,7 @@ bool lastCallOf(Function function, std::string& text) {
     Reading last{};
     for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) {
         // Threads without memory for records of their own may write the spare ones together.
-        if (calls == &spareThreadCalls || callsSinceReset(*calls, index) == 0) { continue; }
+        if (calls == &spareThreadCalls || callsSinceReset(*calls, index) == 0) continue;
         Reading reading = readRecord(calls->records[index], kinds);
         // Without stamps it was the sole caller's.
         if (!found || reading.stamp > last.stamp || (reading.stamp == last.stamp && calls == sole)) {
@@ -99,7 +99,7 @@ bool lastCallOf(Function function, std::string& text) {
             found = true;
         }
     }
-    if (found) { text = callText(kinds, last.call); }
+    if (found) text = callText(kinds, last.call);
     return found;
 }
 

@@ -39,11 +39,11 @@ public:
         : CallNote(function, isAlike, threadCalls()) {}
     CallNote(CallNote const&) = delete;
     CallNote& operator=(CallNote const&) = delete;
-    ~CallNote() { _record.completed.store(_number, std::memory_order_release); }
+    ~CallNote() { record_.completed.store(number_, std::memory_order_release); }
 
-    void addWord(std::uint64_t word) { _slot.words[_arguments++].store(word, std::memory_order_release); }
+    void addWord(std::uint64_t word) { slot_.words[arguments_++].store(word, std::memory_order_release); }
 
-    void addText(char const* text) { addWord(keepText(_slot, text, _textWords)); }
+    void addText(char const* text) { addWord(keepText(slot_, text, textWords_)); }
 
     template <class Argument>
     void add(Argument const& argument) {
@@ -60,17 +60,17 @@ public:
 
 private:
     [[gnu::always_inline]] CallNote(Function function, bool isAlike, ThreadCalls& mine)
-        : _record(mine.records[indexOf(function)]),
-          _number(_record.completed.load(std::memory_order_relaxed) + 1),
-          _slot(_record.slots[_number % 2]) {
-        _slot.stamp.store(isAlike ? 0 : stampOfCall(function, mine), std::memory_order_release);
+        : record_(mine.records[indexOf(function)]),
+          number_(record_.completed.load(std::memory_order_relaxed) + 1),
+          slot_(record_.slots[number_ % 2]) {
+        slot_.stamp.store(isAlike ? 0 : stampOfCall(function, mine), std::memory_order_release);
     }
 
-    CallRecord& _record;
-    std::uint64_t const _number;
-    CallSlot& _slot;
-    std::size_t _arguments{0};
-    std::size_t _textWords{0};
+    CallRecord& record_;
+    std::uint64_t const number_;
+    CallSlot& slot_;
+    std::size_t arguments_{0};
+    std::size_t textWords_{0};
 };
 
 inline bool failsAfterNote(Function function) {

@@ -25,13 +25,13 @@ void setRule(Rule& rule, Rule wanted) {
     bool const was = rule.times != 0;
     bool const is = wanted.times != 0;
     rule = wanted;
-    if (was != is) { armedFaults.fetch_add(is ? 1 : std::uint32_t(-1), std::memory_order_relaxed); }
+    if (was != is) armedFaults.fetch_add(is ? 1 : std::uint32_t(-1), std::memory_order_relaxed);
 }
 
 bool countsDown(Function function) {
     std::lock_guard const lock{mutex};
     Rule& rule = rules[indexOf(function)];
-    if (rule.times == 0) { return false; }
+    if (rule.times == 0) return false;
     if (rule.skip != 0) {
         --rule.skip;
         return false;
@@ -44,13 +44,13 @@ bool countsDown(Function function) {
 
 bool takesInjectedFailure(Function function) {
     bool const fails = countsDown(function);
-    if (fails) { setLastError(Error::injected); }
+    if (fails) setLastError(Error::injected);
     return fails;
 }
 
 bool injectFailure(char const* name, std::uint32_t skip, std::uint32_t times) {
     Function const function = functionNamed(name);
-    if (function == Function::none || !factsOf(function).canFail) { return false; }
+    if (function == Function::none || !factsOf(function).canFail) return false;
     std::lock_guard const lock{mutex};
     setRule(rules[indexOf(function)], {skip, times});
     return true;

@@ -13,7 +13,7 @@ namespace {
 /// Takes the number behind the last ":" off the end of `text`.
 bool takeNumber(std::string_view& text, std::uint32_t& number) {
     std::size_t const colon = text.rfind(':');
-    if (colon == std::string_view::npos) { return false; }
+    if (colon == std::string_view::npos) return false;
     char const* const end = text.data() + text.size();
     auto const parsed = std::from_chars(text.data() + colon + 1, end, number);
     text = text.substr(0, colon);

@@ -10,7 +10,7 @@ constexpr bool kindsFit() {
     for (FunctionFacts const& facts : FUNCTIONS) {
         std::size_t count = 0;
         while (facts.kinds[count] != '\0') { ++count; }
-        if (count > MAX_ARGUMENTS) { return false; }
+        if (count > MAX_ARGUMENTS) return false;
     }
     return true;
 }
@@ -21,7 +21,7 @@ static_assert(kindsFit());
 Function functionNamed(char const* name) {
     if (name != nullptr) {
         for (std::size_t i = 0; i < FUNCTION_COUNT; ++i) {
-            if (std::strcmp(FUNCTIONS[i].name, name) == 0) { return static_cast<Function>(i); }
+            if (std::strcmp(FUNCTIONS[i].name, name) == 0) return static_cast<Function>(i);
         }
     }
     return Function::none;

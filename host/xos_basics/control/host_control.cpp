@@ -45,7 +45,7 @@ void xos_HostCallsReset(void) { host::resetCalls(); }
 char const* xos_HostLastCall(char const* name) {
     host::Function const function = host::functionNamed(name);
     std::string*& text = host::threadCalls().lastCallText;
-    if (text == nullptr) { text = new std::string; }
+    if (text == nullptr) text = new std::string;
     return function != host::Function::none && host::lastCallOf(function, *text) ? text->c_str() : nullptr;
 }
 

@@ -41,7 +41,7 @@ void gatherTime() {
 
 ThreadCalls* adoptThreadCalls() {
     ThreadCalls* const calls = freeOrNewCalls();
-    if (calls == nullptr) { return &spareThreadCalls; }
+    if (calls == nullptr) return &spareThreadCalls;
     gatherTime();
     calls->time.store(commonTime.load(std::memory_order_relaxed), std::memory_order_relaxed);
     static constinit std::atomic<std::uint64_t> lastSerial{0};

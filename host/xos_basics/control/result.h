@@ -31,7 +31,7 @@ int resultOf(Body body) {
 /// False, with the last error set, where one of the texts is null.
 template <class... Texts>
 bool given(Texts const*... texts) {
-    if ((... && (texts != nullptr))) { return true; }
+    if ((... && (texts != nullptr))) return true;
     setLastError(Error::badArgument);
     return false;
 }

@@ -1,4 +1,4 @@
-// Sibling: thread_end_win.cpp.
+// The sibling is thread_end_win.cpp.
 
 #include "host/xos_basics/control/thread_end.h"
 

@@ -1,4 +1,4 @@
-// Sibling: thread_end_posix.cpp.
+// The sibling is thread_end_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/control/thread_end.h"

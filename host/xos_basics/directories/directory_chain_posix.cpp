@@ -12,7 +12,7 @@ bool DirectoryChain::push(Descriptor directory) {
         Level& oldest = levels_[levels_.size() - KEPT_OPEN];
         struct stat status {};
         if (oldest.directory) {
-            if (::fstat(oldest.directory.get(), &status) != 0) { return false; }
+            if (::fstat(oldest.directory.get(), &status) != 0) return false;
             oldest.device = status.st_dev;
             oldest.inode = status.st_ino;
             oldest.directory = Descriptor{};
@@ -23,13 +23,13 @@ bool DirectoryChain::push(Descriptor directory) {
 }
 
 bool DirectoryChain::findAbove() {
-    if (levels_.size() < 2) { return true; }
+    if (levels_.size() < 2) return true;
     Level& above = levels_[levels_.size() - 2];
-    if (above.directory) { return true; }
+    if (above.directory) return true;
     Descriptor found{::openat(lowest(), "..", O_PATH | O_DIRECTORY | O_CLOEXEC)};
     struct stat status {};
-    if (!found || ::fstat(found.get(), &status) != 0) { return false; }
-    if (status.st_dev != above.device || status.st_ino != above.inode) { return failWith(ESTALE); }
+    if (!found || ::fstat(found.get(), &status) != 0) return false;
+    if (status.st_dev != above.device || status.st_ino != above.inode) return failWith(ESTALE);
     above.directory = std::move(found);
     return true;
 }

@@ -29,7 +29,7 @@ struct Listing {
     bool anyCase = false;
 
     bool accepts(char const* name) const {
-        if (pattern.empty()) { return true; }
+        if (pattern.empty()) return true;
         std::size_t const length = std::strlen(name);
         return anyCase ? ZOR_Basis::matchesWildcard<ZOR_Basis::AnyCase>(pattern.data(), pattern.size(), name, length)
                        : ZOR_Basis::matchesWildcard(pattern.data(), pattern.size(), name, length);
@@ -40,52 +40,52 @@ enum Kind { ALL, DIRECTORIES, FILES };
 
 /// Null, with the last error set, for the handle 0.
 Listing* listingOf(xos_Dir handle) {
-    if (handle == 0) { host::setLastError(host::Error::badHandle); }
+    if (handle == 0) host::setLastError(host::Error::badHandle);
     return reinterpret_cast<Listing*>(static_cast<std::uintptr_t>(handle));
 }
 
 } // namespace
 
 int xos_DirCreateEx(char const* path, int reserved) {
-    if (failsNow(Function::xos_DirCreateEx, path, reserved) || !given(path)) { return FAILED; }
+    if (failsNow(Function::xos_DirCreateEx, path, reserved) || !given(path)) return FAILED;
     return resultOf([&] { return host::createDirectory(path); });
 }
 
 int xos_DirRemove(char const* path, uint32_t flags) {
-    if (failsNow(Function::xos_DirRemove, path, flags) || !given(path)) { return FAILED; }
+    if (failsNow(Function::xos_DirRemove, path, flags) || !given(path)) return FAILED;
     return resultOf([&] { return host::removeDirectory(path, (flags & RECURSIVE) != 0); });
 }
 
 int xos_DirCopy(char const* dst, char const* src, uint32_t flags) {
-    if (failsNow(Function::xos_DirCopy, dst, src, flags) || !given(dst, src)) { return FAILED; }
+    if (failsNow(Function::xos_DirCopy, dst, src, flags) || !given(dst, src)) return FAILED;
     return resultOf([&] { return host::copyDirectory(dst, src, (flags & OVERWRITE) != 0, (flags & RECURSIVE) != 0); });
 }
 
 int xos_DirMove(char const* dst, char const* src, uint32_t flags) {
-    if (failsNow(Function::xos_DirMove, dst, src, flags) || !given(dst, src)) { return FAILED; }
+    if (failsNow(Function::xos_DirMove, dst, src, flags) || !given(dst, src)) return FAILED;
     return resultOf([&] { return host::moveDirectory(dst, src, (flags & OVERWRITE) != 0); });
 }
 
 xos_Dir xos_DirOpenEx(char const* path, char const* pattern, uint32_t flags) {
-    if (failsNow(Function::xos_DirOpenEx, path, pattern, flags) || !given(path)) { return 0; }
+    if (failsNow(Function::xos_DirOpenEx, path, pattern, flags) || !given(path)) return 0;
     return host::unlessMemoryLacks(xos_Dir{0}, [&]() -> xos_Dir {
         auto listing = std::make_unique<Listing>();
         listing->entries = host::RawListing::open(path);
-        if (listing->entries == nullptr) { return 0; }
-        if (pattern != nullptr) { listing->pattern = pattern; }
+        if (listing->entries == nullptr) return 0;
+        if (pattern != nullptr) listing->pattern = pattern;
         return reinterpret_cast<std::uintptr_t>(listing.release());
     });
 }
 
 void xos_DirForceCaseAny(xos_Dir handle, int on) {
     failsNow(Function::xos_DirForceCaseAny, handle, on);
-    if (Listing* const listing = listingOf(handle)) { listing->anyCase = on != 0; }
+    if (Listing* const listing = listingOf(handle)) listing->anyCase = on != 0;
 }
 
 char const* xos_DirNextEx(xos_Dir handle, int kind, int reserved, uint32_t flags) {
-    if (failsNow(Function::xos_DirNextEx, handle, kind, reserved, flags)) { return nullptr; }
+    if (failsNow(Function::xos_DirNextEx, handle, kind, reserved, flags)) return nullptr;
     Listing* const listing = listingOf(handle);
-    if (listing == nullptr) { return nullptr; }
+    if (listing == nullptr) return nullptr;
     if (kind < ALL || kind > FILES) {
         host::setLastError(host::Error::badArgument);
         return nullptr;

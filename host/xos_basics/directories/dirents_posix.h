@@ -21,10 +21,10 @@ public:
     /// Goes on to the next entry but "." and "..". \return false at the end, and when reading failed
     bool next(int directory) {
         for (;;) {
-            if (next_ == end_ && !fill(directory)) { return false; }
+            if (next_ == end_ && !fill(directory)) return false;
             entry_ = reinterpret_cast<dirent64 const*>(buffer_.data() + next_);
             next_ += entry_->d_reclen;
-            if (!isDots(entry_->d_name)) { return true; }
+            if (!isDots(entry_->d_name)) return true;
         }
     }
 
@@ -35,7 +35,7 @@ public:
 
     /// The type bits of the entry's status, asked of the file system only where the directory does not tell.
     mode_t type(int directory) const {
-        if (entry_->d_type != DT_UNKNOWN) { return DTTOIF(entry_->d_type); }
+        if (entry_->d_type != DT_UNKNOWN) return DTTOIF(entry_->d_type);
         struct stat status {};
         return ::fstatat(directory, entry_->d_name, &status, AT_SYMLINK_NOFOLLOW) == 0 ? status.st_mode & S_IFMT : 0;
     }

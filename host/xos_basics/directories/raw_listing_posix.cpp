@@ -1,4 +1,4 @@
-// Sibling: raw_listing_win.cpp.
+// The sibling is raw_listing_win.cpp.
 
 #include "host/xos_basics/directories/raw_listing.h"
 
@@ -25,7 +25,7 @@ private:
 
 std::unique_ptr<RawListing> RawListing::open(char const* path) {
     Descriptor directory{::open(systemPath(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)};
-    if (!directory) { return nullptr; }
+    if (!directory) return nullptr;
     return std::make_unique<DirentListing>(std::move(directory));
 }
 

@@ -1,4 +1,4 @@
-// Sibling: raw_listing_posix.cpp.
+// The sibling is raw_listing_posix.cpp.
 
 #include "host/xos_basics/directories/raw_listing.h"
 
@@ -14,7 +14,7 @@ public:
 
     char const* next() override {
         while (search_.next()) {
-            if (narrow(search_.name()) || narrow(search_.entry().cAlternateFileName)) { return name_; }
+            if (narrow(search_.name()) || narrow(search_.entry().cAlternateFileName)) return name_;
         }
         return nullptr;
     }
@@ -42,7 +42,7 @@ private:
 std::unique_ptr<RawListing> RawListing::open(char const* path) {
     std::wstring directory;
     auto listing = std::make_unique<SearchListing>();
-    if (!fullPath(path, directory) || !listing->open(directory)) { return nullptr; }
+    if (!fullPath(path, directory) || !listing->open(directory)) return nullptr;
     return listing;
 }
 

@@ -62,13 +62,13 @@ bool TreeRemoval::run(Descriptor at, char const* name) {
 }
 
 void TreeRemoval::fail() {
-    if (failures_++ == 0) { firstError_ = errno; }
+    if (failures_++ == 0) firstError_ = errno;
 }
 
 void TreeRemoval::enter(char const* name) {
     Descriptor directory{::openat(chain_.lowest(), name, O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC)};
     if (!directory || !chain_.push(std::move(directory))) {
-        if (!removeUnentered(name)) { fail(); }
+        if (!removeUnentered(name)) fail();
         levels_.back().directories.dropFirst();
         return;
     }
@@ -80,7 +80,7 @@ void TreeRemoval::sweep() {
     int const directory = chain_.lowest();
     while (dirents_.next(directory)) {
         if (!S_ISDIR(dirents_.toldType())) {
-            if (::unlinkat(directory, dirents_.name(), 0) == 0 || errno == ENOENT) { continue; }
+            if (::unlinkat(directory, dirents_.name(), 0) == 0 || errno == ENOENT) continue;
             if (errno != EISDIR) {
                 fail();
                 continue;
@@ -88,11 +88,11 @@ void TreeRemoval::sweep() {
         }
         levels_.back().directories.add(dirents_.name());
     }
-    if (dirents_.failed()) { fail(); }
+    if (dirents_.failed()) fail();
 }
 
 bool TreeRemoval::leave() {
-    if (!chain_.findAbove()) { return false; }
+    if (!chain_.findAbove()) return false;
     chain_.pop();
     bool const clean = levels_.back().failuresBefore == failures_;
     levels_.pop_back();
@@ -101,7 +101,7 @@ bool TreeRemoval::leave() {
     if (!gone) {
         // Filled again, or replaced by another entry: examine it again.
         bool const changed = errno == ENOTEMPTY || errno == EEXIST || errno == ENOTDIR;
-        if (clean && changed && ++above.passes < MOST_PASSES) { return true; }
+        if (clean && changed && ++above.passes < MOST_PASSES) return true;
         fail();
     }
     above.directories.dropFirst();
@@ -112,8 +112,8 @@ bool TreeRemoval::leave() {
 bool TreeRemoval::removeUnentered(char const* name) {
     int const error = errno;
     bool const noDirectory = error == ENOTDIR || error == ELOOP;
-    if (error == ENOENT || ::unlinkat(chain_.lowest(), name, noDirectory ? 0 : AT_REMOVEDIR) == 0) { return true; }
-    if (errno == ENOENT) { return true; }
+    if (error == ENOENT || ::unlinkat(chain_.lowest(), name, noDirectory ? 0 : AT_REMOVEDIR) == 0) return true;
+    if (errno == ENOENT) return true;
     return noDirectory ? false : failWith(error);
 }
 

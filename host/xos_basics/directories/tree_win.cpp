@@ -1,4 +1,4 @@
-// Sibling: tree_posix.cpp.
+// The sibling is tree_posix.cpp.
 
 #include "host/xos_basics/directories/tree.h"
 
@@ -34,7 +34,7 @@ public:
     /// Goes down to the next directory that waits here. \return false: none is left
     bool enter() {
         std::vector<std::wstring>& waiting = levels_.back().waiting;
-        if (waiting.empty()) { return false; }
+        if (waiting.empty()) return false;
         path_ = joined(path_, waiting.back().c_str());
         waiting.pop_back();
         levels_.push_back({path_.size(), {}});
@@ -44,7 +44,7 @@ public:
     /// Goes up. \return false: this was the top
     bool leave() {
         levels_.pop_back();
-        if (levels_.empty()) { return false; }
+        if (levels_.empty()) return false;
         path_.resize(levels_.back().length);
         return true;
     }
@@ -68,7 +68,7 @@ public:
         sweep();
         do {
             while (descent_.enter()) { sweep(); }
-            if (!removeEmptyDirectory(descent_.path())) { fail(); }
+            if (!removeEmptyDirectory(descent_.path())) fail();
         } while (descent_.leave());
         return firstError_ == ERROR_SUCCESS || failWith(firstError_);
     }
@@ -87,11 +87,11 @@ private:
                 fail();
             }
         }
-        if (GetLastError() != ERROR_NO_MORE_FILES) { fail(); }
+        if (GetLastError() != ERROR_NO_MORE_FILES) fail();
     }
 
     void fail() {
-        if (firstError_ == ERROR_SUCCESS) { firstError_ = GetLastError(); }
+        if (firstError_ == ERROR_SUCCESS) firstError_ = GetLastError();
     }
 
     Descent descent_;
@@ -113,8 +113,8 @@ struct CopyRules {
 bool copyDirectoryLink(std::wstring const& from, std::wstring const& to, bool overwrite) {
     EntryFacts present{};
     if (factsOf(to, present)) {
-        if (!overwrite || present.isDirectory()) { return failWith(ERROR_ALREADY_EXISTS); }
-        if (!removeFileEntry(to)) { return false; }
+        if (!overwrite || present.isDirectory()) return failWith(ERROR_ALREADY_EXISTS);
+        if (!removeFileEntry(to)) return false;
     }
     return CreateDirectoryExW(from.c_str(), to.c_str(), nullptr) != 0;
 }
@@ -131,9 +131,9 @@ public:
                 here = makeDirectory() && copyEntries();
                 continue;
             }
-            if (isNew_.back()) { keepFacts(); }
+            if (isNew_.back()) keepFacts();
             isNew_.pop_back();
-            if (!descent_.leave()) { return true; }
+            if (!descent_.leave()) return true;
         }
         return false;
     }
@@ -143,17 +143,17 @@ private:
 
     bool makeDirectory() {
         bool const made = CreateDirectoryW(target().c_str(), nullptr) != 0;
-        if (!made && (rules_.unseen || GetLastError() != ERROR_ALREADY_EXISTS)) { return false; }
+        if (!made && (rules_.unseen || GetLastError() != ERROR_ALREADY_EXISTS)) return false;
         isNew_.push_back(made);
         return true;
     }
 
     bool copyEntries() {
         Search search;
-        if (!search.open(descent_.path())) { return false; }
+        if (!search.open(descent_.path())) return false;
         while (search.next()) {
             if (!search.isDirectory()) {
-                if (!copyEntry(search)) { return false; }
+                if (!copyEntry(search)) return false;
             } else if (rules_.recursive) {
                 descent_.add(search.name());
             }
@@ -167,11 +167,11 @@ private:
         if ((search.entry().dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0) {
             return copyDirectoryLink(from, to, rules_.overwrite);
         }
-        if (rules_.unseen) { return copyToNewFile(from, to); }
+        if (rules_.unseen) return copyToNewFile(from, to);
         EntryFacts present{};
         if (factsOf(to, present)) {
-            if (!rules_.overwrite) { return failWith(ERROR_FILE_EXISTS); }
-            if (present.isDirectory()) { return failWith(ERROR_ACCESS_DENIED); }
+            if (!rules_.overwrite) return failWith(ERROR_FILE_EXISTS);
+            if (present.isDirectory()) return failWith(ERROR_ACCESS_DENIED);
         }
         return copyFileEntry(from, to, rules_.overwrite);
     }
@@ -201,9 +201,9 @@ bool physicalPath(std::wstring const& directory, std::wstring& physical) {
     Handle const entry{CreateFileW(directory.c_str(), FILE_READ_ATTRIBUTES,
                                    FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_EXISTING,
                                    FILE_FLAG_BACKUP_SEMANTICS, nullptr)};
-    if (!entry) { return false; }
+    if (!entry) return false;
     DWORD const size = GetFinalPathNameByHandleW(entry.get(), nullptr, 0, FILE_NAME_NORMALIZED);
-    if (size == 0) { return false; }
+    if (size == 0) return false;
     physical.resize(size);
     physical.resize(GetFinalPathNameByHandleW(entry.get(), physical.data(), size, FILE_NAME_NORMALIZED));
     return !physical.empty();
@@ -212,13 +212,13 @@ bool physicalPath(std::wstring const& directory, std::wstring& physical) {
 /// False, with the last error set, for a directory that is `other` or lies below it.
 bool isOutside(std::wstring const& directory, EntryFacts const& other) {
     std::wstring path;
-    if (!physicalPath(directory, path)) { return false; }
+    if (!physicalPath(directory, path)) return false;
     for (;;) {
         EntryFacts facts{};
-        if (factsOf(path, facts) && facts.isSame(other)) { return failWith(ERROR_INVALID_PARAMETER); }
-        if (isRoot(path)) { return true; }
+        if (factsOf(path, facts) && facts.isSame(other)) return failWith(ERROR_INVALID_PARAMETER);
+        if (isRoot(path)) return true;
         path.resize(nameOffset(path) - 1);
-        if (path.back() == L':') { path += L'\\'; }
+        if (path.back() == L':') path += L'\\';
     }
 }
 
@@ -230,9 +230,9 @@ std::wstring parentOf(std::wstring const& full) {
 
 bool copyToNewDirectory(std::wstring const& from, std::wstring const& to, CopyRules rules) {
     std::wstring const temporary = temporaryBeside(to);
-    if (CreateDirectoryW(temporary.c_str(), nullptr) == 0) { return false; }
+    if (CreateDirectoryW(temporary.c_str(), nullptr) == 0) return false;
     rules.unseen = true;
-    if (copyTree(from, temporary, rules) && renameEntry(temporary, to, false)) { return true; }
+    if (copyTree(from, temporary, rules) && renameEntry(temporary, to, false)) return true;
     KeepLastError const keep;
     removeTree(temporary);
     return false;
@@ -248,9 +248,9 @@ bool createDirectory(char const* path) {
 bool removeDirectory(char const* path, bool recursive) {
     std::wstring full;
     EntryFacts facts{};
-    if (!entryPath(path, full) || !factsOf(full, facts)) { return false; }
-    if (facts.link) { return removeFileEntry(full); }
-    if (!facts.isDirectory()) { return failWith(ERROR_DIRECTORY); }
+    if (!entryPath(path, full) || !factsOf(full, facts)) return false;
+    if (facts.link) return removeFileEntry(full);
+    if (!facts.isDirectory()) return failWith(ERROR_DIRECTORY);
     return recursive ? removeTree(full) : removeEmptyDirectory(full);
 }
 
@@ -260,16 +260,16 @@ bool copyDirectory(char const* dst, char const* src, bool overwrite, bool recurs
     std::wstring to;
     EntryFacts source{};
     EntryFacts present{};
-    if (!fullPath(src, from) || !fullPath(dst, to) || !factsOf(from, source)) { return false; }
+    if (!fullPath(src, from) || !fullPath(dst, to) || !factsOf(from, source)) return false;
     bool const isDirectory = (source.information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
-    if (!isDirectory && !source.link) { return failWith(ERROR_DIRECTORY); }
+    if (!isDirectory && !source.link) return failWith(ERROR_DIRECTORY);
     if (source.link) {
         return isDirectory ? copyDirectoryLink(from, to, overwrite) : copyFileEntry(from, to, overwrite);
     }
     if (!factsOf(to, present)) {
         return isMissing() && isOutside(parentOf(to), source) && copyToNewDirectory(from, to, rules);
     }
-    if ((present.information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) == 0) { return failWith(ERROR_DIRECTORY); }
+    if ((present.information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) == 0) return failWith(ERROR_DIRECTORY);
     return isOutside(to, source) && copyTree(from, to, rules);
 }
 
@@ -278,21 +278,21 @@ bool moveDirectory(char const* dst, char const* src, bool overwrite) {
     std::wstring to;
     EntryFacts source{};
     EntryFacts present{};
-    if (!entryPath(src, from) || !fullPath(dst, to) || !factsOf(from, source)) { return false; }
-    if (!source.isDirectory() && !source.link) { return failWith(ERROR_DIRECTORY); }
-    if (!factsOf(to, present)) { return isMissing() && renameEntry(from, to, false); }
-    if (!overwrite) { return failWith(ERROR_ALREADY_EXISTS); }
-    if (!present.isDirectory()) { return failWith(ERROR_DIRECTORY); }
-    if (source.isSame(present)) { return true; }
+    if (!entryPath(src, from) || !fullPath(dst, to) || !factsOf(from, source)) return false;
+    if (!source.isDirectory() && !source.link) return failWith(ERROR_DIRECTORY);
+    if (!factsOf(to, present)) return isMissing() && renameEntry(from, to, false);
+    if (!overwrite) return failWith(ERROR_ALREADY_EXISTS);
+    if (!present.isDirectory()) return failWith(ERROR_DIRECTORY);
+    if (source.isSame(present)) return true;
     // What lies in the target would go with it.
-    if (!isOutside(parentOf(from), present)) { return false; }
+    if (!isOutside(parentOf(from), present)) return false;
     // Put aside, the target can come back when the move fails after all.
     std::wstring const aside = temporaryBeside(to);
-    if (!renameEntry(to, aside, false)) { return false; }
+    if (!renameEntry(to, aside, false)) return false;
     bool const moved = renameEntry(from, to, false);
-    if (moved && removeTree(aside)) { return true; }
+    if (moved && removeTree(aside)) return true;
     KeepLastError const keep;
-    if (moved) { renameEntry(to, from, false); }
+    if (moved) renameEntry(to, from, false);
     renameEntry(aside, to, false);
     return false;
 }

@@ -40,8 +40,8 @@ template <class Make>
 std::string makeTemporary(Make make) {
     for (int attempt = 0; attempt < 16; ++attempt) {
         std::string name = temporaryName();
-        if (make(name.c_str())) { return name; }
-        if (errno != EEXIST) { break; }
+        if (make(name.c_str())) return name;
+        if (errno != EEXIST) break;
     }
     return {};
 }

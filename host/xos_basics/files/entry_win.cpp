@@ -1,4 +1,4 @@
-// Sibling: entry_posix.cpp.
+// The sibling is entry_posix.cpp.
 
 #include "host/xos_basics/files/entry_win.h"
 
@@ -15,9 +15,9 @@ namespace {
 constexpr std::size_t LONG_PATH = 200;
 
 bool widened(char const* path, std::wstring& wide) {
-    if (*path == '\0') { return failWith(ERROR_PATH_NOT_FOUND); }
+    if (*path == '\0') return failWith(ERROR_PATH_NOT_FOUND);
     int const size = MultiByteToWideChar(CP_ACP, MB_ERR_INVALID_CHARS, path, -1, nullptr, 0);
-    if (size == 0) { return false; }
+    if (size == 0) return false;
     wide.resize(static_cast<std::size_t>(size));
     MultiByteToWideChar(CP_ACP, MB_ERR_INVALID_CHARS, path, -1, wide.data(), size);
     wide.pop_back();
@@ -30,15 +30,15 @@ bool hasPrefix(std::wstring const& path) {
 }
 
 bool makeFull(std::wstring& path) {
-    if (hasPrefix(path)) { return true; }
+    if (hasPrefix(path)) return true;
     std::wstring full;
     for (DWORD size = GetFullPathNameW(path.c_str(), 0, nullptr, nullptr);;) {
-        if (size == 0) { return false; }
+        if (size == 0) return false;
         full.resize(size);
         DWORD const length = GetFullPathNameW(path.c_str(), size, full.data(), nullptr);
         if (length < size) {
             full.resize(length);
-            if (length == 0) { return false; }
+            if (length == 0) return false;
             break;
         }
         size = length;
@@ -51,7 +51,7 @@ bool makeFull(std::wstring& path) {
 /// Where the last two letters are a drive, the slash behind them belongs to it.
 void cutEnd(std::wstring& path) {
     cutEndSlashes(path);
-    if (path.back() == L':') { path += L'\\'; }
+    if (path.back() == L':') path += L'\\';
 }
 
 } // namespace
@@ -61,14 +61,14 @@ bool systemPath(char const* path, std::wstring& wide) {
 }
 
 bool fullPath(char const* path, std::wstring& wide) {
-    if (!widened(path, wide) || !makeFull(wide)) { return false; }
+    if (!widened(path, wide) || !makeFull(wide)) return false;
     cutEnd(wide);
     return true;
 }
 
 bool isRoot(std::wstring const& full) {
-    if (full.back() == L'\\') { return true; }
-    if (full.compare(0, 8, L"\\\\?\\UNC\\") != 0) { return false; }
+    if (full.back() == L'\\') return true;
+    if (full.compare(0, 8, L"\\\\?\\UNC\\") != 0) return false;
     std::size_t const share = full.find(L'\\', 8);
     return share == std::wstring::npos || full.find(L'\\', share + 1) == std::wstring::npos;
 }
@@ -80,8 +80,8 @@ std::size_t nameOffset(std::wstring const& path) {
 
 bool Search::open(std::wstring const& directory) {
     DWORD const attributes = GetFileAttributesW(directory.c_str());
-    if (attributes == INVALID_FILE_ATTRIBUTES) { return false; }
-    if ((attributes & FILE_ATTRIBUTE_DIRECTORY) == 0) { return failWith(ERROR_DIRECTORY); }
+    if (attributes == INVALID_FILE_ATTRIBUTES) return false;
+    if ((attributes & FILE_ATTRIBUTE_DIRECTORY) == 0) return failWith(ERROR_DIRECTORY);
     search_ = FindFirstFileExW(joined(directory, L"*").c_str(), FindExInfoStandard, &data_, FindExSearchNameMatch,
                                nullptr, FIND_FIRST_EX_LARGE_FETCH);
     unread_ = search_ != INVALID_HANDLE_VALUE;
@@ -91,10 +91,10 @@ bool Search::open(std::wstring const& directory) {
 
 bool Search::next() {
     for (;;) {
-        if (search_ == INVALID_HANDLE_VALUE) { return failWith(ERROR_NO_MORE_FILES); }
-        if (!unread_ && FindNextFileW(search_, &data_) == 0) { return false; }
+        if (search_ == INVALID_HANDLE_VALUE) return failWith(ERROR_NO_MORE_FILES);
+        if (!unread_ && FindNextFileW(search_, &data_) == 0) return false;
         unread_ = false;
-        if (!isDots(name())) { return true; }
+        if (!isDots(name())) return true;
     }
 }
 
@@ -102,7 +102,7 @@ bool Search::next() {
 
 bool factsOf(HANDLE entry, EntryFacts& facts) {
     facts = {};
-    if (GetFileInformationByHandle(entry, &facts.information) == 0) { return false; }
+    if (GetFileInformationByHandle(entry, &facts.information) == 0) return false;
     FILE_ATTRIBUTE_TAG_INFO tag{};
     facts.link = (facts.information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 &&
                  GetFileInformationByHandleEx(entry, FileAttributeTagInfo, &tag, sizeof tag) != 0 &&
@@ -137,14 +137,14 @@ namespace {
 /// Runs a step again without the entry's write protection, which comes back when the step fails all the same.
 template <class Step>
 bool despiteProtection(std::wstring const& path, Step step) {
-    if (step()) { return true; }
-    if (GetLastError() != ERROR_ACCESS_DENIED) { return false; }
+    if (step()) return true;
+    if (GetLastError() != ERROR_ACCESS_DENIED) return false;
     DWORD const attributes = GetFileAttributesW(path.c_str());
     if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY) == 0) {
         return failWith(ERROR_ACCESS_DENIED);
     }
     SetFileAttributesW(path.c_str(), attributes & ~static_cast<DWORD>(FILE_ATTRIBUTE_READONLY));
-    if (step()) { return true; }
+    if (step()) return true;
     KeepLastError const keep;
     SetFileAttributesW(path.c_str(), attributes);
     return false;
@@ -159,7 +159,7 @@ bool isDirectoryLink(std::wstring const& path) {
 } // namespace
 
 bool removeFileEntry(std::wstring const& path) {
-    if (isDirectoryLink(path)) { return removeEmptyDirectory(path); }
+    if (isDirectoryLink(path)) return removeEmptyDirectory(path);
     return despiteProtection(path, [&] { return DeleteFileW(path.c_str()) != 0; });
 }
 
@@ -168,7 +168,7 @@ bool removeEmptyDirectory(std::wstring const& path) {
 }
 
 bool renameEntry(std::wstring const& from, std::wstring const& to, bool overwrite) {
-    if (!overwrite) { return MoveFileExW(from.c_str(), to.c_str(), 0) != 0; }
+    if (!overwrite) return MoveFileExW(from.c_str(), to.c_str(), 0) != 0;
     return despiteProtection(to, [&] { return MoveFileExW(from.c_str(), to.c_str(), MOVEFILE_REPLACE_EXISTING) != 0; });
 }
 
@@ -185,13 +185,13 @@ bool setModified(std::wstring const& path, FILETIME const& modified) {
 
 bool copyToNewFile(std::wstring const& from, std::wstring const& to) {
     WIN32_FILE_ATTRIBUTE_DATA source{};
-    if (GetFileAttributesExW(from.c_str(), GetFileExInfoStandard, &source) == 0) { return false; }
+    if (GetFileAttributesExW(from.c_str(), GetFileExInfoStandard, &source) == 0) return false;
     if (CopyFileExW(from.c_str(), to.c_str(), nullptr, nullptr, nullptr, COPY_FILE_FAIL_IF_EXISTS) == 0) {
         DWORD const error = GetLastError();
-        if (error != ERROR_FILE_EXISTS && error != ERROR_ALREADY_EXISTS) { removeFileEntry(to); }
+        if (error != ERROR_FILE_EXISTS && error != ERROR_ALREADY_EXISTS) removeFileEntry(to);
         return failWith(error);
     }
-    if (setModified(to, source.ftLastWriteTime)) { return true; }
+    if (setModified(to, source.ftLastWriteTime)) return true;
     KeepLastError const keep;
     removeFileEntry(to);
     return false;
@@ -199,8 +199,8 @@ bool copyToNewFile(std::wstring const& from, std::wstring const& to) {
 
 bool copyFileEntry(std::wstring const& from, std::wstring const& to, bool overwrite) {
     std::wstring const temporary = temporaryBeside(to);
-    if (!copyToNewFile(from, temporary)) { return false; }
-    if (renameEntry(temporary, to, overwrite)) { return true; }
+    if (!copyToNewFile(from, temporary)) return false;
+    if (renameEntry(temporary, to, overwrite)) return true;
     KeepLastError const keep;
     removeFileEntry(temporary);
     return false;

@@ -56,15 +56,15 @@ bool OpenFile::fill() {
 
 std::size_t OpenFile::take(char* to, std::size_t size) {
     std::size_t const count = std::min(size, unread());
-    if (count != 0) { std::memcpy(to, buffer_.get() + next_, count); }
+    if (count != 0) std::memcpy(to, buffer_.get() + next_, count);
     next_ += count;
     return count;
 }
 
 std::size_t OpenFile::read(char* to, std::size_t size) {
-    if (text_) { return readText(to, size); }
+    if (text_) return readText(to, size);
     std::size_t done = take(to, size);
-    if (size - done >= DIRECT_READ) { return done + file_.read(to + done, size - done); }
+    if (size - done >= DIRECT_READ) return done + file_.read(to + done, size - done);
     while (done < size && fill()) { done += take(to + done, size - done); }
     return done;
 }
@@ -75,24 +75,24 @@ std::size_t OpenFile::write(char const* from, std::size_t size) {
 }
 
 void OpenFile::forgetUnread() {
-    if (unread() == 0) { return; }
+    if (unread() == 0) return;
     // A pipe has no position to put back: what was read ahead of it stays to be read.
-    if (file_.seek(-static_cast<std::int64_t>(unread()), 1) >= 0) { next_ = end_ = 0; }
+    if (file_.seek(-static_cast<std::int64_t>(unread()), 1) >= 0) next_ = end_ = 0;
 }
 
 bool OpenFile::gets(char* to, std::size_t size) {
-    if (size == 0) { return false; }
+    if (size == 0) return false;
     std::size_t done = 0;
     bool ended = false;
     while (!ended && done + 1 < size) {
         if (text_) {
             int const character = nextOfText();
-            if (character < 0) { break; }
+            if (character < 0) break;
             to[done++] = static_cast<char>(character);
             ended = character == '\n';
             continue;
         }
-        if (unread() == 0 && !fill()) { break; }
+        if (unread() == 0 && !fill()) break;
         std::size_t const most = std::min(size - 1 - done, unread());
         char const* const from = buffer_.get() + next_;
         auto const* const lineEnd = static_cast<char const*>(std::memchr(from, '\n', most));
@@ -110,7 +110,7 @@ bool OpenFile::seek(std::int64_t offset, int origin) {
         setLastError(Error::badArgument);
         return false;
     }
-    if (file_.seek(relative ? offset - ahead : offset, origin) < 0) { return false; }
+    if (file_.seek(relative ? offset - ahead : offset, origin) < 0) return false;
     next_ = end_ = 0;
     return true;
 }
@@ -121,7 +121,7 @@ std::int64_t OpenFile::tell() {
 }
 
 int OpenFile::nextOfText() {
-    if (unread() == 0 && !fill()) { return -1; }
+    if (unread() == 0 && !fill()) return -1;
     char const character = buffer_[next_++];
     if (character == '\r' && (unread() != 0 || fill()) && buffer_[next_] == '\n') {
         ++next_;
@@ -145,9 +145,9 @@ std::size_t OpenFile::writeText(char const* from, std::size_t size) {
         std::size_t const line = lineEnd != nullptr ? static_cast<std::size_t>(lineEnd - from) - done : size - done;
         std::size_t const put = file_.write(from + done, line);
         done += put;
-        if (put < line) { break; }
-        if (lineEnd == nullptr) { continue; }
-        if (file_.write("\r\n", 2) < 2) { break; }
+        if (put < line) break;
+        if (lineEnd == nullptr) continue;
+        if (file_.write("\r\n", 2) < 2) break;
         ++done;
     }
     return done;

@@ -1,4 +1,4 @@
-// Sibling: raw_file_win.cpp.
+// The sibling is raw_file_win.cpp.
 
 #include "host/xos_basics/files/raw_file.h"
 
@@ -22,9 +22,9 @@ constexpr std::size_t LARGEST_TRANSFER = 0x7FFFF000;
 int openFlags(OpenMode mode) {
     int flags = O_CLOEXEC | O_NOCTTY;
     flags |= !mode.write ? O_RDONLY : mode.read ? O_RDWR : O_WRONLY;
-    if (mode.create) { flags |= O_CREAT; }
-    if (mode.truncate) { flags |= O_TRUNC; }
-    if (mode.append) { flags |= O_APPEND; }
+    if (mode.create) flags |= O_CREAT;
+    if (mode.truncate) flags |= O_TRUNC;
+    if (mode.append) flags |= O_APPEND;
     return flags;
 }
 
@@ -39,8 +39,8 @@ int openInterrupted(char const* path, int flags) {
 bool RawFile::open(char const* path, OpenMode mode) {
     Descriptor file{openInterrupted(systemPath(path).c_str(), openFlags(mode))};
     struct stat status {};
-    if (!file || ::fstat(file.get(), &status) != 0) { return false; }
-    if (S_ISDIR(status.st_mode)) { return failWith(EISDIR); }
+    if (!file || ::fstat(file.get(), &status) != 0) return false;
+    if (S_ISDIR(status.st_mode)) return failWith(EISDIR);
     native_ = file.release();
     append_ = mode.append;
     write_ = mode.write;
@@ -61,7 +61,7 @@ std::size_t RawFile::read(char* to, std::size_t size) {
     std::size_t done = 0;
     while (done < size) {
         std::ptrdiff_t const got = readSome(to + done, size - done);
-        if (got <= 0) { break; }
+        if (got <= 0) break;
         done += static_cast<std::size_t>(got);
     }
     return done;
@@ -71,15 +71,15 @@ std::size_t RawFile::write(char const* from, std::size_t size) {
     std::size_t done = 0;
     while (done < size) {
         ssize_t const put = ::write(static_cast<int>(native_), from + done, std::min(size - done, LARGEST_TRANSFER));
-        if (put < 0 && errno == EINTR) { continue; }
-        if (put <= 0) { break; }
+        if (put < 0 && errno == EINTR) continue;
+        if (put <= 0) break;
         done += static_cast<std::size_t>(put);
     }
     return done;
 }
 
 bool RawFile::flush() {
-    if (!write_ || ::fdatasync(static_cast<int>(native_)) == 0) { return true; }
+    if (!write_ || ::fdatasync(static_cast<int>(native_)) == 0) return true;
     // Pipes, terminals and their like hold nothing back.
     return errno == EINVAL || errno == EROFS || errno == ENOTSUP;
 }

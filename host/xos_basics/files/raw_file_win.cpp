@@ -1,4 +1,4 @@
-// Sibling: raw_file_posix.cpp.
+// The sibling is raw_file_posix.cpp.
 
 #include "host/xos_basics/files/raw_file.h"
 
@@ -22,12 +22,12 @@ DWORD pieceOf(std::size_t size) { return static_cast<DWORD>(std::min(size, LARGE
 
 bool RawFile::open(char const* path, OpenMode mode) {
     std::wstring wide;
-    if (!systemPath(path, wide)) { return false; }
+    if (!systemPath(path, wide)) return false;
     DWORD const access = (mode.read ? GENERIC_READ : 0) | (mode.write ? GENERIC_WRITE : 0);
     Handle file{CreateFileW(wide.c_str(), access, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr,
                             mode.create ? OPEN_ALWAYS : OPEN_EXISTING, FILE_ATTRIBUTE_NORMAL, nullptr)};
-    if (!file) { return false; }
-    if (mode.truncate && GetFileType(file.get()) == FILE_TYPE_DISK && SetEndOfFile(file.get()) == 0) { return false; }
+    if (!file) return false;
+    if (mode.truncate && GetFileType(file.get()) == FILE_TYPE_DISK && SetEndOfFile(file.get()) == 0) return false;
     native_ = reinterpret_cast<std::intptr_t>(file.release());
     append_ = mode.append;
     write_ = mode.write;
@@ -38,7 +38,7 @@ bool RawFile::close() { return CloseHandle(handleOf(std::exchange(native_, -1)))
 
 std::ptrdiff_t RawFile::readSome(char* to, std::size_t size) {
     DWORD got = 0;
-    if (ReadFile(handleOf(native_), to, pieceOf(size), &got, nullptr) != 0) { return static_cast<std::ptrdiff_t>(got); }
+    if (ReadFile(handleOf(native_), to, pieceOf(size), &got, nullptr) != 0) return static_cast<std::ptrdiff_t>(got);
     // A pipe whose writer has gone has come to its end.
     return GetLastError() == ERROR_BROKEN_PIPE ? 0 : -1;
 }
@@ -47,7 +47,7 @@ std::size_t RawFile::read(char* to, std::size_t size) {
     std::size_t done = 0;
     while (done < size) {
         std::ptrdiff_t const got = readSome(to + done, size - done);
-        if (got <= 0) { break; }
+        if (got <= 0) break;
         done += static_cast<std::size_t>(got);
     }
     return done;
@@ -62,7 +62,7 @@ std::size_t RawFile::write(char const* from, std::size_t size) {
         if (WriteFile(handleOf(native_), from + done, pieceOf(size - done), &put, append_ ? &end : nullptr) == 0) {
             break;
         }
-        if (put == 0) { break; }
+        if (put == 0) break;
         done += put;
     }
     return done;

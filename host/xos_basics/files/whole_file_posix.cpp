@@ -1,4 +1,4 @@
-// Sibling: whole_file_win.cpp.
+// The sibling is whole_file_win.cpp.
 
 #include "host/xos_basics/files/whole_file.h"
 
@@ -41,15 +41,15 @@ bool removeFile(char const* path) { return ::unlink(systemPath(path).c_str()) ==
 bool copyFile(char const* dst, char const* src, bool overwrite) {
     struct stat source {};
     Descriptor const from = openSource(AT_FDCWD, systemPath(src).c_str(), 0, source);
-    if (!from) { return false; }
+    if (!from) return false;
     Place to;
-    if (endsInSlash(systemPath(dst))) { return failWith(EISDIR); }
-    if (!findPlace(dst, to)) { return false; }
+    if (endsInSlash(systemPath(dst))) return failWith(EISDIR);
+    if (!findPlace(dst, to)) return false;
     struct stat present {};
     if (::fstatat(to.at(), to.name.c_str(), &present, AT_SYMLINK_NOFOLLOW) == 0) {
-        if (!overwrite) { return failWith(EEXIST); }
-        if (!isReplaceable(present)) { return false; }
-        if (sameEntry(source, present)) { return failWith(EINVAL); }
+        if (!overwrite) return failWith(EEXIST);
+        if (!isReplaceable(present)) return false;
+        if (sameEntry(source, present)) return failWith(EINVAL);
     } else if (errno != ENOENT) {
         return false;
     }
@@ -60,12 +60,12 @@ bool moveFile(char const* dst, char const* src, bool overwrite) {
     std::string const from = systemPath(src);
     std::string const to = systemPath(dst);
     struct stat source {};
-    if (::lstat(from.c_str(), &source) != 0) { return false; }
-    if (S_ISDIR(source.st_mode)) { return failWith(EISDIR); }
-    if (renameToNew(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str())) { return true; }
-    if (errno != EEXIST || !overwrite) { return false; }
+    if (::lstat(from.c_str(), &source) != 0) return false;
+    if (S_ISDIR(source.st_mode)) return failWith(EISDIR);
+    if (renameToNew(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str())) return true;
+    if (errno != EEXIST || !overwrite) return false;
     struct stat present {};
-    if (::lstat(to.c_str(), &present) != 0 || !isReplaceable(present)) { return false; }
+    if (::lstat(to.c_str(), &present) != 0 || !isReplaceable(present)) return false;
     if (sameEntry(source, present)) {
         // Renaming one name of a file onto another leaves both.
         return isOneName(dst, src) || ::unlink(from.c_str()) == 0;
@@ -79,7 +79,7 @@ bool linkFile(char const* src, char const* dst) {
 
 bool statusOf(char const* path, xos_Stat& record) {
     struct stat status {};
-    if (::lstat(entryPath(path).c_str(), &status) != 0) { return false; }
+    if (::lstat(entryPath(path).c_str(), &status) != 0) return false;
     record = {};
     record.st_dev_ = static_cast<std::uint32_t>(status.st_dev);
     record.st_ino_ = static_cast<std::uint16_t>(status.st_ino);

@@ -1,4 +1,4 @@
-// Sibling: whole_file_posix.cpp.
+// The sibling is whole_file_posix.cpp.
 
 #include "host/xos_basics/files/whole_file.h"
 
@@ -17,7 +17,7 @@ bool isReplaceable(EntryFacts const& present) { return !present.isDirectory() ||
 
 bool isProgram(std::wstring const& path) {
     static constexpr wchar_t const* ENDINGS[] = {L".exe", L".com", L".bat", L".cmd"};
-    if (path.size() < 4) { return false; }
+    if (path.size() < 4) return false;
     wchar_t const* const ending = path.c_str() + path.size() - 4;
     return std::any_of(std::begin(ENDINGS), std::end(ENDINGS), [&](wchar_t const* known) {
         return CompareStringOrdinal(ending, 4, known, 4, TRUE) == CSTR_EQUAL;
@@ -50,12 +50,12 @@ bool copyFile(char const* dst, char const* src, bool overwrite) {
     std::wstring to;
     EntryFacts source{};
     EntryFacts present{};
-    if (!systemPath(src, from) || !systemPath(dst, to) || !factsOf(from, source)) { return false; }
-    if (source.isDirectory() || nameOffset(to) == to.size()) { return failWith(ERROR_ACCESS_DENIED); }
+    if (!systemPath(src, from) || !systemPath(dst, to) || !factsOf(from, source)) return false;
+    if (source.isDirectory() || nameOffset(to) == to.size()) return failWith(ERROR_ACCESS_DENIED);
     if (factsOf(to, present)) {
-        if (!overwrite) { return failWith(ERROR_FILE_EXISTS); }
-        if (!isReplaceable(present)) { return false; }
-        if (source.isSame(present)) { return failWith(ERROR_SHARING_VIOLATION); }
+        if (!overwrite) return failWith(ERROR_FILE_EXISTS);
+        if (!isReplaceable(present)) return false;
+        if (source.isSame(present)) return failWith(ERROR_SHARING_VIOLATION);
     } else if (!isMissing()) {
         return false;
     }
@@ -67,9 +67,9 @@ bool moveFile(char const* dst, char const* src, bool overwrite) {
     std::wstring to;
     EntryFacts source{};
     EntryFacts present{};
-    if (!systemPath(src, from) || !systemPath(dst, to) || !factsOf(from, source)) { return false; }
-    if (source.isDirectory()) { return failWith(ERROR_ACCESS_DENIED); }
-    if (!overwrite) { return !factsOf(to, present) ? renameEntry(from, to, false) : failWith(ERROR_ALREADY_EXISTS); }
+    if (!systemPath(src, from) || !systemPath(dst, to) || !factsOf(from, source)) return false;
+    if (source.isDirectory()) return failWith(ERROR_ACCESS_DENIED);
+    if (!overwrite) return !factsOf(to, present) ? renameEntry(from, to, false) : failWith(ERROR_ALREADY_EXISTS);
     return (!factsOf(to, present) || isReplaceable(present)) && renameEntry(from, to, true);
 }
 
@@ -82,7 +82,7 @@ bool linkFile(char const* src, char const* dst) {
 bool statusOf(char const* path, xos_Stat& record) {
     std::wstring full;
     EntryFacts facts{};
-    if (!fullPath(path, full) || !factsOf(full, facts)) { return false; }
+    if (!fullPath(path, full) || !factsOf(full, facts)) return false;
     BY_HANDLE_FILE_INFORMATION const& information = facts.information;
     record = {};
     record.st_dev_ = record.st_rdev_ = information.dwVolumeSerialNumber;

@@ -71,7 +71,7 @@ std::size_t nameOffset(std::wstring const& path);
 /// Joins a directory's path and a name.
 inline std::wstring joined(std::wstring const& directory, wchar_t const* name) {
     std::wstring path = directory;
-    if (!path.empty() && path.back() != L'\\') { path += L'\\'; }
+    if (!path.empty() && path.back() != L'\\') path += L'\\';
     return path += name;
 }
 

@@ -1,4 +1,4 @@
-// Sibling: named_mutex_win.cpp.
+// The sibling is named_mutex_win.cpp.
 
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/semaphores/named_mutex.h"
@@ -19,67 +19,67 @@ namespace host {
 /// system gives a file lock back when its process ends, however it ends, and says so of a thread through the mutex.
 class NamedMutex {
 public:
-    explicit NamedMutex(int file) : _file(file) {
+    explicit NamedMutex(int file) : file_(file) {
         pthread_mutexattr_t attributes;
         pthread_mutexattr_init(&attributes);
         pthread_mutexattr_settype(&attributes, PTHREAD_MUTEX_RECURSIVE);
         pthread_mutexattr_setrobust(&attributes, PTHREAD_MUTEX_ROBUST);
-        pthread_mutex_init(&_threads, &attributes);
+        pthread_mutex_init(&threads_, &attributes);
         pthread_mutexattr_destroy(&attributes);
     }
     NamedMutex(NamedMutex const&) = delete;
     NamedMutex& operator=(NamedMutex const&) = delete;
 
     int take() {
-        int error = pthread_mutex_lock(&_threads);
+        int error = pthread_mutex_lock(&threads_);
         if (error == EOWNERDEAD) {
-            pthread_mutex_consistent(&_threads);
-            _depth = 0;
+            pthread_mutex_consistent(&threads_);
+            depth_ = 0;
         } else if (error != 0) {
             return error;
         }
-        error = _depth == 0 ? lockFile() : 0;
+        error = depth_ == 0 ? lockFile() : 0;
         if (error != 0) {
-            pthread_mutex_unlock(&_threads);
+            pthread_mutex_unlock(&threads_);
             return error;
         }
-        ++_depth;
+        ++depth_;
         return 0;
     }
 
     int give() {
-        if (!isMine()) { return EPERM; }
-        if (--_depth == 0) { flock(_file, LOCK_UN); }
-        return pthread_mutex_unlock(&_threads);
+        if (!isMine()) return EPERM;
+        if (--depth_ == 0) flock(file_, LOCK_UN);
+        return pthread_mutex_unlock(&threads_);
     }
 
 private:
     int lockFile() const {
-        while (flock(_file, LOCK_EX) != 0) {
-            if (errno != EINTR) { return errno; }
+        while (flock(file_, LOCK_EX) != 0) {
+            if (errno != EINTR) return errno;
         }
         return 0;
     }
 
-    /// Tries the mutex once more: only its owner gets a second turn while `_depth` is above 0.
+    /// Tries the mutex once more: only its owner gets a second turn while `depth_` is above 0.
     bool isMine() {
-        int const error = pthread_mutex_trylock(&_threads);
+        int const error = pthread_mutex_trylock(&threads_);
         if (error == EOWNERDEAD) {
-            pthread_mutex_consistent(&_threads);
-            _depth = 0;
-            flock(_file, LOCK_UN);
+            pthread_mutex_consistent(&threads_);
+            depth_ = 0;
+            flock(file_, LOCK_UN);
         } else if (error != 0) {
             return false;
         }
-        bool const held = _depth != 0;
-        pthread_mutex_unlock(&_threads);
+        bool const held = depth_ != 0;
+        pthread_mutex_unlock(&threads_);
         return held;
     }
 
-    pthread_mutex_t _threads{};
-    int _file;
+    pthread_mutex_t threads_{};
+    int file_;
     /// How often the owner has taken it; the owner's alone.
-    int _depth{0};
+    int depth_{0};
 };
 
 namespace {
@@ -99,7 +99,7 @@ std::string runDirectory() {
     std::string const name = "/xos-" + std::to_string(geteuid());
     for (char const* parent : PARENTS) {
         std::string path = parent + name;
-        if ((mkdir(path.c_str(), 0700) == 0 || errno == EEXIST) && isPrivateFolder(path.c_str())) { return path; }
+        if ((mkdir(path.c_str(), 0700) == 0 || errno == EEXIST) && isPrivateFolder(path.c_str())) return path;
     }
     return {};
 }
@@ -108,10 +108,10 @@ std::string runDirectory() {
 
 NamedMutex* openNamed(int id) {
     std::string const folder = runDirectory();
-    if (folder.empty()) { return nullptr; }
+    if (folder.empty()) return nullptr;
     std::string const path = folder + "/mutex-" + std::to_string(id);
     int const file = open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
-    if (file < 0) { return nullptr; }
+    if (file < 0) return nullptr;
     auto* const mutex = new (std::nothrow) NamedMutex(file);
     if (mutex == nullptr) {
         close(file);
@@ -122,13 +122,13 @@ NamedMutex* openNamed(int id) {
 
 int takeNamed(NamedMutex& mutex) {
     int const error = mutex.take();
-    if (error != 0) { errno = error; }
+    if (error != 0) errno = error;
     return error;
 }
 
 int giveNamed(NamedMutex& mutex) {
     int const error = mutex.give();
-    if (error != 0) { errno = error; }
+    if (error != 0) errno = error;
     return error;
 }
 

@@ -1,4 +1,4 @@
-// Sibling: named_mutex_posix.cpp.
+// The sibling is named_mutex_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/last_error.h"
@@ -12,17 +12,17 @@ namespace host {
 /// The kernel's own mutex is recursive, shared by name, and handed to the next in line when its holder dies.
 class NamedMutex {
 public:
-    explicit NamedMutex(HANDLE handle) : _handle(handle) {}
+    explicit NamedMutex(HANDLE handle) : handle_(handle) {}
 
     int take() {
-        DWORD const result = WaitForSingleObject(_handle, INFINITE);
+        DWORD const result = WaitForSingleObject(handle_, INFINITE);
         return result == WAIT_OBJECT_0 || result == WAIT_ABANDONED ? 0 : -1;
     }
 
-    int give() { return ReleaseMutex(_handle) != 0 ? 0 : -1; }
+    int give() { return ReleaseMutex(handle_) != 0 ? 0 : -1; }
 
 private:
-    HANDLE _handle;
+    HANDLE handle_;
 };
 
 namespace {
@@ -42,7 +42,7 @@ std::wstring objectName(int id) {
 
 NamedMutex* openNamed(int id) {
     HANDLE const handle = CreateMutexW(nullptr, FALSE, objectName(id).c_str());
-    if (handle == nullptr) { return nullptr; }
+    if (handle == nullptr) return nullptr;
     auto* const mutex = new (std::nothrow) NamedMutex(handle);
     if (mutex == nullptr) {
         CloseHandle(handle);

@@ -33,9 +33,9 @@ std::uint32_t indexById(int id) {
 
 bool addEntry(int id) {
     NamedMutex* const named = openNamed(id);
-    if (named == nullptr) { return false; }
+    if (named == nullptr) return false;
     Semaphore* const semaphore = makeSemaphore(SemaphoreKind::named, 0);
-    if (semaphore == nullptr) { return false; }
+    if (semaphore == nullptr) return false;
     semaphore->named = named;
     entries().push_back({id, semaphore->handle.load()});
     return true;
@@ -47,7 +47,7 @@ xos_Sem handleById(int id, std::uint32_t* word) {
     std::uint32_t index = word == nullptr ? 0 : std::atomic_ref{*word}.load() - 1;
     if (index >= entries().size() || entries()[index].id != id) {
         index = indexById(id);
-        if (index == entries().size() && !addEntry(id)) { return 0; }
+        if (index == entries().size() && !addEntry(id)) return 0;
         if (word != nullptr) { std::atomic_ref{*word}.store(index + 1); }
     }
     return entries()[index].handle;
@@ -58,6 +58,6 @@ xos_Sem handleById(int id, std::uint32_t* word) {
 } // namespace host
 
 extern "C" xos_Sem xos_SemNamedMutexCreate(int id, int flags, int reserved, uint32_t* word) {
-    if (host::failsNow(host::Function::xos_SemNamedMutexCreate, id, flags, reserved, word)) { return 0; }
+    if (host::failsNow(host::Function::xos_SemNamedMutexCreate, id, flags, reserved, word)) return 0;
     return host::handleById(id, word);
 }

@@ -32,15 +32,15 @@ void push(Semaphore*& list, Semaphore* semaphore) {
 
 Semaphore* pop(Semaphore*& list) {
     Semaphore* const first = list;
-    if (first != nullptr) { list = first->nextFree; }
+    if (first != nullptr) list = first->nextFree;
     return first;
 }
 
 /// \pre the mutex is held
 bool fillPool() {
-    if (pool != nullptr) { return true; }
+    if (pool != nullptr) return true;
     auto* const slab = new (std::nothrow) Slab();
-    if (slab == nullptr) { return false; }
+    if (slab == nullptr) return false;
     slab->older = slabs;
     slabs = slab;
     for (Semaphore& block : slab->blocks) { push(pool, &block); }
@@ -72,9 +72,9 @@ Semaphore* takeBlock() {
         std::lock_guard const lock{poolMutex};
         return fillPool() ? pop(pool) : nullptr;
     }
-    if (mine.freeSemaphores == nullptr) { refill(mine); }
+    if (mine.freeSemaphores == nullptr) refill(mine);
     Semaphore* const block = pop(mine.freeSemaphores);
-    if (block != nullptr) { --mine.freeSemaphoreCount; }
+    if (block != nullptr) --mine.freeSemaphoreCount;
     return block;
 }
 
@@ -109,7 +109,7 @@ void freeSemaphore(Semaphore* semaphore) {
         return;
     }
     push(mine.freeSemaphores, semaphore);
-    if (++mine.freeSemaphoreCount > 2 * BATCH) { giveBatchBack(mine); }
+    if (++mine.freeSemaphoreCount > 2 * BATCH) giveBatchBack(mine);
 }
 
 } // namespace host

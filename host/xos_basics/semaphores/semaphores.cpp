@@ -48,11 +48,11 @@ int takeMutex(host::Semaphore& mutex) {
 int giveMutex(host::Semaphore& mutex) {
     host::ThreadCalls& mine = host::threadCalls();
     std::uint64_t const self = mine.threadSerial;
-    if (self == 0 || mutex.owner.load(std::memory_order_relaxed) != self) { return failWith(host::Error::notOwner); }
+    if (self == 0 || mutex.owner.load(std::memory_order_relaxed) != self) return failWith(host::Error::notOwner);
     if (--mutex.depth == 0) {
         mutex.owner.store(0, std::memory_order_relaxed);
         giveState(mutex, mine);
-        if (--mine.heldMutexes == 0) { host::provideDeferredThreads(mine); }
+        if (--mine.heldMutexes == 0) host::provideDeferredThreads(mine);
     }
     return 0;
 }
@@ -61,7 +61,7 @@ int giveMutex(host::Semaphore& mutex) {
 void leaveMutex(host::Semaphore const& mutex) {
     host::ThreadCalls& mine = host::threadCalls();
     std::uint64_t const self = mine.threadSerial;
-    if (self != 0 && mutex.owner.load(std::memory_order_relaxed) == self) { --mine.heldMutexes; }
+    if (self != 0 && mutex.owner.load(std::memory_order_relaxed) == self) --mine.heldMutexes;
 }
 
 int takeBinary(host::Semaphore& semaphore) {
@@ -81,20 +81,20 @@ xos_Sem handleOf(host::Semaphore const* semaphore) { return semaphore == nullptr
 extern "C" {
 
 xos_Sem xos_SemMCreate(void) {
-    if (failsNow(Function::xos_SemMCreate)) { return 0; }
+    if (failsNow(Function::xos_SemMCreate)) return 0;
     return handleOf(host::makeSemaphore(host::SemaphoreKind::mutex, host::WORD_FREE));
 }
 
 xos_Sem xos_SemBCreate(int available) {
-    if (failsNow(Function::xos_SemBCreate, available)) { return 0; }
+    if (failsNow(Function::xos_SemBCreate, available)) return 0;
     std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
     return handleOf(host::makeSemaphore(host::SemaphoreKind::binary, state));
 }
 
 int xos_SemTake(xos_Sem sem) {
-    if (failsNow(Function::xos_SemTake, sem)) { return host::FAILED; }
+    if (failsNow(Function::xos_SemTake, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
+    if (semaphore == nullptr) return failWith(host::Error::badHandle);
     switch (semaphore->kind) {
     case host::SemaphoreKind::mutex:
         return takeMutex(*semaphore);
@@ -106,9 +106,9 @@ int xos_SemTake(xos_Sem sem) {
 }
 
 int xos_SemGive(xos_Sem sem) {
-    if (failsNow(Function::xos_SemGive, sem)) { return host::FAILED; }
+    if (failsNow(Function::xos_SemGive, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
+    if (semaphore == nullptr) return failWith(host::Error::badHandle);
     switch (semaphore->kind) {
     case host::SemaphoreKind::mutex:
         return giveMutex(*semaphore);
@@ -120,12 +120,12 @@ int xos_SemGive(xos_Sem sem) {
 }
 
 int xos_SemDestroy(xos_Sem sem) {
-    if (failsNow(Function::xos_SemDestroy, sem)) { return host::FAILED; }
+    if (failsNow(Function::xos_SemDestroy, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) { return failWith(host::Error::badHandle); }
-    if (semaphore->kind == host::SemaphoreKind::mutex) { leaveMutex(*semaphore); }
+    if (semaphore == nullptr) return failWith(host::Error::badHandle);
+    if (semaphore->kind == host::SemaphoreKind::mutex) leaveMutex(*semaphore);
     // A named mutex is the process's, not the caller's: others hold the same handle.
-    if (semaphore->kind != host::SemaphoreKind::named) { host::freeSemaphore(semaphore); }
+    if (semaphore->kind != host::SemaphoreKind::named) host::freeSemaphore(semaphore);
     return 0;
 }
 

@@ -9,12 +9,12 @@
 namespace host {
 
 char const* keptText(char const* text) {
-    if (text == nullptr || *text == '\0') { return ""; }
+    if (text == nullptr || *text == '\0') return "";
     static constinit QuickMutex mutex;
     std::lock_guard const lock{mutex};
     static auto& texts = *new std::set<std::string, std::less<>>;
     auto found = texts.find(text);
-    if (found == texts.end()) { found = texts.insert(text).first; }
+    if (found == texts.end()) found = texts.insert(text).first;
     return found->c_str();
 }
 

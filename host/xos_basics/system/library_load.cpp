@@ -5,7 +5,7 @@
 #include "basis/platform/xos_basics.h"
 
 extern "C" void* xos_LibraryLoad(char const* name) {
-    if (host::failsNow(host::Function::xos_LibraryLoad, name)) { return nullptr; }
+    if (host::failsNow(host::Function::xos_LibraryLoad, name)) return nullptr;
     if (name == nullptr || *name == '\0') {
         host::setLastError(host::Error::badArgument);
         return nullptr;

@@ -1,4 +1,4 @@
-// Sibling: library_win.cpp.
+// The sibling is library_win.cpp.
 
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/system/library.h"
@@ -13,7 +13,7 @@ void* loadLibrary(char const* name) {
     std::string path{name};
     std::replace(path.begin(), path.end(), '\\', '/');
     void* const library = dlopen(path.c_str(), RTLD_NOW);
-    if (library == nullptr) { setLastError(Error::notFound); }
+    if (library == nullptr) setLastError(Error::notFound);
     return library;
 }
 

@@ -1,4 +1,4 @@
-// Sibling: library_posix.cpp.
+// The sibling is library_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/system/library.h"

@@ -20,7 +20,7 @@ extern "C" {
 void xos_HostSetResolver(xos_HostResolver function) { resolver.store(function); }
 
 int xos_BasicsParamLookup(uint32_t id, void* out, uint64_t size) {
-    if (host::failsNow(host::Function::xos_BasicsParamLookup, id, out, size)) { return host::FAILED; }
+    if (host::failsNow(host::Function::xos_BasicsParamLookup, id, out, size)) return host::FAILED;
     xos_HostResolver const answer = resolver.load();
     if (id != FUNCTION_RESOLVER || answer == nullptr || out == nullptr || size < sizeof answer) {
         host::setLastError(host::Error::notFound);

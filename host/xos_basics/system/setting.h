@@ -14,23 +14,23 @@ namespace host {
 class Setting {
 public:
     /// \param variable  the environment variable that counts while nothing is set
-    explicit constexpr Setting(char const* variable) : _variable(variable) {}
+    explicit constexpr Setting(char const* variable) : variable_(variable) {}
 
     /// Null or empty: back to the environment.
     void set(char const* text) {
         bool const isSet = text != nullptr && *text != '\0';
-        _text.store(isSet ? keptText(text) : nullptr, std::memory_order_release);
+        text_.store(isSet ? keptText(text) : nullptr, std::memory_order_release);
     }
 
     /// The text, valid forever; empty if neither is set.
     char const* get() const {
-        char const* const text = _text.load(std::memory_order_acquire);
-        return text != nullptr ? text : keptText(std::getenv(_variable));
+        char const* const text = text_.load(std::memory_order_acquire);
+        return text != nullptr ? text : keptText(std::getenv(variable_));
     }
 
 private:
-    char const* _variable;
-    std::atomic<char const*> _text{nullptr};
+    char const* variable_;
+    std::atomic<char const*> text_{nullptr};
 };
 
 } // namespace host

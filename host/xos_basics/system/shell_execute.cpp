@@ -5,7 +5,7 @@
 #include "basis/platform/xos_basics.h"
 
 extern "C" int xos_ShellExecuteEx(char const* commandLine, int64_t* result) {
-    if (host::failsNow(host::Function::xos_ShellExecuteEx, commandLine, result)) { return host::FAILED; }
+    if (host::failsNow(host::Function::xos_ShellExecuteEx, commandLine, result)) return host::FAILED;
     if (commandLine == nullptr) {
         host::setLastError(host::Error::badArgument);
         return host::FAILED;

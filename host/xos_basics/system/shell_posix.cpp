@@ -1,4 +1,4 @@
-// Sibling: shell_win.cpp.
+// The sibling is shell_win.cpp.
 
 #include "host/xos_basics/system/shell.h"
 #include "host/xos_basics/system/shell_line.h"
@@ -26,7 +26,7 @@ std::string quoted(std::string const& text) {
 /// The directory is taken as it stands: no search path, no "-" for the last one, either slash.
 std::string changeDirectory(std::string directory) {
     std::replace(directory.begin(), directory.end(), '\\', '/');
-    if (directory.front() != '/') { directory.insert(0, "./"); }
+    if (directory.front() != '/') directory.insert(0, "./");
     return "CDPATH= cd -- " + quoted(directory) + " || exit\n";
 }
 
@@ -62,7 +62,7 @@ constexpr std::int64_t SIGNALLED = 128;
 std::int64_t waitForChild(pid_t child) {
     int status = 0;
     while (waitpid(child, &status, 0) < 0) {
-        if (errno != EINTR) { return UNKNOWN_CODE; }
+        if (errno != EINTR) return UNKNOWN_CODE;
     }
     return WIFSIGNALED(status) ? SIGNALLED + WTERMSIG(status) : WEXITSTATUS(status);
 }

@@ -1,4 +1,4 @@
-// Sibling: shell_posix.cpp.
+// The sibling is shell_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/system/shell.h"
@@ -45,12 +45,12 @@ std::int64_t waitForExit(HANDLE process) {
 bool runInShell(char const* commandLine, std::int64_t* exitCode) {
     ShellLine const line = splitShellLine(commandLine);
     if (!line.directory.empty() && !isDirectory(line.directory)) {
-        if (exitCode != nullptr) { *exitCode = DIRECTORY_FAILED; }
+        if (exitCode != nullptr) *exitCode = DIRECTORY_FAILED;
         return true;
     }
     PROCESS_INFORMATION process{};
-    if (!start(line, process)) { return false; }
-    if (exitCode != nullptr) { *exitCode = waitForExit(process.hProcess); }
+    if (!start(line, process)) return false;
+    if (exitCode != nullptr) *exitCode = waitForExit(process.hProcess);
     CloseHandle(process.hThread);
     CloseHandle(process.hProcess);
     return true;

@@ -37,8 +37,8 @@ void watchCreators(void*) {
 /// \return false: there is no thread for it
 bool startWatch() {
     static bool const exists = startThread(watchCreators, nullptr, 0);
-    if (!exists) { return false; }
-    if (watch.load(std::memory_order_relaxed) == RESTING && watch.exchange(WATCHING) == RESTING) { wakeOne(watch); }
+    if (!exists) return false;
+    if (watch.load(std::memory_order_relaxed) == RESTING && watch.exchange(WATCHING) == RESTING) wakeOne(watch);
     return true;
 }
 
@@ -46,7 +46,7 @@ bool startWatch() {
 
 bool deferThreads(ThreadProvider provider) {
     ThreadCalls& mine = threadCalls();
-    if (mine.heldMutexes == 0) { return false; }
+    if (mine.heldMutexes == 0) return false;
     threadProvider.store(provider, std::memory_order_relaxed);
     mine.hasDeferredThreads = startWatch();
     return mine.hasDeferredThreads;

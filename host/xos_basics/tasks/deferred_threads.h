@@ -22,7 +22,7 @@ void provideThreadsNow(ThreadCalls& mine);
 
 /// Provides the threads that the calling thread deferred.
 inline void provideDeferredThreads(ThreadCalls& mine) {
-    if (mine.hasDeferredThreads) { provideThreadsNow(mine); }
+    if (mine.hasDeferredThreads) provideThreadsNow(mine);
 }
 
 } // namespace host

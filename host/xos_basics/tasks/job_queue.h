@@ -17,35 +17,35 @@ class JobQueue {
 public:
     void push(QueuedJob* job) {
         job->next = nullptr;
-        *_end = job;
-        _end = &job->next;
+        *end_ = job;
+        end_ = &job->next;
     }
 
     /// \return null when there is none
     QueuedJob* pop() {
-        QueuedJob* const job = _first;
-        if (job != nullptr) { remove(&_first); }
+        QueuedJob* const job = first_;
+        if (job != nullptr) remove(&first_);
         return job;
     }
 
     /// \return false: it is no longer here
     bool remove(QueuedJob const* job) {
-        QueuedJob** place = &_first;
+        QueuedJob** place = &first_;
         while (*place != nullptr && *place != job) { place = &(*place)->next; }
-        if (*place == nullptr) { return false; }
+        if (*place == nullptr) return false;
         remove(place);
         return true;
     }
 
 private:
     void remove(QueuedJob** place) {
-        if (_end == &(*place)->next) { _end = place; }
+        if (end_ == &(*place)->next) end_ = place;
         *place = (*place)->next;
     }
 
-    QueuedJob* _first{nullptr};
+    QueuedJob* first_{nullptr};
     /// Where the next one is hung.
-    QueuedJob** _end{&_first};
+    QueuedJob** end_{&first_};
 };
 
 } // namespace host

@@ -33,7 +33,7 @@ TaskJob jobOf(xos_TaskParams const& params) {
 extern "C" xos_Task xos_TaskCreate(xos_TaskParams const* params) {
     constexpr xos_Task NO_TASK = ~xos_Task{0};
     static constinit std::atomic<xos_Task> lastTask{0};
-    if (host::createFails(params)) { return NO_TASK; }
+    if (host::createFails(params)) return NO_TASK;
     if (params == nullptr || params->entry == nullptr) {
         host::setLastError(host::Error::badArgument);
         return NO_TASK;

@@ -81,13 +81,13 @@ void enqueue(QueuedJob* job) {
 /// \pre the mutex is held
 std::unique_ptr<QueuedJob> dequeue() {
     std::unique_ptr<QueuedJob> job{queue.pop()};
-    if (job != nullptr) { change(waitingJobs, -1); }
+    if (job != nullptr) change(waitingJobs, -1);
     return job;
 }
 
 void giveBusyWorkersAMoment() {
     for (int i = 0; i < CREATOR_LOOKS && !areEnoughReady(); ++i) {
-        if (busyWorkers.load(std::memory_order_relaxed) == 0 || mostAwake() == 0) { return; }
+        if (busyWorkers.load(std::memory_order_relaxed) == 0 || mostAwake() == 0) return;
         pauseBriefly();
     }
 }
@@ -97,10 +97,10 @@ enum class Need { nothing, wakeUp, newThread };
 /// Makes one more thread ready, on paper, if there are not enough. \param sleeper  the one to be woken, if any
 Need countOnOneMore(Worker*& sleeper) {
     std::lock_guard const lock{mutex};
-    if (areEnoughReady()) { return Need::nothing; }
+    if (areEnoughReady()) return Need::nothing;
     change(readyWorkers, 1);
     sleeper = asleep;
-    if (sleeper == nullptr) { return Need::newThread; }
+    if (sleeper == nullptr) return Need::newThread;
     asleep = sleeper->nextAsleep;
     --asleepCount;
     return Need::wakeUp;
@@ -133,7 +133,7 @@ std::unique_ptr<QueuedJob> nextOrReady() {
 
 /// \pre the calling thread is ready
 std::unique_ptr<QueuedJob> tryTake() {
-    if (waitingJobs.load(std::memory_order_relaxed) == 0) { return nullptr; }
+    if (waitingJobs.load(std::memory_order_relaxed) == 0) return nullptr;
     std::lock_guard const lock{mutex};
     std::unique_ptr<QueuedJob> job = dequeue();
     if (job != nullptr) {
@@ -157,7 +157,7 @@ void stayedAwake() {
 
 std::unique_ptr<QueuedJob> takeWhileAwake() {
     std::unique_ptr<QueuedJob> job = tryTake();
-    if (job != nullptr || !mayStayAwake()) { return job; }
+    if (job != nullptr || !mayStayAwake()) return job;
     for (int i = 0; i < READY_LOOKS && job == nullptr; ++i) {
         pauseBriefly();
         job = tryTake();
@@ -171,9 +171,9 @@ enum class Rest { thereIsWork, sleep, end };
 /// A ready thread may only rest while no job waits.
 Rest fallAsleep(Worker& worker) {
     std::lock_guard const lock{mutex};
-    if (waitingJobs.load(std::memory_order_relaxed) != 0) { return Rest::thereIsWork; }
+    if (waitingJobs.load(std::memory_order_relaxed) != 0) return Rest::thereIsWork;
     change(readyWorkers, -1);
-    if (asleepCount >= MOST_ASLEEP) { return Rest::end; }
+    if (asleepCount >= MOST_ASLEEP) return Rest::end;
     worker.isWoken.store(0, std::memory_order_relaxed);
     worker.nextAsleep = asleep;
     asleep = &worker;
@@ -185,9 +185,9 @@ Rest fallAsleep(Worker& worker) {
 std::unique_ptr<QueuedJob> awaitJob(Worker& worker) {
     for (;;) {
         std::unique_ptr<QueuedJob> job = takeWhileAwake();
-        if (job != nullptr) { return job; }
+        if (job != nullptr) return job;
         Rest const rest = fallAsleep(worker);
-        if (rest == Rest::end) { return nullptr; }
+        if (rest == Rest::end) return nullptr;
         while (rest == Rest::sleep && worker.isWoken.load(std::memory_order_acquire) == 0) {
             waitWhile(worker.isWoken, 0);
         }
@@ -214,8 +214,8 @@ void runJob(Worker& worker, std::unique_ptr<QueuedJob> owned) {
 void runJobs(std::unique_ptr<QueuedJob> job) {
     Worker worker{};
     for (;;) {
-        if (job == nullptr) { job = awaitJob(worker); }
-        if (job == nullptr) { return; }
+        if (job == nullptr) job = awaitJob(worker);
+        if (job == nullptr) return;
         runJob(worker, std::move(job));
         job = nextOrReady();
     }
@@ -233,7 +233,7 @@ void runOwnWorker(void* firstJob) {
 
 /// A stack of a certain size is no other thread's.
 bool runOnOwnThread(std::unique_ptr<QueuedJob> job) {
-    if (!startThread(runOwnWorker, job.get(), job->job.stackSize)) { return false; }
+    if (!startThread(runOwnWorker, job.get(), job->job.stackSize)) return false;
     static_cast<void>(job.release()); // the thread's now
     return true;
 }
@@ -260,9 +260,9 @@ bool isAnyoneAtWork() {
 bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
     QueuedJob* const job = owned.release(); // the queue's, and then its thread's
     enqueue(job);
-    if (isAnyoneAtWork() && deferThreads(provideThreads)) { return true; }
+    if (isAnyoneAtWork() && deferThreads(provideThreads)) return true;
     giveBusyWorkersAMoment();
-    if (makeOneMoreReady() || !takeBack(job)) { return true; }
+    if (makeOneMoreReady() || !takeBack(job)) return true;
     owned.reset(job);
     return false;
 }
@@ -283,7 +283,7 @@ void provideThreads() {
         giveBusyWorkersAMoment();
         // While jobs are being taken, another thread would only be in the way.
         unsigned const before = std::exchange(waiting, jobsWithoutThread());
-        if (waiting >= before && !makeOneMoreReady()) { return; }
+        if (waiting >= before && !makeOneMoreReady()) return;
     }
 }
 

@@ -1,4 +1,4 @@
-// Sibling: task_thread_win.cpp.
+// The sibling is task_thread_win.cpp.
 
 #include "host/xos_basics/tasks/task_thread.h"
 

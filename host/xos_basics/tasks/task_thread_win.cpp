@@ -1,4 +1,4 @@
-// Sibling: task_thread_posix.cpp.
+// The sibling is task_thread_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/last_error.h"
@@ -46,7 +46,7 @@ bool startThread(void (*run)(void*), void* argument, std::uint64_t stackSize) {
     }
     std::uintptr_t const thread = _beginthreadex(nullptr, static_cast<unsigned>(stackSize), runStart, start.get(),
                                                  STACK_SIZE_PARAM_IS_A_RESERVATION, nullptr);
-    if (thread == 0) { return false; }
+    if (thread == 0) return false;
     static_cast<void>(start.release()); // the thread's now
     CloseHandle(reinterpret_cast<HANDLE>(thread));
     return true;
@@ -56,7 +56,7 @@ void nameThisThread(TaskName const& name) {
     static SetDescription const setDescription = findSetDescription();
     wchar_t wide[sizeof(TaskName)] = L"";
     MultiByteToWideChar(CP_ACP, 0, name.data(), -1, wide, static_cast<int>(sizeof(TaskName)));
-    if (setDescription != nullptr) { setDescription(GetCurrentThread(), wide); }
+    if (setDescription != nullptr) setDescription(GetCurrentThread(), wide);
 }
 
 } // namespace host

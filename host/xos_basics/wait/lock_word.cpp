@@ -23,10 +23,10 @@ bool isTakenAfterRest(LockWord& lock, int pauses) {
 
 bool isTakenAwake(LockWord& lock) {
     for (int rest = 1; rest < LONGEST_REST; rest *= 2) {
-        if (isTakenAfterRest(lock, rest)) { return true; }
+        if (isTakenAfterRest(lock, rest)) return true;
     }
     for (int i = 0; i < LOOKS_AT_LONGEST; ++i) {
-        if (isTakenAfterRest(lock, LONGEST_REST)) { return true; }
+        if (isTakenAfterRest(lock, LONGEST_REST)) return true;
     }
     return false;
 }
@@ -34,25 +34,25 @@ bool isTakenAwake(LockWord& lock) {
 /// Ensures that every thread that gives the lock from now on sees that it is awaited.
 void announceSleeper(LockWord& lock) {
     lock.awaited.exchange(1, std::memory_order_seq_cst);
-    if (hasProcessBarrier) { passProcessBarrier(); }
+    if (hasProcessBarrier) passProcessBarrier();
 }
 
 } // namespace
 
 void takeContended(LockWord& lock) {
-    if (isTakenAwake(lock)) { return; }
+    if (isTakenAwake(lock)) return;
     // A thread that has slept leaves the lock awaited, because others may still be asleep; its own give wakes the next
     // one.
     for (;;) {
         announceSleeper(lock);
         std::uint32_t expected = WORD_FREE;
-        if (lock.held.compare_exchange_strong(expected, WORD_HELD, std::memory_order_seq_cst)) { return; }
+        if (lock.held.compare_exchange_strong(expected, WORD_HELD, std::memory_order_seq_cst)) return;
         waitWhile(lock.awaited, 1);
     }
 }
 
 void wakeSleeper(LockWord& lock) {
-    if (lock.awaited.exchange(0, std::memory_order_relaxed) != 0) { wakeOne(lock.awaited); }
+    if (lock.awaited.exchange(0, std::memory_order_relaxed) != 0) wakeOne(lock.awaited);
 }
 
 } // namespace host

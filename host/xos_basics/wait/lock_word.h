@@ -36,7 +36,7 @@ inline bool isTakenAtOnce(LockWord& lock) {
 }
 
 inline void takeWord(LockWord& lock) {
-    if (!isTakenAtOnce(lock)) { takeContended(lock); }
+    if (!isTakenAtOnce(lock)) takeContended(lock);
 }
 
 /// Touches the lock once more after it is free.
@@ -47,7 +47,7 @@ inline void giveWord(LockWord& lock) {
     } else {
         lock.held.exchange(WORD_FREE, std::memory_order_seq_cst);
     }
-    if (lock.awaited.load(std::memory_order_seq_cst) != 0) { wakeSleeper(lock); }
+    if (lock.awaited.load(std::memory_order_seq_cst) != 0) wakeSleeper(lock);
 }
 
 } // namespace host

@@ -1,4 +1,4 @@
-// Sibling: process_barrier_win.cpp.
+// The sibling is process_barrier_win.cpp.
 
 #include "host/xos_basics/wait/process_barrier.h"
 

@@ -15,11 +15,11 @@ public:
     QuickMutex(QuickMutex const&) = delete;
     QuickMutex& operator=(QuickMutex const&) = delete;
 
-    void lock() { takeWord(_lock); }
-    void unlock() { giveWord(_lock); }
+    void lock() { takeWord(lock_); }
+    void unlock() { giveWord(lock_); }
 
 private:
-    LockWord _lock;
+    LockWord lock_;
 };
 
 } // namespace host

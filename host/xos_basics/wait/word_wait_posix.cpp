@@ -1,4 +1,4 @@
-// Sibling: word_wait_win.cpp.
+// The sibling is word_wait_win.cpp.
 
 #include "host/xos_basics/wait/word_wait.h"
 

@@ -1,4 +1,4 @@
-// Sibling: word_wait_posix.cpp.
+// The sibling is word_wait_posix.cpp.
 
 #include "host/windows_api.h"
 #include "host/xos_basics/wait/word_wait.h"

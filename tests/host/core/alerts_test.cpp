@@ -18,7 +18,7 @@ using HQ_Basis::AlertTimer;
 bool waitFor(std::function<bool()> const& condition) {
     auto const end = std::chrono::steady_clock::now() + 30s;
     while (!condition()) {
-        if (std::chrono::steady_clock::now() > end) { return false; }
+        if (std::chrono::steady_clock::now() > end) return false;
         std::this_thread::sleep_for(100us);
     }
     return true;

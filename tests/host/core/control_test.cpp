@@ -434,7 +434,7 @@ TEST_F(HostControl, reads_whole_calls_while_others_make_them) {
         std::size_t const half = (text.size() - 2) / 2;
         ASSERT_EQ(text.substr(0, half), text.substr(half + 2)) << "both arguments are equal";
         ASSERT_EQ(text.find_first_not_of(text[1], 1), half - 1) << "and of one letter: " << text;
-        if (++good % 500 == 0) { xos_HostCallsReset(); }
+        if (++good % 500 == 0) xos_HostCallsReset();
     }
     stop = true;
     for (std::thread& thread : threads) { thread.join(); }

@@ -51,7 +51,7 @@ int root(char** arguments) {
 /// switch GROUP KEY FALLBACK: the value of a switch; 98 when there is no such group.
 int switchValue(char** arguments) {
     cfg_Group* const group = cfg_GroupLoadFromFile(arguments[0], 0, 0, 0);
-    if (group == nullptr) { return 98; }
+    if (group == nullptr) return 98;
     int const value = cfg_KeyGetOpt_Bool(group, arguments[1], std::atoi(arguments[2]));
     cfg_GroupDelete(group, 0);
     return value;
@@ -104,7 +104,7 @@ constexpr Verb VERBS[] = {{"hold", 2, hold},          {"count", 3, count},      
 
 int main(int count, char** arguments) {
     for (Verb const& verb : VERBS) {
-        if (count == verb.arguments + 2 && arguments[1] == std::string(verb.name)) { return verb.run(arguments + 2); }
+        if (count == verb.arguments + 2 && arguments[1] == std::string(verb.name)) return verb.run(arguments + 2);
     }
     return BAD_VERB;
 }

@@ -30,7 +30,7 @@ int freshId() {
 bool waitForFile(std::string const& path) {
     auto const end = std::chrono::steady_clock::now() + 30s;
     while (!exists(path) || textOf(path).empty()) {
-        if (std::chrono::steady_clock::now() > end) { return false; }
+        if (std::chrono::steady_clock::now() > end) return false;
         std::this_thread::sleep_for(1ms);
     }
     return true;

@@ -250,7 +250,7 @@ TEST_P(HostExclusion, lets_one_thread_in_at_a_time) {
             for (std::uint64_t step = 0; step < steps; ++step) {
                 xos_SemTake(sem);
                 ++guarded;
-                if (random() % 512 == 0) { std::this_thread::yield(); }
+                if (random() % 512 == 0) std::this_thread::yield();
                 xos_SemGive(sem);
             }
         });

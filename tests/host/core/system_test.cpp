@@ -185,7 +185,7 @@ TEST(HostLibrary, is_null_when_there_is_none) {
 bool waitForText(std::string const& path, std::string const& start) {
     auto const end = std::chrono::steady_clock::now() + 30s;
     while (textOf(path).substr(0, start.size()) != start) {
-        if (std::chrono::steady_clock::now() > end) { return false; }
+        if (std::chrono::steady_clock::now() > end) return false;
         std::this_thread::sleep_for(2ms);
     }
     return true;

@@ -24,7 +24,7 @@ constexpr xos_Task NO_TASK = ~xos_Task{0};
 bool waitFor(std::function<bool()> const& condition) {
     auto const end = std::chrono::steady_clock::now() + 30s;
     while (!condition()) {
-        if (std::chrono::steady_clock::now() > end) { return false; }
+        if (std::chrono::steady_clock::now() > end) return false;
         std::this_thread::sleep_for(100us);
     }
     return true;
@@ -120,7 +120,7 @@ TEST(HostTask, never_waits_for_the_end_of_the_one_before_it) {
     links[LENGTH].hasBegun = true;
     EXPECT_TRUE(waitFor([&] {
         for (int i = 0; i < LENGTH; ++i) {
-            if (!links[static_cast<std::size_t>(i)].hasEnded) { return false; }
+            if (!links[static_cast<std::size_t>(i)].hasEnded) return false;
         }
         return true;
     }));

@@ -1,4 +1,4 @@
-// Sibling: thread_facts_win.cpp.
+// The sibling is thread_facts_win.cpp.
 
 #include "tests/host/core/thread_facts.h"
 

@@ -1,4 +1,4 @@
-// Sibling: thread_facts_posix.cpp.
+// The sibling is thread_facts_posix.cpp.
 
 #include "host/windows_api.h"
 #include "tests/host/core/thread_facts.h"

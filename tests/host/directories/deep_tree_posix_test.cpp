@@ -26,7 +26,7 @@ struct DescriptorLimit {
 
 /// Makes directories named "d", one in the other, each with a file and an empty directory beside the next.
 bool makeDeep(std::string const& top) {
-    if (::mkdir(top.c_str(), 0755) != 0) { return false; }
+    if (::mkdir(top.c_str(), 0755) != 0) return false;
     int here = ::open(top.c_str(), O_RDONLY | O_DIRECTORY);
     bool good = here >= 0;
     for (int level = 0; good && level < LEVELS; ++level) {

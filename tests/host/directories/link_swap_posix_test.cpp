@@ -23,7 +23,7 @@ public:
               while (!stop_) {
                   std::string const victim = top + (++round % 3 == 0 ? "/a" : round % 3 == 1 ? "/a/b" : "/c");
                   std::string const aside = top + "-aside";
-                  if (::rename(victim.c_str(), aside.c_str()) != 0) { continue; }
+                  if (::rename(victim.c_str(), aside.c_str()) != 0) continue;
                   if (::symlink(outside.c_str(), victim.c_str()) == 0) {
                       ++swaps_;
                       std::this_thread::yield();
@@ -37,7 +37,7 @@ public:
 
     unsigned stop() {
         stop_ = true;
-        if (thread_.joinable()) { thread_.join(); }
+        if (thread_.joinable()) thread_.join();
         return swaps_;
     }
 

@@ -152,7 +152,7 @@ TEST(HostDirectoryCopy, copies_a_whole_tree) {
     EXPECT_EQ(Names({"from/", "to/"}), [&] {
         Names top;
         for (std::string const& name : scratch.content()) {
-            if (name.find('/') == name.size() - 1) { top.insert(name); }
+            if (name.find('/') == name.size() - 1) top.insert(name);
         }
         return top;
     }());
@@ -320,7 +320,7 @@ TEST(HostDirectoryMove, replaces_a_directory_only_when_told) {
         Scratch const scratch;
         makeSample(scratch / "from");
         makeFolder(scratch / "to");
-        if (full) { makeSample(scratch / "to/old"); }
+        if (full) makeSample(scratch / "to/old");
         failsCleanly(scratch, [&] { return moveTree(scratch / "to", scratch / "from", 0); });
         failsCleanly(scratch, [&] { return moveTree(scratch / "to", scratch / "from", 0x800); });
         EXPECT_EQ(moveTree(scratch / "to", scratch / "from", OVERWRITE), 0);

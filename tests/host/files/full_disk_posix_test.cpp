@@ -22,7 +22,7 @@ protected:
         mounted_ = true;
     }
     ~SmallDisk() override {
-        if (mounted_) { ::umount2(path().c_str(), MNT_DETACH); }
+        if (mounted_) ::umount2(path().c_str(), MNT_DETACH);
     }
 
     std::string path() const { return scratch / "disk"; }

@@ -21,7 +21,7 @@ constexpr std::uint32_t APPEND = 0x08;
 struct OpenedFile {
     OpenedFile(std::string const& path, std::uint32_t flags) : handle(xos_FileOpen(path.c_str(), flags)) {}
     ~OpenedFile() {
-        if (handle != 0) { xos_FileCloseEx(handle, 0); }
+        if (handle != 0) xos_FileCloseEx(handle, 0);
     }
     OpenedFile(OpenedFile const&) = delete;
     OpenedFile& operator=(OpenedFile const&) = delete;
@@ -95,7 +95,7 @@ TEST(HostFile, opens_as_its_flags_say) {
          }) {
         SCOPED_TRACE(c.row);
         Scratch const scratch;
-        if (c.present) { put(scratch / "f", "old"); }
+        if (c.present) put(scratch / "f", "old");
         clearSystemError();
         OpenedFile file{scratch / "f", c.flags};
         EXPECT_EQ(file.handle != 0, c.opens);
@@ -400,7 +400,7 @@ TEST(HostFile, does_what_a_text_in_memory_does_at_every_step) {
             for (char& c : text) { c = "abcdefgh\n\r"[random() % 10]; }
             if (model.size() < 400'000 && !text.empty()) {
                 ASSERT_EQ(file.write(text), text.size());
-                if (model.size() < at) { model.resize(at, '\0'); }
+                if (model.size() < at) model.resize(at, '\0');
                 model.replace(at, std::min(text.size(), model.size() - at), text);
                 at += text.size();
             }

@@ -1,4 +1,4 @@
-// Sibling: text_mode_win_test.cpp.
+// The sibling is text_mode_win_test.cpp.
 
 #include "basis/platform/xos_basics.h"
 #include "tests/support/scratch.h"

@@ -135,7 +135,7 @@ TEST(HostFileTransfers, complete_a_write_that_is_interrupted_half_way) {
         std::string got;
         char piece[20'000];
         for (ssize_t count = 0; (count = ::read(in, piece, sizeof piece)) != 0;) {
-            if (count > 0) { got.append(piece, static_cast<std::size_t>(count)); }
+            if (count > 0) got.append(piece, static_cast<std::size_t>(count));
             std::this_thread::sleep_for(500us);
         }
         ::close(in);

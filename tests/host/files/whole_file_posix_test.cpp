@@ -40,7 +40,7 @@ TEST(HostFileOnLinux, copies_exactly_the_permissions_and_the_nanoseconds) {
         ASSERT_EQ(::chmod((scratch / "a").c_str(), mode), 0);
         struct timespec const times[2] = {{1'000'000'000, 1}, {1'234'567'890, 987'654'321}};
         ASSERT_EQ(::utimensat(AT_FDCWD, (scratch / "a").c_str(), times, 0), 0);
-        if (::geteuid() != 0 && (mode & 0400) == 0) { continue; }
+        if (::geteuid() != 0 && (mode & 0400) == 0) continue;
         EXPECT_EQ(xos_FileCopy((scratch / "b").c_str(), (scratch / "a").c_str(), 0), 0);
         EXPECT_EQ(permissionsOf(scratch / "b"), mode);
         struct stat status {};
@@ -233,7 +233,7 @@ TEST(HostFileOnLinux, hands_no_descriptor_to_child_processes) {
     std::string found = "none";
     for (auto const& entry : std::filesystem::directory_iterator{"/proc/self/fd"}) {
         std::error_code ignored;
-        if (std::filesystem::read_symlink(entry.path(), ignored).string() != scratch / "f") { continue; }
+        if (std::filesystem::read_symlink(entry.path(), ignored).string() != scratch / "f") continue;
         found = ::fcntl(std::stoi(entry.path().filename().string()), F_GETFD) == FD_CLOEXEC ? "closed" : "inherited";
     }
     EXPECT_EQ(found, "closed");

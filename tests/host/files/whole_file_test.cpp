@@ -292,7 +292,7 @@ TEST(HostFileRemove, removes_files_whatever_its_flags_and_their_protection) {
     Scratch const scratch;
     for (std::uint32_t flags : {0U, 0x400U, 0x800U, 0xC00U, 0x200U}) {
         put(scratch / "a", "a");
-        if (flags == 0x400) { writeProtect(scratch / "a"); }
+        if (flags == 0x400) writeProtect(scratch / "a");
         EXPECT_EQ(removeFile(scratch / "a", flags), 0) << flags;
         EXPECT_EQ(scratch.content(), Names{});
     }

@@ -1,4 +1,4 @@
-// Sibling: age_win.cpp.
+// The sibling is age_win.cpp.
 
 #include "tests/host/support/status.h"
 

@@ -1,4 +1,4 @@
-// Sibling: age_posix.cpp. The standard library cannot set the time of a directory here.
+// The sibling is age_posix.cpp. The standard library cannot set the time of a directory here.
 
 #include "tests/host/support/status.h"
 

@@ -1,4 +1,4 @@
-// Sibling: child_win.cpp.
+// The sibling is child_win.cpp.
 
 #include "tests/host/support/child.h"
 

@@ -1,4 +1,4 @@
-// Sibling: child_posix.cpp.
+// The sibling is child_posix.cpp.
 
 #include "host/windows_api.h"
 #include "tests/host/support/child.h"

@@ -1,4 +1,4 @@
-// Sibling: system_error_win.cpp.
+// The sibling is system_error_win.cpp.
 
 #include "tests/host/support/system_error.h"
 

@@ -1,4 +1,4 @@
-// Sibling: system_error_posix.cpp.
+// The sibling is system_error_posix.cpp.
 
 #include "tests/host/support/system_error.h"
 

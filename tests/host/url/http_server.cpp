@@ -10,7 +10,7 @@ std::string receiveHead(Socket socket) {
     std::string head;
     while (head.find("\r\n\r\n") == std::string::npos) {
         std::string const piece = receiveSome(socket);
-        if (piece.empty()) { return {}; }
+        if (piece.empty()) return {};
         head += piece;
     }
     return head;

@@ -1,4 +1,4 @@
-// Sibling: sockets_win.cpp.
+// The sibling is sockets_win.cpp.
 
 #include "tests/host/url/sockets.h"
 
@@ -31,7 +31,7 @@ std::string receiveSome(Socket socket) {
     char buffer[4096];
     pollfd wait{static_cast<int>(socket), POLLIN, 0};
     constexpr int LONGEST_MS = 20'000;
-    if (poll(&wait, 1, LONGEST_MS) != 1) { return {}; }
+    if (poll(&wait, 1, LONGEST_MS) != 1) return {};
     ssize_t const count = recv(static_cast<int>(socket), buffer, sizeof buffer, 0);
     return {buffer, static_cast<std::size_t>(count < 0 ? 0 : count)};
 }
@@ -39,7 +39,7 @@ std::string receiveSome(Socket socket) {
 bool sendAll(Socket socket, char const* data, std::size_t size) {
     while (size != 0) {
         ssize_t const count = send(static_cast<int>(socket), data, size, MSG_NOSIGNAL);
-        if (count <= 0) { return false; }
+        if (count <= 0) return false;
         data += count;
         size -= static_cast<std::size_t>(count);
     }

@@ -1,4 +1,4 @@
-// Sibling: sockets_posix.cpp.
+// The sibling is sockets_posix.cpp.
 
 #include "tests/host/url/sockets.h"
 
@@ -36,14 +36,14 @@ Socket listenOnLoopback(std::uint16_t& port) {
 }
 
 Socket acceptWithin(Socket listener, int milliseconds) {
-    if (!isReadable(listener, milliseconds)) { return NO_SOCKET; }
+    if (!isReadable(listener, milliseconds)) return NO_SOCKET;
     return static_cast<Socket>(accept(handleOf(listener), nullptr, nullptr));
 }
 
 std::string receiveSome(Socket socket) {
     char buffer[4096];
     constexpr int LONGEST_MS = 20'000;
-    if (!isReadable(socket, LONGEST_MS)) { return {}; }
+    if (!isReadable(socket, LONGEST_MS)) return {};
     int const count = recv(handleOf(socket), buffer, sizeof buffer, 0);
     return {buffer, static_cast<std::size_t>(count < 0 ? 0 : count)};
 }
@@ -51,7 +51,7 @@ std::string receiveSome(Socket socket) {
 bool sendAll(Socket socket, char const* data, std::size_t size) {
     while (size != 0) {
         int const count = send(handleOf(socket), data, static_cast<int>(size), 0);
-        if (count <= 0) { return false; }
+        if (count <= 0) return false;
         data += count;
         size -= static_cast<std::size_t>(count);
     }
