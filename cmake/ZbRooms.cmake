@@ -50,7 +50,8 @@ function(zb_optimised_tests)
   endif()
 endfunction()
 
-# zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is optimised.
+# zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is
+# optimised.
 function(zb_quickly_compiled target)
   if(NOT MSVC)
     target_compile_options(${target} PRIVATE -O0)

@@ -20,8 +20,9 @@ set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
 find_package(Threads REQUIRED)
 
 # Language and code settings of the whole build, the test framework included.
-add_compile_options(
-  "$<$<NOT:$<CXX_COMPILER_ID:MSVC>>:-ffile-prefix-map=${PROJECT_SOURCE_DIR}=.;-ffile-prefix-map=${PROJECT_BINARY_DIR}=build>")
+if(NOT MSVC)
+  add_compile_options(-ffile-prefix-map=${PROJECT_SOURCE_DIR}=. -ffile-prefix-map=${PROJECT_BINARY_DIR}=build)
+endif()
 if(ZB_SANITIZE)
   add_compile_options(-fsanitize=${ZB_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
   add_link_options(-fsanitize=${ZB_SANITIZE})

@@ -17,13 +17,13 @@ namespace {
 
 class HostMutex {
 public:
-    HostMutex() : _handle(xos_SemMCreate()) {}
-    ~HostMutex() { xos_SemDestroy(_handle); }
-    void take() { xos_SemTake(_handle); }
-    void give() { xos_SemGive(_handle); }
+    HostMutex() : handle_(xos_SemMCreate()) {}
+    ~HostMutex() { xos_SemDestroy(handle_); }
+    void take() { xos_SemTake(handle_); }
+    void give() { xos_SemGive(handle_); }
 
 private:
-    xos_Sem _handle;
+    xos_Sem handle_;
 };
 
 class PthreadMutex {
@@ -32,15 +32,15 @@ public:
         pthread_mutexattr_t attributes;
         pthread_mutexattr_init(&attributes);
         pthread_mutexattr_settype(&attributes, PTHREAD_MUTEX_RECURSIVE);
-        pthread_mutex_init(&_mutex, &attributes);
+        pthread_mutex_init(&mutex_, &attributes);
         pthread_mutexattr_destroy(&attributes);
     }
-    ~PthreadMutex() { pthread_mutex_destroy(&_mutex); }
-    void take() { pthread_mutex_lock(&_mutex); }
-    void give() { pthread_mutex_unlock(&_mutex); }
+    ~PthreadMutex() { pthread_mutex_destroy(&mutex_); }
+    void take() { pthread_mutex_lock(&mutex_); }
+    void give() { pthread_mutex_unlock(&mutex_); }
 
 private:
-    pthread_mutex_t _mutex{};
+    pthread_mutex_t mutex_{};
 };
 
 template <class Mutex>
@@ -77,20 +77,20 @@ constexpr int MOST_UNFINISHED = 64;
 /// Lets so many jobs be unfinished at a time, and waits for the last of them.
 class Unfinished {
 public:
-    void begin() { _free.acquire(); }
+    void begin() { free_.acquire(); }
     void end() {
-        _done.fetch_add(1, std::memory_order_relaxed);
-        _free.release();
+        done_.fetch_add(1, std::memory_order_relaxed);
+        free_.release();
     }
     void waitForAll() {
-        for (int i = 0; i < MOST_UNFINISHED; ++i) { _free.acquire(); }
-        _free.release(MOST_UNFINISHED);
+        for (int i = 0; i < MOST_UNFINISHED; ++i) { free_.acquire(); }
+        free_.release(MOST_UNFINISHED);
     }
-    int done() const { return _done.load(); }
+    int done() const { return done_.load(); }
 
 private:
-    std::counting_semaphore<MOST_UNFINISHED> _free{MOST_UNFINISHED};
-    std::atomic<int> _done{0};
+    std::counting_semaphore<MOST_UNFINISHED> free_{MOST_UNFINISHED};
+    std::atomic<int> done_{0};
 };
 
 void endJob(void* unfinished) { static_cast<Unfinished*>(unfinished)->end(); }

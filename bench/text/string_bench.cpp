@@ -26,16 +26,16 @@ std::string makeText(std::size_t size) {
     return text;
 }
 
-constexpr std::size_t PageSize = 4096;
+constexpr std::size_t PAGE = 4096;
 
 /// A text that begins so many bytes before a page ends.
 char const* textBeforePageEnd(std::size_t size, std::size_t before) {
-    alignas(PageSize) static char room[2 * PageSize];
-    return static_cast<char const*>(std::memcpy(room + PageSize - before, makeText(size).c_str(), size + 1));
+    alignas(PAGE) static char room[2 * PAGE];
+    return static_cast<char const*>(std::memcpy(room + PAGE - before, makeText(size).c_str(), size + 1));
 }
 
 /// Where texts mostly lie: in one page, aligned as blocks of the heap are.
-constexpr std::size_t InOnePage = PageSize - 16;
+constexpr std::size_t IN_ONE_PAGE = PAGE - 16;
 
 template <class String>
 struct Maker {
@@ -103,17 +103,17 @@ void append(benchmark::State& state, std::size_t count) {
 /// Sixteen pairs, equal texts and texts that differ in one place, the same ones for everybody.
 template <class String>
 struct Pairs {
-    static constexpr std::size_t Count = 16;
+    static constexpr std::size_t COUNT = 16;
     explicit Pairs(std::size_t size) {
-        for (std::size_t i = 0; i < Count; ++i) {
+        for (std::size_t i = 0; i < COUNT; ++i) {
             std::string text = makeText(size);
             left[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
             if (i % 2 == 1) text[(i * 7) % size] = '!';
             right[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
         }
     }
-    std::unique_ptr<String> left[Count];
-    std::unique_ptr<String> right[Count];
+    std::unique_ptr<String> left[COUNT];
+    std::unique_ptr<String> right[COUNT];
 };
 
 template <class String, class Compare>
@@ -123,7 +123,7 @@ void compare(benchmark::State& state, std::size_t size, Compare compareOne) {
     for (auto _ : state) {
         String const* left = pairs.left[i].get();
         String const* right = pairs.right[i].get();
-        i = (i + 1) % Pairs<String>::Count;
+        i = (i + 1) % Pairs<String>::COUNT;
         benchmark::DoNotOptimize(left);
         benchmark::DoNotOptimize(right);
         auto result = compareOne(*left, *right);
@@ -139,7 +139,7 @@ void add(std::string const& row, char const* who, Arguments... arguments) {
 template <class String>
 void addMaking(std::string const& kind, char const* who, std::size_t size) {
     std::string const suffix = kind + "/" + std::to_string(size) + "B";
-    add("construct/" + suffix, who, [size](benchmark::State& state) { construct<String>(state, size, InOnePage); });
+    add("construct/" + suffix, who, [size](benchmark::State& state) { construct<String>(state, size, IN_ONE_PAGE); });
     add("copy/" + suffix, who, [size](benchmark::State& state) { copy<String>(state, size); });
 }
 

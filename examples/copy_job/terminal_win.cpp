@@ -1,3 +1,5 @@
+// The sibling is terminal_posix.cpp.
+
 #include "examples/copy_job/terminal.h"
 
 #include <cstdio>
