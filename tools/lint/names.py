@@ -10,7 +10,8 @@ COLUMNS = 120
 # Data, made by programs or by the systems they are to be compared with.
 DATA = (".inc", ".bin", ".png", ".def", ".map", ".txt")
 # Names that the interface gives.
-GIVEN = {"_freq", "slashGood", "slashBad"}
+GIVEN = {"Binary", "Continue", "Mutex", "SizeWChar", "StopOnError", "_CurName", "_ExtRip", "_GlbTmp", "_Level", "_Sem",
+         "_freq", "slashBad", "slashGood"}
 
 COMMENT = re.compile(r"//[^\n]*|/\*.*?\*/|\"(?:[^\"\\\n]|\\.)*\"", re.S)
 UNDERSCORE = re.compile(r"(?<![\w.>:\"])(?:_|m_)[a-z]\w*(?=(?:\[[^]]*\])?(?:\{[^;]*\}| = [^;]*)?;)")
@@ -27,7 +28,7 @@ SUITE = re.compile(r"^(?:TYPED_)?TEST(?:_[FP])?\((\w+),|^TYPED_TEST_SUITE(?:_P)?
 SYSTEM = re.compile(r"_(posix|win)_test$")
 SYSTEM_WORD = re.compile(r"Linux|Windows|(?:Posix|Win)$")
 
-TAG = re.compile(r"\\(param|pre|return|error|thread|cost|kept|since)\b")
+TAG = re.compile(r"(?<!`)\\(param|pre|return|error|thread|cost|kept|since)\b")
 TAG_LINE = re.compile(r"\s*///<? (?:\\param \w+(?:, \w+)*  \S|\\kept [a-z-]+-\d+: \S"
                       r"|\\(?:pre|return|error|thread|cost|since) \S)")
 CONTINUED = re.compile(r"\s*///     \S")
@@ -58,7 +59,7 @@ def names_in(content):
         if "#define" in block[1]:  # made by a macro, of names that the interface gives
             continue
         for match in ENUMERATOR.finditer(block[1]):
-            if not ALL_CAPS.match(match[1]):
+            if not ALL_CAPS.match(match[1]) and match[1] not in GIVEN:
                 yield block.start(), f"{match[1]}: enumerators are ALL_CAPS"
     for block in PRIVATE.finditer(content):
         start = block[0].find("\nprivate:")
@@ -84,11 +85,11 @@ def tags_in(content):
     within = False
     for number, line in enumerate(content.split("\n"), 1):
         is_comment = line.lstrip().startswith("///")
-        if TAG.search(line) and is_comment:
+        if is_comment and TAG.search(line):
             within = True
             if not TAG_LINE.match(line):
                 yield number, "a tag begins its line, with one space behind it and two behind a parameter"
-        elif not is_comment or not line.lstrip().removeprefix("///").strip():
+        elif not is_comment or not line.lstrip().removeprefix("///").strip(" @{}"):
             within = False
         elif within and not CONTINUED.match(line):
             yield number, "a tag's further lines are indented by five spaces"

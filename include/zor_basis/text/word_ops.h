@@ -53,7 +53,7 @@ inline std::uint64_t loadEnds(char const* text, std::uint64_t length) noexcept {
     return loadWord<std::uint32_t>(text) | std::uint64_t{loadWord<std::uint32_t>(text + length - 4)} << 32;
 }
 
-inline constexpr bool WordsBeginLow = std::endian::native == std::endian::little;
+inline constexpr bool WORDS_BEGIN_LOW = std::endian::native == std::endian::little;
 
 // Steps of a copy. Each reads everything before it writes anything, so that source and target may overlap. It is false,
 // with nothing written, where a zero is among the bytes.
@@ -147,7 +147,7 @@ inline void copyGiven(char* target, char const* source, std::uint64_t length) no
 /// go straight to the library.
 template <std::uint64_t N>
 inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexcept {
-    if (N <= 16 && WordsBeginLow && length >= 4 && length <= 16) {
+    if (N <= 16 && WORDS_BEGIN_LOW && length >= 4 && length <= 16) {
         if (length < 8) {
             WordPair const both(loadEnds(a, length), loadEnds(b, length));
             return both.different == 0 || both.endTogether();
@@ -165,7 +165,7 @@ inline bool sameOwned(char const* a, char const* b, std::uint64_t length) noexce
 template <std::uint64_t N>
 inline int compareOwned(char const* a, std::uint64_t aSize, char const* b, std::uint64_t bSize) noexcept {
     std::uint64_t const length = aSize < bSize ? aSize : bSize;
-    if (N <= 16 && WordsBeginLow && length >= 4 && length < 16) {
+    if (N <= 16 && WORDS_BEGIN_LOW && length >= 4 && length < 16) {
         if (length < 8) return WordPair(loadEnds(a, length + 1), loadEnds(b, length + 1)).order();
         WordPair const head(loadWord<std::uint64_t>(a), loadWord<std::uint64_t>(b));
         if (head.decided != 0) return head.order();
