@@ -25,6 +25,8 @@ endfunction()
 function(zb_tests room)
   cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
   zb_optimised_tests(${ARG_LONG_RUNS})
+  zb_joined_tests(${room} ${ARG_EXPORTED})
+  zb_joined_tests(${room} ${ARG_INTERNAL})
   set(own_files ${ARG_INTERNAL})
   if(ZB_SANITIZE)
     list(APPEND own_files ${ARG_EXPORTED})
@@ -48,6 +50,21 @@ function(zb_optimised_tests)
     set_source_files_properties(${ARGN} DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
       PROPERTIES COMPILE_OPTIONS -O1 SKIP_PRECOMPILE_HEADERS ON)
   endif()
+endfunction()
+
+# zb_joined_tests(<room> <files>): has the test files of one room compiled together, some at a time, wherever ZB_JOINED_TESTS
+# asks for it. Those of one system stand alone: they define what the system's headers declare.
+function(zb_joined_tests room)
+  set(most 8)
+  list(FILTER ARGN EXCLUDE REGEX "_(posix|win)_test")
+  set(count 0)
+  foreach(file IN LISTS ARGN)
+    math(EXPR group "${count} / ${most}")
+    math(EXPR count "${count} + 1")
+    set_source_files_properties(${CMAKE_CURRENT_SOURCE_DIR}/${file}
+      DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
+      PROPERTIES UNITY_GROUP ${room}_${group})
+  endforeach()
 endfunction()
 
 # zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is
@@ -79,7 +96,12 @@ function(zb_test_program target)
   get_target_property(libraries ${target} LINK_LIBRARIES)
   if("zb_test_support" IN_LIST libraries)
     zb_quickly_compiled(${target})
-    if(ZB_PRECOMPILED_TESTS)
+    if(ZB_JOINED_TESTS)
+      set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
+      if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+        # It warns of nameless namespaces in headers, and takes joined files for headers.
+        target_compile_options(${target} PRIVATE -Wno-subobject-linkage)
+      endif()
       target_precompile_headers(${target} REUSE_FROM zb_test_headers)
     endif()
   endif()

@@ -191,12 +191,12 @@ TEST_F(ProcessTest, loads_no_library_that_is_not_there) {
 
 namespace {
 
-int target = 0;
-void* moduleAsked = &target;
+int resolved = 0;
+void* moduleAsked = &resolved;
 
 void* resolver(void* module, char const* name) {
     moduleAsked = module;
-    return name == nullptr || std::string(name) == "known" ? &target : nullptr;
+    return name == nullptr || std::string(name) == "known" ? &resolved : nullptr;
 }
 
 } // namespace
@@ -204,14 +204,14 @@ void* resolver(void* module, char const* name) {
 TEST_F(ProcessTest, asks_the_platform_where_there_is_no_module) {
     EXPECT_EQ(Process::ptrFunc("known", nullptr), nullptr) << "without a resolver";
     xos_HostSetResolver(resolver);
-    EXPECT_EQ(Process::ptrFunc("known", nullptr), &target);
+    EXPECT_EQ(Process::ptrFunc("known", nullptr), &resolved);
     EXPECT_EQ(moduleAsked, nullptr);
     EXPECT_EQ(Process::ptrFunc("unknown", nullptr), nullptr);
-    EXPECT_EQ(Process::ptrFunc(nullptr, nullptr), &target) << "the resolver's business";
+    EXPECT_EQ(Process::ptrFunc(nullptr, nullptr), &resolved) << "the resolver's business";
     std::string const call = xos_HostLastCall("xos_BasicsParamLookup");
     EXPECT_EQ(call.substr(0, 12), "0xffff8006, ");
     EXPECT_EQ(call.substr(call.rfind(' ')), " 8");
     xos_HostFail("xos_BasicsParamLookup", 0, 1);
     EXPECT_EQ(Process::ptrFunc("known", nullptr), nullptr);
-    EXPECT_EQ(Process::ptrFunc("known", nullptr), &target);
+    EXPECT_EQ(Process::ptrFunc("known", nullptr), &resolved);
 }

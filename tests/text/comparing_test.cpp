@@ -152,8 +152,8 @@ void compareWith() {
 template <class Text>
 class Comparing : public testing::Test {};
 
-using Texts = testing::Types<Str, BufStr<15>, BufStr<255>, HeapStr, FPath>;
-TYPED_TEST_SUITE(Comparing, Texts, );
+using ComparedTexts = testing::Types<Str, BufStr<15>, BufStr<255>, HeapStr, FPath>;
+TYPED_TEST_SUITE(Comparing, ComparedTexts, );
 
 template <class Text>
 class ComparingOwner : public testing::Test {};

@@ -43,7 +43,7 @@ std::string stopAndPad(char const* text, std::size_t n) {
     return result;
 }
 
-int sign(int order) { return (order > 0) - (order < 0); }
+int signOf(int order) { return (order > 0) - (order < 0); }
 
 /// The order of two terminated texts, byte by byte.
 int naiveOrder(char const* a, char const* b) {
@@ -192,7 +192,7 @@ TEST(TextKernels, compare_every_length_with_a_difference_at_every_place) {
                 ASSERT_EQ(Str(a, size / 2).compare(Str(b, size)), order) << size << ' ' << place;
                 ASSERT_EQ(Str(a, size + 500).compare(Str(b, size + 900)), order);
                 ASSERT_EQ(Str(a).compare(b), order);
-                ASSERT_EQ(sign(Str(a).compare(b, size + 1)), order);
+                ASSERT_EQ(signOf(Str(a).compare(b, size + 1)), order);
                 ASSERT_TRUE(size == 0 || (Str(a, size) == Str(b, size)) == same) << size << ' ' << place;
                 ASSERT_EQ(Str(a, size) == Str(b, 0), order == 0);
                 expectLikeRuntime(BufStr<15>(a, size), BufStr<15>(b, bSize));

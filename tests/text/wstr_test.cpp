@@ -30,8 +30,8 @@ static_assert(!HasLess<WStr, WChar const*> && !HasLess<WChar const*, WStr> && !H
 using WText = std::basic_string<WChar>;
 
 /// A text in a block of its own, without a unit behind its terminator.
-struct ExactText {
-    explicit ExactText(WText const& text) : units(text.begin(), text.end()) { units.push_back(0); }
+struct ExactWideText {
+    explicit ExactWideText(WText const& text) : units(text.begin(), text.end()) { units.push_back(0); }
     operator WChar const*() const { return units.data(); }
     std::vector<WChar> units;
 };
@@ -111,8 +111,8 @@ TEST(WStr, is_compared_from_the_other_side_too) {
 }
 
 TEST(WStr, equality_reads_nothing_behind_a_terminator) {
-    ExactText const a(WText(2, WChar('a')));
-    ExactText const b(WText(2, WChar('a')));
+    ExactWideText const a(WText(2, WChar('a')));
+    ExactWideText const b(WText(2, WChar('a')));
     EXPECT_TRUE(WStr(a, 100) == WStr(b, 100));
     EXPECT_EQ(WStr(a).compare(b, 100), 0);
 }
