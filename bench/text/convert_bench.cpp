@@ -1,5 +1,7 @@
-// UTF-8 to UTF-16 and back, beside ICU, Qt, GLib and iconv. Every side writes into a buffer that it keeps, where its
-// interface lets it; each result is compared with ours once before it is timed.
+// UTF-8 to UTF-16 and back, beside ICU, Qt, GLib and iconv. Every side writes into an output that it keeps, where its
+// interface lets it; every result is compared with the expected text once before it is timed.
+
+#include "bench/text/convert_texts.h"
 
 #include <zor_basis/text/convert.h>
 
@@ -7,9 +9,9 @@
 
 #include <emmintrin.h>
 
+#include <cstdio>
 #include <cstdlib>
-#include <cstring>
-#include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -30,177 +32,156 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct Text {
-    std::string name;
-    std::string narrow;
-    std::u16string wide;
-};
-
-/// Text of about `size` bytes that repeats a sample, not cut inside a character.
-Text makeText(std::string name, std::string_view sample, std::size_t size) {
-    Text text{std::move(name), {}, {}};
-    do { text.narrow += sample; } while (text.narrow.size() + sample.size() <= size);
-    WBStr wide;
-    Convert::Utf8ToWide(text.narrow, wide);
-    text.wide.assign(wide.wstr(), wide.size());
-    return text;
-}
-
-std::vector<Text> makeTexts() {
-    struct Sample {
-        char const* name;
-        std::string_view text;
-    };
-    std::vector<Text> texts;
-    for (auto const& [size, sizeName] : {std::pair{30u, "30B"}, std::pair{300u, "300B"}, std::pair{65536u, "64KiB"}}) {
-        for (Sample const& sample : {Sample{"ascii", "page 0001"},
-                                     Sample{"latin", "Gr\xC3\xBC\xC3\x9F"
-                                                     "e \xC3\xA0 tous "},
-                                     Sample{"cjk", "\xE6\x97\xA5\xE6\x9C\xAC\xE8\xAA\x9E\xE3\x81\xAE\xE5\x8D\xB0"},
-                                     Sample{"emoji", "\xF0\x9F\x98\x80\xF0\x9F\x96\xA8\xF0\x9F\x93\x84"}}) {
-            texts.push_back(makeText(std::string(sample.name) + "-" + sizeName, sample.text, size));
-        }
-    }
-    return texts;
-}
-
-void require(bool good, std::string const& name) {
-    if (good) return;
-    std::fprintf(stderr, "%s: wrong result\n", name.c_str());
-    std::abort();
-}
-
-/// Registers one side of a row, after a look at its result.
-void add(std::string const& name, std::size_t bytes, std::function<bool()> check, std::function<void()> work) {
-    require(check(), name);
-    benchmark::RegisterBenchmark(name.c_str(), [bytes, work = std::move(work)](benchmark::State& state) {
-        for (auto _ : state) work();
-        state.SetBytesProcessed(static_cast<std::int64_t>(state.iterations() * bytes));
-    });
-}
-
-void addOurs(Text const& text) {
-    static WBStr wide;
-    static BufStr<255> narrow;
-    auto toWide = [&text] {
-        Convert::Utf8ToWide(text.narrow.c_str(), wide, text.narrow.size());
-        benchmark::DoNotOptimize(wide.wstr());
-    };
-    auto toNarrow = [&text] {
-        Convert::WideToUtf8(text.wide.c_str(), narrow, text.wide.size());
-        benchmark::DoNotOptimize(narrow.c_str());
-    };
-    add(
-        "to-wide-" + text.name + "/ours", text.narrow.size(),
-        [&] { return toWide(), text.wide == std::u16string_view(wide.wstr(), wide.size()); }, toWide);
-    add(
-        "to-utf8-" + text.name + "/ours", text.narrow.size(),
-        [&] { return toNarrow(), text.narrow == std::string_view(narrow.c_str(), narrow.size()); }, toNarrow);
-}
+using bench::Pool;
+using bench::Text;
 
 std::vector<char16_t> wideRoom(1 << 18);
 std::vector<char> narrowRoom(1 << 18);
 
+std::u16string_view wideResult(std::size_t units) { return {wideRoom.data(), units}; }
+std::string_view narrowResult(std::size_t bytes) { return {narrowRoom.data(), bytes}; }
+
+// ---- the sides: each returns a view of its result -------------------------------------------------------------------
+
+struct Ours {
+    static std::u16string_view toWide(Text const& text) {
+        static WBStr wide;
+        Convert::Utf8ToWide(text.narrow.c_str(), wide, text.narrow.size());
+        return {wide.wstr(), wide.size()};
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        static BufStr<255> narrow;
+        Convert::WideToUtf8(text.wide.c_str(), narrow, text.wide.size());
+        return {narrow.c_str(), narrow.size()};
+    }
+};
+
+/// The usual call: the output is new.
+struct OursFresh {
+    static std::u16string_view toWide(Text const& text) {
+        WBStr wide;
+        Convert::Utf8ToWide(text.narrow.c_str(), wide, text.narrow.size());
+        benchmark::DoNotOptimize(wide.wstr());
+        return text.wide;
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        BufStr<255> narrow;
+        Convert::WideToUtf8(text.wide.c_str(), narrow, text.wide.size());
+        benchmark::DoNotOptimize(narrow.c_str());
+        return text.narrow;
+    }
+};
+
+/// What a fresh output costs at least: the conversion, and a block where the text does not fit inside the object.
+struct KeptAndBlock {
+    static constexpr std::size_t INSIDE = 255;
+
+    static void useBlock(std::size_t size, std::size_t unit) {
+        if (size <= INSIDE) return;
+        std::unique_ptr<void, void (*)(void*)> const block(std::malloc((size + 1) * unit), std::free);
+        benchmark::DoNotOptimize(block.get());
+    }
+
+    static std::u16string_view toWide(Text const& text) {
+        std::u16string_view const result = Ours::toWide(text);
+        useBlock(result.size(), sizeof(char16_t));
+        return result;
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        std::string_view const result = Ours::toUtf8(text);
+        useBlock(result.size(), 1);
+        return result;
+    }
+};
+
 #ifdef BENCH_HAS_ICU
-void addIcu(Text const& text) {
-    static int32_t written;
-    auto toWide = [&text] {
+struct Icu {
+    static std::u16string_view toWide(Text const& text) {
+        int32_t written = 0;
         UErrorCode error = U_ZERO_ERROR;
         u_strFromUTF8(wideRoom.data(), static_cast<int32_t>(wideRoom.size()), &written, text.narrow.data(),
                       static_cast<int32_t>(text.narrow.size()), &error);
-        benchmark::DoNotOptimize(wideRoom.data());
-        benchmark::ClobberMemory();
-    };
-    auto toNarrow = [&text] {
+        return wideResult(static_cast<std::size_t>(written));
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        int32_t written = 0;
         UErrorCode error = U_ZERO_ERROR;
         u_strToUTF8(narrowRoom.data(), static_cast<int32_t>(narrowRoom.size()), &written, text.wide.data(),
                     static_cast<int32_t>(text.wide.size()), &error);
-        benchmark::DoNotOptimize(narrowRoom.data());
-        benchmark::ClobberMemory();
-    };
-    add(
-        "to-wide-" + text.name + "/icu", text.narrow.size(),
-        [&] { return toWide(), text.wide == std::u16string_view(wideRoom.data(), static_cast<size_t>(written)); },
-        toWide);
-    add(
-        "to-utf8-" + text.name + "/icu", text.narrow.size(),
-        [&] { return toNarrow(), text.narrow == std::string_view(narrowRoom.data(), static_cast<size_t>(written)); },
-        toNarrow);
-}
+        return narrowResult(static_cast<std::size_t>(written));
+    }
+};
 #endif
 
 #ifdef BENCH_HAS_QT
-void addQt(Text const& text) {
-    static QChar* wideEnd;
-    static char* narrowEnd;
-    auto toWide = [&text] {
+struct Qt {
+    static std::u16string_view toWide(Text const& text) {
         QStringDecoder decoder(QStringDecoder::Utf8, QStringDecoder::Flag::Stateless);
-        wideEnd =
-            decoder.appendToBuffer(reinterpret_cast<QChar*>(wideRoom.data()),
-                                   QByteArrayView(text.narrow.data(), static_cast<qsizetype>(text.narrow.size())));
-        benchmark::DoNotOptimize(wideEnd);
-        benchmark::ClobberMemory();
-    };
-    auto toNarrow = [&text] {
+        auto* const room = reinterpret_cast<QChar*>(wideRoom.data());
+        QByteArrayView const bytes(text.narrow.data(), static_cast<qsizetype>(text.narrow.size()));
+        return wideResult(static_cast<std::size_t>(decoder.appendToBuffer(room, bytes) - room));
+    }
+
+    static std::string_view toUtf8(Text const& text) {
         QStringEncoder encoder(QStringEncoder::Utf8, QStringEncoder::Flag::Stateless);
-        narrowEnd = encoder.appendToBuffer(narrowRoom.data(),
-                                           QStringView(text.wide.data(), static_cast<qsizetype>(text.wide.size())));
-        benchmark::DoNotOptimize(narrowEnd);
-        benchmark::ClobberMemory();
-    };
-    auto units = [] { return static_cast<std::size_t>(wideEnd - reinterpret_cast<QChar*>(wideRoom.data())); };
-    auto bytes = [] { return static_cast<std::size_t>(narrowEnd - narrowRoom.data()); };
-    add(
-        "to-wide-" + text.name + "/qt", text.narrow.size(),
-        [&] { return toWide(), text.wide == std::u16string_view(wideRoom.data(), units()); }, toWide);
-    add(
-        "to-utf8-" + text.name + "/qt", text.narrow.size(),
-        [&] { return toNarrow(), text.narrow == std::string_view(narrowRoom.data(), bytes()); }, toNarrow);
-}
+        QStringView const units(text.wide.data(), static_cast<qsizetype>(text.wide.size()));
+        return narrowResult(
+            static_cast<std::size_t>(encoder.appendToBuffer(narrowRoom.data(), units) - narrowRoom.data()));
+    }
+};
 #endif
 
 #ifdef BENCH_HAS_GLIB
-void addGlib(Text const& text) {
-    auto toWide = [&text] {
-        gunichar2* const wide =
-            g_utf8_to_utf16(text.narrow.data(), static_cast<glong>(text.narrow.size()), nullptr, nullptr, nullptr);
-        benchmark::DoNotOptimize(*wide);
-        g_free(wide);
-    };
-    auto toNarrow = [&text] {
-        char* const narrow = g_utf16_to_utf8(reinterpret_cast<gunichar2 const*>(text.wide.data()),
-                                             static_cast<glong>(text.wide.size()), nullptr, nullptr, nullptr);
-        benchmark::DoNotOptimize(*narrow);
-        g_free(narrow);
-    };
-    add(
-        "to-wide-" + text.name + "/glib", text.narrow.size(), [] { return true; }, toWide);
-    add(
-        "to-utf8-" + text.name + "/glib", text.narrow.size(), [] { return true; }, toNarrow);
-}
+/// Gives a new block each time, which is freed at the next call.
+struct Glib {
+    static std::u16string_view toWide(Text const& text) {
+        static std::unique_ptr<gunichar2, void (*)(void*)> wide(nullptr, g_free);
+        glong units = 0;
+        wide.reset(
+            g_utf8_to_utf16(text.narrow.data(), static_cast<glong>(text.narrow.size()), nullptr, &units, nullptr));
+        return {reinterpret_cast<char16_t const*>(wide.get()), static_cast<std::size_t>(units)};
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        static std::unique_ptr<char, void (*)(void*)> narrow(nullptr, g_free);
+        glong bytes = 0;
+        narrow.reset(g_utf16_to_utf8(reinterpret_cast<gunichar2 const*>(text.wide.data()),
+                                     static_cast<glong>(text.wide.size()), nullptr, &bytes, nullptr));
+        return {narrow.get(), static_cast<std::size_t>(bytes)};
+    }
+};
 #endif
 
-void addIconv(Text const& text) {
-    static iconv_t const toWideConverter = iconv_open("UTF-16LE", "UTF-8");
-    static std::size_t units;
-    auto toWide = [&text] {
-        char* in = const_cast<char*>(text.narrow.data());
-        std::size_t left = text.narrow.size();
-        char* out = reinterpret_cast<char*>(wideRoom.data());
-        std::size_t room = wideRoom.size() * sizeof(char16_t);
-        iconv(toWideConverter, &in, &left, &out, &room);
-        units = static_cast<std::size_t>(out - reinterpret_cast<char*>(wideRoom.data())) / sizeof(char16_t);
-        benchmark::DoNotOptimize(wideRoom.data());
-        benchmark::ClobberMemory();
-    };
-    add(
-        "to-wide-" + text.name + "/iconv", text.narrow.size(),
-        [&] { return toWide(), text.wide == std::u16string_view(wideRoom.data(), units); }, toWide);
-}
+struct Iconv {
+    static std::size_t convert(iconv_t converter, void const* from, std::size_t size, void* to, std::size_t room) {
+        auto* in = const_cast<char*>(static_cast<char const*>(from));
+        auto* out = static_cast<char*>(to);
+        std::size_t left = room;
+        iconv(converter, &in, &size, &out, &left);
+        return room - left;
+    }
 
-/// What no conversion of ASCII can beat: it looks at nothing.
-void addWideningLoop(Text const& text) {
-    auto toWide = [&text] {
+    static std::u16string_view toWide(Text const& text) {
+        static iconv_t const converter = iconv_open("UTF-16LE", "UTF-8");
+        std::size_t const bytes = convert(converter, text.narrow.data(), text.narrow.size(), wideRoom.data(),
+                                          wideRoom.size() * sizeof(char16_t));
+        return wideResult(bytes / sizeof(char16_t));
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        static iconv_t const converter = iconv_open("UTF-8", "UTF-16LE");
+        return narrowResult(convert(converter, text.wide.data(), text.wide.size() * sizeof(char16_t), narrowRoom.data(),
+                                    narrowRoom.size()));
+    }
+};
+
+/// What no conversion of ASCII can beat by much: it looks at nothing.
+struct Sse2Loop {
+    static std::u16string_view toWide(Text const& text) {
         __m128i const zero = _mm_setzero_si128();
         std::size_t i = 0;
         for (; i + 16 <= text.narrow.size(); i += 16) {
@@ -209,29 +190,68 @@ void addWideningLoop(Text const& text) {
             _mm_storeu_si128(reinterpret_cast<__m128i*>(wideRoom.data() + i + 8), _mm_unpackhi_epi8(block, zero));
         }
         for (; i < text.narrow.size(); ++i) wideRoom[i] = static_cast<unsigned char>(text.narrow[i]);
-        benchmark::DoNotOptimize(wideRoom.data());
-        benchmark::ClobberMemory();
-    };
-    add(
-        "to-wide-" + text.name + "/sse2-loop", text.narrow.size(),
-        [&] { return toWide(), text.wide == std::u16string_view(wideRoom.data(), text.wide.size()); }, toWide);
+        return wideResult(text.narrow.size());
+    }
+
+    static std::string_view toUtf8(Text const& text) {
+        std::size_t i = 0;
+        for (; i + 16 <= text.wide.size(); i += 16) {
+            auto const* const from = reinterpret_cast<__m128i const*>(text.wide.data() + i);
+            _mm_storeu_si128(reinterpret_cast<__m128i*>(narrowRoom.data() + i),
+                             _mm_packus_epi16(_mm_loadu_si128(from), _mm_loadu_si128(from + 1)));
+        }
+        for (; i < text.wide.size(); ++i) narrowRoom[i] = static_cast<char>(text.wide[i]);
+        return narrowResult(text.wide.size());
+    }
+};
+
+// ---- rows -----------------------------------------------------------------------------------------------------------
+
+void require(bool good, std::string const& name) {
+    if (good) return;
+    std::fprintf(stderr, "%s: wrong result\n", name.c_str());
+    std::abort();
+}
+
+/// Registers one side of a row, after a look at all its results.
+template <class Convert, class Expected>
+void addRow(std::string const& name, Pool const& pool, Convert convert, Expected expected) {
+    for (Text const& text : pool.texts) require(convert(text) == expected(text), name);
+    benchmark::RegisterBenchmark(name.c_str(), [&pool, convert](benchmark::State& state) {
+        std::size_t next = 0;
+        for (auto _ : state) {
+            benchmark::DoNotOptimize(convert(pool.texts[next]));
+            benchmark::ClobberMemory();
+            next = next + 1 == pool.texts.size() ? 0 : next + 1;
+        }
+    });
+}
+
+template <class Side>
+void addSide(std::string const& row, Pool const& pool, std::string const& who) {
+    addRow(row + "to-wide-" + pool.name + "/" + who, pool, Side::toWide,
+           [](Text const& text) { return std::u16string_view(text.wide); });
+    addRow(row + "to-utf8-" + pool.name + "/" + who, pool, Side::toUtf8,
+           [](Text const& text) { return std::string_view(text.narrow); });
 }
 
 bool registerAll() {
-    static std::vector<Text> const texts = makeTexts();
-    for (Text const& text : texts) {
-        addOurs(text);
+    static std::vector<Pool> const pools = bench::makePools();
+    for (Pool const& pool : pools) {
+        addSide<Ours>("", pool, "ours");
+        addSide<Iconv>("", pool, "iconv");
 #ifdef BENCH_HAS_ICU
-        addIcu(text);
+        addSide<Icu>("", pool, "icu");
 #endif
 #ifdef BENCH_HAS_QT
-        addQt(text);
+        addSide<Qt>("", pool, "qt");
 #endif
 #ifdef BENCH_HAS_GLIB
-        addGlib(text);
+        addSide<Glib>("", pool, "glib");
 #endif
-        addIconv(text);
-        if (text.name == "ascii-64KiB") addWideningLoop(text);
+        if (pool.name.starts_with("ascii")) addSide<Sse2Loop>("", pool, "sse2-loop");
+        addSide<OursFresh>("fresh-", pool, "ours");
+        addSide<KeptAndBlock>("fresh-", pool, "kept-and-block");
     }
     return true;
 }
