@@ -7,18 +7,36 @@ Benchmarks are named `row/who`, where who is `ours` or a peer. bench/FAMILY/goal
     ROW-GLOB <= RATIO x min(A,B)      … the time of the fastest of several
 
 Repetitions of all rows are interleaved; the median counts. Ties by noise: 10 %, rows under 5 ns 30 %, rows that name
-two or more threads 50 %.
+two or more threads 50 %. A row that misses its goal is measured again in two fresh processes, and the median of the
+three ratios counts. Exits with 1 where a goal is missed.
 """
 
 import fnmatch
 import json
 import re
+import statistics
 import subprocess
 import sys
 from pathlib import Path
 
 ROOT = Path(__file__).resolve().parents[1]
 GOAL = re.compile(r"^(\S+)\s*<=\s*([\d.]+)\s*x\s*(?:min\(([^)]*)\)|(\S+))$")
+# What the benchmark library appends to a name.
+SUFFIX = re.compile(r"/(?:manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)"
+                    r"|/\d+$")
+NANOSECONDS = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}
+LEVELS = ("sse2", "ssse3", "avx2", "avx512bw")
+FRESH_PROCESSES = 2
+
+
+def processor():
+    """The processor's name and the levels that kernels choose from."""
+    facts = {}
+    for line in Path("/proc/cpuinfo").read_text().splitlines():
+        name, _, value = line.partition(":")
+        facts.setdefault(name.strip(), value.strip())
+    levels = [level for level in LEVELS if level in facts["flags"].split()]
+    return f"{facts['model name']}, family {facts['cpu family']} model {facts['model']}: {', '.join(levels)}"
 
 
 def read_goals(family):
@@ -34,22 +52,23 @@ def read_goals(family):
     return goals
 
 
-def measure(program):
-    report = program.parent / f"{program.name}.json"
+def measure(program, wanted=()):
+    """{row: {who: (median in ns, coefficient of variation)}} of one process; all rows unless some are wanted."""
+    output = program.parent / f"{program.name}.json"
     command = [program, "--benchmark_enable_random_interleaving=true", "--benchmark_repetitions=9",
                "--benchmark_min_time=0.05", "--benchmark_report_aggregates_only=true",
-               f"--benchmark_out={report}", "--benchmark_out_format=json"]
+               f"--benchmark_out={output}", "--benchmark_out_format=json"]
+    if wanted:
+        command.append(f"--benchmark_filter=^({'|'.join(map(re.escape, wanted))})/")
     subprocess.run([str(c) for c in command], check=True, stdout=subprocess.DEVNULL)
     rows = {}
-    for entry in json.loads(report.read_text())["benchmarks"]:
-        if entry.get("aggregate_name") != "median":
-            continue
-        name = re.sub(r"/(manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)"
-                      r"|/\d+$",
-                      "", entry["run_name"])
-        row, who = name.rsplit("/", 1)
-        scale = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}[entry["time_unit"]]
-        rows.setdefault(row, {})[who] = entry["real_time"] * scale
+    for entry in json.loads(output.read_text())["benchmarks"]:
+        row, who = SUFFIX.sub("", entry["run_name"]).rsplit("/", 1)
+        cell = rows.setdefault(row, {}).setdefault(who, [0, 0])
+        if entry.get("aggregate_name") == "median":
+            cell[0] = entry["real_time"] * NANOSECONDS[entry["time_unit"]]
+        elif entry.get("aggregate_name") == "cv":
+            cell[1] = entry["real_time"]
     return rows
 
 
@@ -59,25 +78,51 @@ def tolerance(row, ours):
     return 1.3 if ours < 5 else 1.1
 
 
-def report(family, rows, goals):
-    print(f"\n{family}: ns, medians of interleaved repetitions")
-    missed = 0
+def ratio_of(times, peers):
+    """Our time over that of the fastest of the peers; None where one of both was not measured."""
+    present = [times[p][0] for p in peers if p in times]
+    return times["ours"][0] / min(present) if present and "ours" in times else None
+
+
+def verdict(row, ratio, goal, ours):
+    if ratio <= goal:
+        return "met"
+    return "tie" if ratio <= goal * tolerance(row, ours) else "MISSED"
+
+
+def judge(rows, goals):
+    """{(row, goal number): ratio} of all goals of all rows."""
+    return {(row, number): ratio_of(times, peers) for row, times in rows.items()
+            for number, (glob, _, peers) in enumerate(goals) if fnmatch.fnmatchcase(row, glob) and "ours" in times}
+
+
+def judge_again(program, rows, goals, ratios):
+    """Replaces the ratios of missed rows by the median of several processes."""
+    missed = [key for key, ratio in ratios.items() if ratio is not None
+              and verdict(key[0], ratio, goals[key[1]][1], rows[key[0]]["ours"][0]) == "MISSED"]
+    if not missed:
+        return
+    names = sorted({row for row, _ in missed})
+    runs = [ratios, *(judge(measure(program, names), goals) for _ in range(FRESH_PROCESSES))]
+    ratios.update({key: statistics.median(run[key] for run in runs) for key in missed})
+
+
+def report(family, rows, goals, ratios):
+    print(f"\n{family}: ns, medians of interleaved repetitions, ± their coefficient of variation")
+    verdicts = []
     for row, times in sorted(rows.items()):
-        cells = "  ".join(f"{who} {time:.4g}" for who, time in sorted(times.items()))
+        cells = "  ".join(f"{who} {time:.4g} ±{spread:.0%}" for who, (time, spread) in sorted(times.items()))
         print(f"  {row:44} {cells}")
-        for glob, ratio, peers in goals:
-            if not fnmatch.fnmatchcase(row, glob) or "ours" not in times:
+        for number, (_, goal, peers) in enumerate(goals):
+            if (row, number) not in ratios:
                 continue
-            present = [times[p] for p in peers if p in times]
-            if not present:
-                print(f"  {'':44} goal: {ratio:g} x {'/'.join(peers)}, which was not measured")
+            ratio = ratios[row, number]
+            if ratio is None:
+                print(f"  {'':44} goal: {goal:g} x {'/'.join(peers)}, which was not measured")
                 continue
-            reached = times["ours"] / min(present)
-            is_tie = reached <= ratio * tolerance(row, times["ours"])
-            verdict = "met" if reached <= ratio else "tie" if is_tie else "MISSED"
-            missed += verdict == "MISSED"
-            print(f"  {'':44} {reached:.2f} x {'/'.join(peers)}, goal {ratio:g}: {verdict}")
-    return missed
+            verdicts.append(verdict(row, ratio, goal, times["ours"][0]))
+            print(f"  {'':44} {ratio:.2f} x {'/'.join(peers)}, goal {goal:g}: {verdicts[-1]}")
+    return verdicts
 
 
 def main():
@@ -86,11 +131,16 @@ def main():
     chosen = [p for p in programs if not families or p.name.removeprefix("bench_") in families]
     if not chosen:
         sys.exit(f"no such family; there are: {' '.join(p.name.removeprefix('bench_') for p in programs)}")
-    missed = 0
+    print(processor())
+    verdicts = []
     for program in chosen:
         family = program.name.removeprefix("bench_")
-        missed += report(family, measure(program), read_goals(family))
-    print(f"\n{missed} goals missed")
+        goals, rows = read_goals(family), measure(program)
+        ratios = judge(rows, goals)
+        judge_again(program, rows, goals, ratios)
+        verdicts += report(family, rows, goals, ratios)
+    print(f"\n{verdicts.count('met')} goals met, {verdicts.count('tie')} ties, {verdicts.count('MISSED')} missed")
+    sys.exit(1 if "MISSED" in verdicts else 0)
 
 
 main()
