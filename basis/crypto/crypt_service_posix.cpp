@@ -33,9 +33,10 @@ struct Hash {
 };
 
 struct Key {
-    arctwo_ctx schedule;
-    bool exportable;
     std::uint8_t plain[KEY_LENGTH];
+    bool exportable;
+    bool scheduled;
+    arctwo_ctx schedule;
 };
 
 /// What precedes the key in its blob: kind and version of the blob, the algorithm, the length.
@@ -93,8 +94,8 @@ bool deriveKey(Handle provider, Handle from, bool exportable, Handle& handle) {
     Key* const key = make<Key>(handle);
     if (key == nullptr) return false;
     std::memcpy(key->plain, finish(*hash), KEY_LENGTH);
-    arctwo_set_key(&key->schedule, KEY_LENGTH, key->plain);
     key->exportable = exportable;
+    key->scheduled = false;
     return true;
 }
 
@@ -110,8 +111,15 @@ bool exportKey(Handle handle, char* blob, std::uint32_t& n) {
     return true;
 }
 
+/// Made by the first message: most keys are derived to be exported, and a schedule costs more than their hash.
+arctwo_ctx const& scheduleOf(Key& key) {
+    if (!key.scheduled) arctwo_set_key(&key.schedule, KEY_LENGTH, key.plain);
+    key.scheduled = true;
+    return key.schedule;
+}
+
 bool encrypt(Handle handle, char* data, std::uint32_t& n, std::uint32_t room) {
-    Key const* const key = of<Key>(handle);
+    Key* const key = of<Key>(handle);
     if (key == nullptr) return false;
     std::uint32_t const length = n;
     std::uint32_t const padding = CRYPT_BLOCK - length % CRYPT_BLOCK;
@@ -121,7 +129,7 @@ bool encrypt(Handle handle, char* data, std::uint32_t& n, std::uint32_t room) {
     std::memset(data + length, static_cast<int>(padding), padding);
     std::uint8_t chain[CRYPT_BLOCK] = {};
     std::uint8_t* const bytes = reinterpret_cast<std::uint8_t*>(data);
-    cbc_encrypt(&key->schedule, nettle_arctwo128.encrypt, CRYPT_BLOCK, chain, n, bytes, bytes);
+    cbc_encrypt(&scheduleOf(*key), nettle_arctwo128.encrypt, CRYPT_BLOCK, chain, n, bytes, bytes);
     return true;
 }
 
@@ -136,11 +144,11 @@ bool endsInPadding(std::uint8_t const* bytes, std::uint32_t n) {
 }
 
 bool decrypt(Handle handle, char* data, std::uint32_t& n) {
-    Key const* const key = of<Key>(handle);
+    Key* const key = of<Key>(handle);
     if (key == nullptr || !isWholeBlocks(n)) return false;
     std::uint8_t chain[CRYPT_BLOCK] = {};
     std::uint8_t* const bytes = reinterpret_cast<std::uint8_t*>(data);
-    cbc_decrypt(&key->schedule, nettle_arctwo128.decrypt, CRYPT_BLOCK, chain, n, bytes, bytes);
+    cbc_decrypt(&scheduleOf(*key), nettle_arctwo128.decrypt, CRYPT_BLOCK, chain, n, bytes, bytes);
     if (!endsInPadding(bytes, n)) return false;
     n -= bytes[n - 1];
     return true;

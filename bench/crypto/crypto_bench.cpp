@@ -121,6 +121,30 @@ void deriveNettle(benchmark::State& state, std::size_t n) {
     }
 }
 
+/* From a secret to an exported key */
+
+void exportKey(benchmark::State& state, std::size_t n) {
+    Bytes const secret = makeMessage(n);
+    Blob out;
+    for (auto _ : state) {
+        CrHashPtr running(&provider());
+        running->hashData(secret.data(), secret.size());
+        benchmark::DoNotOptimize(running->exportKey(out));
+    }
+}
+
+void exportKeyNettle(benchmark::State& state, std::size_t n) {
+    Bytes const secret = makeMessage(n);
+    Digest out;
+    for (auto _ : state) {
+        md5_ctx running;
+        md5_init(&running);
+        md5_update(&running, secret.size(), secret.data());
+        md5_digest(&running, sizeof out.bytes, out.bytes);
+        benchmark::DoNotOptimize(out);
+    }
+}
+
 /* Encrypting from one buffer into another */
 
 void encrypt(benchmark::State& state, std::size_t n) {
@@ -246,6 +270,8 @@ BENCHMARK_CAPTURE(derive, 64, SMALL)->Name("derive-64/ours");
 BENCHMARK_CAPTURE(deriveNettle, 64, SMALL)->Name("derive-64/nettle");
 BENCHMARK_CAPTURE(derive, 64k, LARGE)->Name("derive-64k/ours");
 BENCHMARK_CAPTURE(deriveNettle, 64k, LARGE)->Name("derive-64k/nettle");
+BENCHMARK_CAPTURE(exportKey, 64, SMALL)->Name("export-64/ours");
+BENCHMARK_CAPTURE(exportKeyNettle, 64, SMALL)->Name("export-64/nettle");
 BENCHMARK_CAPTURE(encrypt, 64, SMALL)->Name("encrypt-64/ours");
 BENCHMARK_CAPTURE(encryptNettle, 64, SMALL)->Name("encrypt-64/nettle");
 BENCHMARK_CAPTURE(encrypt, 64k, LARGE)->Name("encrypt-64k/ours");
