@@ -1,19 +1,21 @@
 #!/usr/bin/env python3
 """Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment
 marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`).
-Writes docs/kept.md."""
+Writes docs/kept.md, which names the header and the test's file of each."""
 
 import re
+import textwrap
 
 import common
 
+COLUMNS = 120
 TOLD = re.compile(r"\\kept ([a-z]+(?:-[a-z]+)*-\d+):\s*(.*(?:\n\s*///\s{2,}.*)*)")
 SPOT = re.compile(r"(?://|/\*) kept ([a-z]+(?:-[a-z]+)*-\d+)\b")
 TEST = re.compile(r"\bKept_([a-z]+(?:_[a-z]+)*_\d+)_")
 HEAD = """# Kept behaviour
 
 Behaviour that looks odd and is relied upon, collected from the public headers by `./dev lint kept`.
-A comment marks each at its place in the code, and a test fails as soon as the behaviour changes.
+A comment marks each at its place in the code, and the named test fails as soon as the behaviour changes.
 
 """
 
@@ -24,6 +26,24 @@ def gather(pattern, paths, key=lambda match: match[1]):
         for match in pattern.finditer(common.text(path)):
             found.setdefault(key(match), []).append((path, match))
     return found
+
+
+def entry(identity, header, match, tests):
+    """One item of the list: the text of the public header, the header, and the files of the tests."""
+    words = " ".join(re.sub(r"\n\s*///", " ", match[2]).split())
+    pinned = ", ".join(f"`{name}`" for name in sorted({str(path) for path, _ in tests}))
+    told = f"**{identity}** {words} (`{str(header).removeprefix('include/')}`; pinned by {pinned})"
+    return textwrap.fill(told, COLUMNS, initial_indent="- ", subsequent_indent="  ", break_long_words=False,
+                         break_on_hyphens=False)
+
+
+def listed(told, tests):
+    lines, room = [], None
+    for identity in sorted(told):
+        if room != (room := identity.rsplit("-", 1)[0]):
+            lines.append(f"\n## {room}\n" if lines else f"## {room}\n")
+        lines.append(entry(identity, *told[identity][0], tests.get(identity, [])))
+    return HEAD + "\n".join(lines) + "\n"
 
 
 def main():
@@ -38,15 +58,8 @@ def main():
         for name, where in lists.items():
             if identity not in where:
                 problems.append(f"{identity} lacks {name}")
-    lines, room = [], None
-    for identity in sorted(told):
-        path, match = told[identity][0]
-        if room != (room := identity.rsplit("-", 1)[0]):
-            lines.append(f"\n## {room}\n" if lines else f"## {room}\n")
-        words = " ".join(re.sub(r"\n\s*///", " ", match[2]).split())
-        lines.append(f"- **{identity}** {words} (`{str(path).removeprefix('include/')}`)")
     page = common.ROOT / "docs/kept.md"
-    content = HEAD + "\n".join(lines) + "\n"
+    content = listed(told, tests)
     if not page.exists() or page.read_text() != content:
         page.write_text(content)
         problems.append("docs/kept.md was out of date and has been rewritten; commit it")
