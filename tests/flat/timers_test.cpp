@@ -2,7 +2,7 @@
 
 #include "tests/timers/assertions.h"
 #include "tests/timers/opened.h"
-#include "tests/timers/scratch_root.h"
+#include "tests/support/scratch_root.h"
 
 #include <gtest/gtest.h>
 
@@ -62,11 +62,11 @@ TEST(FlatTimers, measure_in_a_record_of_the_caller) {
     EXPECT_EQ(record.suspended, suspended);
     zbTimerBaseStop(&record, &pile);
     EXPECT_TRUE(isIdle(record));
-    EXPECT_EQ(pile.numbers()[0], 1);
-    EXPECT_EQ(pile.numbers()[6], suspended);
+    EXPECT_EQ(pile.statistics().count, 1);
+    EXPECT_EQ(pile.statistics().suspendTotal, suspended);
 
     zbTimerBaseStop(&record, &pile);
-    EXPECT_EQ(pile.numbers()[0], 1) << "it was idle";
+    EXPECT_EQ(pile.statistics().count, 1) << "it was idle";
     zbTimerBaseStart(&record, -1);
     EXPECT_GE(record.suspendStart, record.start);
     EXPECT_GT(record.start, 0);
@@ -92,7 +92,7 @@ TEST(FlatTimers, Kept_flat_02_a_stop_without_a_pile_does_not_end_the_measurement
     EXPECT_EQ(record.start, start);
     EXPECT_EQ(record.stop, 0);
     zbTimerBaseStop(&record, &pile);
-    EXPECT_EQ(pile.numbers()[0], 1);
+    EXPECT_EQ(pile.statistics().count, 1);
 }
 
 TEST(FlatTimers, drive_a_pile_with_its_complaints) {

@@ -8,7 +8,7 @@
 #include "basis/log/logger_impl.h"
 #include "tests/log/hand_clock.h"
 #include "tests/support/scratch.h"
-#include "tests/timers/scratch_root.h"
+#include "tests/support/scratch_root.h"
 
 #include <xos_host.h>
 

@@ -52,6 +52,22 @@ std::string readAll(HANDLE pipe) {
     return lines;
 }
 
+/// Starts a process that writes to the end of a pipe.
+bool start(Child const& child, HANDLE output, PROCESS_INFORMATION& process) {
+    std::string const program = programBeside(child.program);
+    std::string commandLine = quoted(program);
+    for (std::string const& argument : child.arguments) commandLine += " " + quoted(argument);
+    std::string environment = environmentOf(child);
+    STARTUPINFOA startup{};
+    startup.cb = sizeof startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
+    startup.hStdOutput = output;
+    startup.hStdError = GetStdHandle(STD_ERROR_HANDLE);
+    return CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
+                          child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
+}
+
 } // namespace
 
 std::string programBeside(std::string const& name) {
@@ -62,26 +78,13 @@ std::string programBeside(std::string const& name) {
 }
 
 ChildResult run(Child const& child) {
-    std::string const program = programBeside(child.program);
-    std::string commandLine = quoted(program);
-    for (std::string const& argument : child.arguments) commandLine += " " + quoted(argument);
-    std::string environment = environmentOf(child);
-
     SECURITY_ATTRIBUTES inherited{sizeof(SECURITY_ATTRIBUTES), nullptr, TRUE};
     HANDLE readEnd = nullptr;
     HANDLE writeEnd = nullptr;
     if (!CreatePipe(&readEnd, &writeEnd, &inherited, 0)) return {};
     SetHandleInformation(readEnd, HANDLE_FLAG_INHERIT, 0);
-    STARTUPINFOA startup{};
-    startup.cb = sizeof startup;
-    startup.dwFlags = STARTF_USESTDHANDLES;
-    startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
-    startup.hStdOutput = writeEnd;
-    startup.hStdError = GetStdHandle(STD_ERROR_HANDLE);
     PROCESS_INFORMATION process{};
-    bool const started =
-        CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
-                       child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
+    bool const started = start(child, writeEnd, process);
     CloseHandle(writeEnd);
     ChildResult result;
     if (started) {

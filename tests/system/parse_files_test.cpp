@@ -3,7 +3,7 @@
 
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"
-#include "tests/timers/scratch_root.h"
+#include "tests/support/scratch_root.h"
 
 #include <gtest/gtest.h>
 

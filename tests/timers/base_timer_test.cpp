@@ -20,13 +20,12 @@ TEST(BaseTimer, breathes) {
     EXPECT_TRUE(timer.started());
     timer.stop(&pile);
     EXPECT_TRUE(isIdle(timer));
-    auto const [count, total, max, maxCount, min, minCount, suspendTotal, suspendMax] = pile.numbers();
-    EXPECT_EQ(count, 1);
+    Statistics const statistics = pile.statistics();
+    std::int64_t const total = statistics.total;
     EXPECT_GT(total, 0);
     EXPECT_LE(total, BaseTimer::Clock() - before);
-    EXPECT_EQ(max, total);
-    EXPECT_EQ(min, total);
-    EXPECT_EQ(suspendTotal + suspendMax, 0);
+    EXPECT_EQ(statistics,
+              (Statistics{.count = 1, .total = total, .max = total, .maxCount = 1, .min = total, .minCount = 1}));
 }
 
 TEST(BaseTimer, is_its_record_in_memory) {
@@ -96,9 +95,9 @@ TEST(BaseTimer, closes_an_open_suspension_at_the_reading_of_its_stop) {
     timer.suspendStart = timer.zbTimerDat::start; // suspended from the very start on
     nextTick();
     timer.stop(&pile);
-    auto const numbers = pile.numbers();
-    EXPECT_GT(numbers[1], 0);
-    EXPECT_EQ(numbers[1], numbers[6]) << "the whole measurement was suspended";
+    Statistics const statistics = pile.statistics();
+    EXPECT_GT(statistics.total, 0);
+    EXPECT_EQ(statistics.total, statistics.suspendTotal) << "the whole measurement was suspended";
     EXPECT_TRUE(isIdle(timer));
 }
 
@@ -112,11 +111,11 @@ TEST(BaseTimer, stops_only_once) {
     OpenedPile pile("stage", false);
     BaseTimer timer;
     timer.stop(&pile);
-    EXPECT_EQ(pile.numbers()[0], 0);
+    EXPECT_EQ(pile.statistics().count, 0);
     timer.start(false);
     timer.stop(&pile);
     timer.stop(&pile);
-    EXPECT_EQ(pile.numbers()[0], 1);
+    EXPECT_EQ(pile.statistics().count, 1);
     BaseTimer suspended;
     suspended.suspend();
     suspended.stop(&pile);
@@ -143,8 +142,8 @@ TEST(BaseTimer, Kept_timers_02_a_suspension_before_the_start_counts) {
     nextTick();
     timer.start(false);
     timer.stop(&pile);
-    auto const numbers = pile.numbers();
-    EXPECT_GT(numbers[6], numbers[1]) << "suspended for longer than it ran";
+    Statistics const statistics = pile.statistics();
+    EXPECT_GT(statistics.suspendTotal, statistics.total) << "suspended for longer than it ran";
 }
 
 TEST(BaseTimer, counts_ticks_of_the_frequency_it_was_loaded_with) {

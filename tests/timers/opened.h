@@ -1,13 +1,35 @@
 /// \file
-/// Timers whose numbers can be seen, and measurements that took as long as a test wants.
+/// Timers whose statistics can be seen, and measurements that took as long as a test wants.
 
 #ifndef TESTS_TIMERS_OPENED_H
 #define TESTS_TIMERS_OPENED_H
 
 #include <zor_basis/timers.h>
 
-#include <array>
 #include <cstdint>
+#include <ostream>
+#include <string>
+
+/// What a pile has counted. Times are in ticks; `maxCount` and `minCount` tell which measurement was the longest and
+/// which the shortest, from 1 on.
+struct Statistics {
+    std::int64_t count = 0;
+    std::int64_t total = 0;
+    std::int64_t max = 0;
+    std::int64_t maxCount = 0;
+    std::int64_t min = 0;
+    std::int64_t minCount = 0;
+    std::int64_t suspendTotal = 0;
+    std::int64_t suspendMax = 0;
+
+    bool operator==(Statistics const&) const = default;
+};
+
+inline std::ostream& operator<<(std::ostream& out, Statistics const& s) {
+    return out << "count " << s.count << ", total " << s.total << ", max " << s.max << " (" << s.maxCount << "), min "
+               << s.min << " (" << s.minCount << "), suspend total " << s.suspendTotal << ", suspend max "
+               << s.suspendMax;
+}
 
 /// A pile with its statistics laid open.
 template <class Pile>
@@ -15,16 +37,15 @@ class Opened : public Pile {
 public:
     using Pile::Pile;
 
-    /// count, total, max, maxCount, min, minCount, suspendTotal, suspendMax
-    std::array<std::int64_t, 8> numbers() const {
-        return {static_cast<std::int64_t>(this->count_),
-                this->total_,
-                this->max_,
-                static_cast<std::int64_t>(this->maxCount_),
-                this->min_,
-                static_cast<std::int64_t>(this->minCount_),
-                this->suspendTotal_,
-                this->suspendMax_};
+    Statistics statistics() const {
+        return {.count = static_cast<std::int64_t>(this->count_),
+                .total = this->total_,
+                .max = this->max_,
+                .maxCount = static_cast<std::int64_t>(this->maxCount_),
+                .min = this->min_,
+                .minCount = static_cast<std::int64_t>(this->minCount_),
+                .suspendTotal = this->suspendTotal_,
+                .suspendMax = this->suspendMax_};
     }
     static std::int64_t frequency() { return Pile::_freq; }
 };
@@ -41,6 +62,14 @@ inline ZOR_Basis::BaseTimer finished(std::int64_t elapsed, std::int64_t suspende
 inline void pileUp(ZOR_Basis::PileTimer& pile, std::int64_t elapsed, std::int64_t suspended = 0) {
     ZOR_Basis::BaseTimer timer = finished(elapsed, suspended);
     pile.addTotal(timer);
+}
+
+/// How many measurements a row of the timer tells.
+inline std::string countOf(ZOR_Basis::PileTimer* timer) {
+    ZOR_Basis::BufStr<255> line;
+    timer->print(line, 1);
+    std::string const text(line.c_str() + 40, 9);
+    return text.substr(text.find_last_of(' ') + 1);
 }
 
 inline bool isIdle(zbTimerDat const& record) {

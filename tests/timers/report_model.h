@@ -4,7 +4,8 @@
 #ifndef TESTS_TIMERS_REPORT_MODEL_H
 #define TESTS_TIMERS_REPORT_MODEL_H
 
-#include <array>
+#include <zor_basis/text/buf_str.h>
+
 #include <cstdint>
 #include <string>
 
@@ -18,17 +19,42 @@ inline std::string grouped(std::int64_t value, char separator) {
     return text;
 }
 
-/// \param shown  the eight numbers from count to suspend max, in the unit of the row
-inline std::string modelRow(std::string const& name, std::array<std::int64_t, 8> const& shown, char separator) {
-    constexpr std::array<std::size_t, 8> LAST{48, 63, 78, 93, 108, 123, 138, 153};
+/// The numbers of a row from left to right, in its unit.
+struct RowNumbers {
+    std::int64_t count = 0;
+    std::int64_t total = 0;
+    std::int64_t average = 0;
+    std::int64_t max = 0;
+    std::int64_t maxCount = 0;
+    std::int64_t min = 0;
+    std::int64_t suspendTotal = 0;
+    std::int64_t suspendMax = 0;
+};
+
+/// The numbers of a row about one measurement.
+inline RowNumbers measuredOnce(std::int64_t elapsed) {
+    return {.count = 1, .total = elapsed, .average = elapsed, .max = elapsed, .maxCount = 1, .min = elapsed};
+}
+
+inline std::string modelRow(std::string const& name, RowNumbers const& shown, char separator) {
+    struct Column {
+        std::size_t last;
+        std::int64_t number;
+    };
+    Column const columns[] = {{48, shown.count},         {63, shown.total},      {78, shown.average},
+                              {93, shown.max},           {108, shown.maxCount},  {123, shown.min},
+                              {138, shown.suspendTotal}, {153, shown.suspendMax}};
     std::string row = name.substr(0, 156);
     row.resize(156, ' ');
-    for (std::size_t column = 0; column < (shown[0] != 0 ? LAST.size() : 1); ++column) {
-        std::string const text = grouped(shown[column], separator);
-        row.replace(LAST[column] + 1 - text.size(), text.size(), text);
+    for (Column const& column : columns) {
+        std::string const text = grouped(column.number, separator);
+        row.replace(column.last + 1 - text.size(), text.size(), text);
+        if (shown.count == 0) return row;
     }
-    if (shown[0] != 0) row[154] = '\0';
+    row[154] = '\0';
     return row;
 }
+
+inline std::string bytesOfRow(ZOR_Basis::BufStr<255> const& line) { return {line.c_str(), line.size()}; }
 
 #endif

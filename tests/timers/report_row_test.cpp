@@ -17,38 +17,43 @@ constexpr std::int64_t HIGHEST = std::numeric_limits<std::int64_t>::max();
 
 } // namespace
 
+namespace {
+
+struct Placed {
+    Row row;
+    std::int64_t value;
+    std::uint64_t end;
+    char separator;
+    bool terminating;
+    std::string line; // "." is a place that was not touched
+};
+
+Placed const PLACED[] = {
+    {{}, 0, 12, ',', false, "..........0"},
+    {{}, 7, 12, ',', false, "..........7"},
+    {{}, 999, 12, ',', false, "........999"},
+    {{}, 1000, 12, ',', false, "......1,000"},
+    {{}, 1234567, 12, ',', false, "..1,234,567"},
+    {{}, 1234567, 12, '\0', false, "....1234567"},
+    {{}, 1234567, 12, '\'', false, "..1'234'567"},
+    {{}, -5, 12, ',', false, ".........-5"},
+    {{}, -123, 12, ',', false, ".......-123"}, // no separator before the sign
+    {{}, -1234, 12, ',', false, ".....-1,234"},
+    {{}, 42, 12, ',', true, std::string(".........42") + '\0'},
+    {{}, 12345678, 9, ',', false, ".345,678"}, // the first place is never reached
+    {{}, 12345678, 9, '\0', false, ".2345678"},
+    {{}, 1234, 5, ',', false, ".234"},
+    {{}, 5, 2, ',', false, ""},
+};
+
+} // namespace
+
 TEST(ReportRow, places_numbers_from_the_right) {
-    struct Case {
-        Row row;
-        std::int64_t value;
-        std::uint64_t end;
-        char separator;
-        bool terminating;
-        std::string line; // "." is a place that was not touched, "0" behind "|" stands for the zero byte
-    };
-    std::string const dots(20, '.');
-    auto const padded = [](std::string text) { return text + std::string(20 - text.size(), '.'); };
-    for (Case const& c : {
-             Case{{}, 0, 12, ',', false, padded("..........0")},
-             Case{{}, 7, 12, ',', false, padded("..........7")},
-             Case{{}, 999, 12, ',', false, padded("........999")},
-             Case{{}, 1000, 12, ',', false, padded("......1,000")},
-             Case{{}, 1234567, 12, ',', false, padded("..1,234,567")},
-             Case{{}, 1234567, 12, '\0', false, padded("....1234567")},
-             Case{{}, 1234567, 12, '\'', false, padded("..1'234'567")},
-             Case{{}, -5, 12, ',', false, padded(".........-5")},
-             Case{{}, -123, 12, ',', false, padded(".......-123")}, // no separator before the sign
-             Case{{}, -1234, 12, ',', false, padded(".....-1,234")},
-             Case{{}, 42, 12, ',', true, padded(std::string(".........42") + '\0')},
-             Case{{}, 12345678, 9, ',', false, padded(".345,678")}, // the first place is never reached
-             Case{{}, 12345678, 9, '\0', false, padded(".2345678")},
-             Case{{}, 1234, 5, ',', false, padded(".234")},
-             Case{{}, 5, 2, ',', false, dots},
-         }) {
+    for (Placed const& c : PLACED) {
         SCOPED_TRACE(c.row);
-        std::string line = dots;
+        std::string line(20, '.');
         ReportRow::placeNumber(line.data(), c.value, c.end, c.separator, c.terminating);
-        EXPECT_EQ(line, c.line);
+        EXPECT_EQ(line, c.line + std::string(20 - c.line.size(), '.'));
     }
 }
 

@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-TEST(TimersOncePosix, reports_beneath_the_root_of_the_file_system) {
+TEST(TimerMgrMgrOncePosix, reports_beneath_the_root_of_the_file_system) {
     // Both calls fail, so that nothing is left there.
     ChildResult const result = run({"timers_child",
                                     {"new", "report", "folder"},

@@ -5,10 +5,10 @@
 
 #include <xos_host.h>
 
+#include "tests/support/scratch_root.h"
 #include "tests/timers/assertions.h"
 #include "tests/timers/opened.h"
 #include "tests/timers/report_model.h"
-#include "tests/timers/scratch_root.h"
 
 #include <gtest/gtest.h>
 
@@ -25,13 +25,13 @@ namespace {
 
 std::int64_t secondsToTell = 0;
 
-class TimerReport : public testing::Test {
+class ReportFileInFolder : public testing::Test {
 protected:
-    TimerReport() {
+    ReportFileInFolder() {
         secondsToTell = 1'700'000'000;
         reportTime = [] { return secondsToTell; };
     }
-    ~TimerReport() override {
+    ~ReportFileInFolder() override {
         xos_HostFailClear();
         reportTime = original_;
         for (auto const& entry : fs::directory_iterator(folder())) fs::remove(entry);
@@ -66,7 +66,7 @@ constexpr char HEAD[] =
 
 } // namespace
 
-TEST_F(TimerReport, is_written_byte_for_byte) {
+TEST_F(ReportFileInFolder, is_written_byte_for_byte) {
     TimerMgrImpl manager("render", 2);
     PileTimer* const page = manager.createTimer("render page", 1, false);
     manager.createTimer("a stage that never ran", 0, true);
@@ -87,7 +87,7 @@ TEST_F(TimerReport, is_written_byte_for_byte) {
     EXPECT_EQ(files(), 1u);
 }
 
-TEST_F(TimerReport, starts_all_timers_afresh) {
+TEST_F(ReportFileInFolder, starts_all_timers_afresh) {
     TimerMgrImpl manager("afresh", 0);
     manager.setActive(true);
     PileTimer* const timer = manager.createTimer("timer", 0, false);
@@ -95,14 +95,13 @@ TEST_F(TimerReport, starts_all_timers_afresh) {
     manager.reset(true);
     secondsToTell += 1;
     manager.reset(true);
-    EXPECT_NE(content("1700000000_afresh_0.timer").find(modelRow("timer", {1, 5, 5, 5, 1, 5, 0, 0}, ',')),
-              std::string::npos);
+    EXPECT_NE(content("1700000000_afresh_0.timer").find(modelRow("timer", measuredOnce(5), ',')), std::string::npos);
     EXPECT_NE(content("1700000001_afresh_0.timer").find(modelRow("timer", {}, ',') + "\n"), std::string::npos);
     EXPECT_EQ(timer->id(), 0u);
     EXPECT_STREQ(timer->cname(), "timer");
 }
 
-TEST_F(TimerReport, is_not_written_without_print_or_by_an_inactive_manager) {
+TEST_F(ReportFileInFolder, is_not_written_without_print_or_by_an_inactive_manager) {
     TimerMgrImpl manager("silent", 0);
     manager.createTimer("timer", 0, false);
     manager.reset(true);
@@ -111,12 +110,12 @@ TEST_F(TimerReport, is_not_written_without_print_or_by_an_inactive_manager) {
     EXPECT_EQ(files(), 0u);
 }
 
-TEST_F(TimerReport, has_a_head_alone_without_timers) {
+TEST_F(ReportFileInFolder, has_a_head_alone_without_timers) {
     TimerMgrImpl(nullptr, 9).resetTimers(true);
     EXPECT_EQ(content("1700000000__0.timer"), HEAD);
 }
 
-TEST_F(TimerReport, has_rows_by_id_whatever_the_order_of_making) {
+TEST_F(ReportFileInFolder, has_rows_by_id_whatever_the_order_of_making) {
     TimerMgrImpl manager("order", 30);
     for (int id : {20, 3, 11, 30, 1}) manager.createTimer(("t" + std::to_string(id)).c_str(), id, false);
     manager.resetTimers(true);
@@ -125,13 +124,13 @@ TEST_F(TimerReport, has_rows_by_id_whatever_the_order_of_making) {
     EXPECT_EQ(content("1700000000_order_0.timer"), expected);
 }
 
-TEST_F(TimerReport, tells_seconds_as_a_signed_32_bit_number) {
+TEST_F(ReportFileInFolder, tells_seconds_as_a_signed_32_bit_number) {
     secondsToTell = 0x80000001;
     TimerMgrImpl("late", 0).resetTimers(true);
     EXPECT_EQ(content("-2147483647_late_0.timer").substr(0, 33), "Log timestamp (sec): -2147483647\n");
 }
 
-TEST_F(TimerReport, is_opened_for_appending_and_written_row_by_row) {
+TEST_F(ReportFileInFolder, is_opened_for_appending_and_written_row_by_row) {
     TimerMgrImpl manager("calls", 0);
     for (int i = 0; i < 3; ++i) manager.createTimer("timer", 0, false);
     xos_HostCallsReset();
@@ -145,17 +144,17 @@ TEST_F(TimerReport, is_opened_for_appending_and_written_row_by_row) {
     EXPECT_EQ(xos_HostCalls("xos_SemGive"), 1u);
 }
 
-TEST_F(TimerReport, Kept_timers_08_of_the_same_second_is_appended) {
+TEST_F(ReportFileInFolder, Kept_timers_08_of_the_same_second_is_appended) {
     TimerMgrImpl manager("again", 0);
     PileTimer* const timer = manager.createTimer("timer", 0, false);
     pileMicroseconds(timer, 5);
     manager.resetTimers(true);
     manager.resetTimers(true);
-    EXPECT_EQ(content("1700000000_again_0.timer"), HEAD + modelRow("timer", {1, 5, 5, 5, 1, 5, 0, 0}, ',') + "\n" +
-                                                       HEAD + modelRow("timer", {}, ',') + "\n");
+    EXPECT_EQ(content("1700000000_again_0.timer"),
+              HEAD + modelRow("timer", measuredOnce(5), ',') + "\n" + HEAD + modelRow("timer", {}, ',') + "\n");
 }
 
-TEST_F(TimerReport, Kept_timers_10_resets_also_where_nothing_can_be_written) {
+TEST_F(ReportFileInFolder, Kept_timers_10_resets_also_where_nothing_can_be_written) {
     for (char const* function : {"xos_FileOpen", "xos_FileWriteEx", "xos_FileCloseEx", "xos_SemTake"}) {
         SCOPED_TRACE(function);
         TimerMgrImpl manager("fails", 0);
@@ -173,11 +172,11 @@ TEST_F(TimerReport, Kept_timers_10_resets_also_where_nothing_can_be_written) {
         secondsToTell += 1;
         manager.resetTimers(true);
         EXPECT_EQ(content(std::to_string(secondsToTell) + "_fails_0.timer").substr(sizeof HEAD - 1),
-                  modelRow("timer", {1, 7, 7, 7, 1, 7, 0, 0}, ',') + "\n");
+                  modelRow("timer", measuredOnce(7), ',') + "\n");
     }
 }
 
-TEST_F(TimerReport, makes_its_folder_again_where_it_was_removed) {
+TEST_F(ReportFileInFolder, makes_its_folder_again_where_it_was_removed) {
     Assertions heard;
     TimerMgrImpl manager("again", 0);
     fs::remove_all(folder());
@@ -193,7 +192,7 @@ TEST_F(TimerReport, makes_its_folder_again_where_it_was_removed) {
     fs::create_directories(folder());
 }
 
-TEST_F(TimerReport, tells_that_it_cannot_be_opened) {
+TEST_F(ReportFileInFolder, tells_that_it_cannot_be_opened) {
     Assertions heard;
     TimerMgrImpl manager("lost", 0);
     PileTimer* const timer = manager.createTimer("timer", 0, false);
@@ -222,7 +221,7 @@ TEST_F(TimerReport, tells_that_it_cannot_be_opened) {
     EXPECT_EQ(content("1700000000_lost_0.timer"), HEAD + modelRow("timer", {}, ',') + "\n") << "the timers were reset";
 }
 
-TEST_F(TimerReport, lacks_just_the_row_whose_write_fails) {
+TEST_F(ReportFileInFolder, lacks_just_the_row_whose_write_fails) {
     for (std::uint32_t skip : {0u, 1u, 2u}) {
         secondsToTell += 1;
         TimerMgrImpl manager("part", 0);
@@ -239,7 +238,7 @@ TEST_F(TimerReport, lacks_just_the_row_whose_write_fails) {
     }
 }
 
-TEST_F(TimerReport, may_be_written_while_threads_pile) {
+TEST_F(ReportFileInFolder, may_be_written_while_threads_pile) {
     TimerMgrImpl manager("busy", 3);
     PileTimer* const timer = manager.createTimer("timer", 1, true);
     manager.setActive(true);
@@ -252,7 +251,7 @@ TEST_F(TimerReport, may_be_written_while_threads_pile) {
     EXPECT_EQ(content("1700000000_busy_0.timer").size(), 20 * (sizeof HEAD - 1 + 157));
 }
 
-TEST(TimerReportTime, is_that_of_the_system) {
+TEST(ReportTime, is_that_of_the_system) {
     std::int64_t const before = std::time(nullptr);
     std::int64_t const told = reportTime();
     EXPECT_GE(told, before);

@@ -1,4 +1,4 @@
-#include "tests/timers/scratch_root.h"
+#include "tests/support/scratch_root.h"
 
 #include <xos_host.h>
 
@@ -29,6 +29,6 @@ testing::Environment* const environment = testing::AddGlobalTestEnvironment(new 
 
 fs::path const& scratchRoot() {
     static fs::path const root =
-        fs::canonical(fs::temp_directory_path()) / ("zb_timers_" + std::to_string(std::random_device()()));
+        fs::canonical(fs::temp_directory_path()) / ("zb_tests_" + std::to_string(std::random_device()()));
     return root;
 }

@@ -1,8 +1,8 @@
 /// \file
 /// A root folder for the whole test program, empty at its start and gone at its end.
 
-#ifndef TESTS_TIMERS_SCRATCH_ROOT_H
-#define TESTS_TIMERS_SCRATCH_ROOT_H
+#ifndef TESTS_SUPPORT_SCRATCH_ROOT_H
+#define TESTS_SUPPORT_SCRATCH_ROOT_H
 
 #include <filesystem>
 

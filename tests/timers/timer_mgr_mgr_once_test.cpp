@@ -1,7 +1,7 @@
 // The registry is made once in a process, so each case has a child of its own.
 
 #include "tests/support/child.h"
-#include "tests/timers/scratch_root.h"
+#include "tests/support/scratch_root.h"
 
 #include <gtest/gtest.h>
 
@@ -14,9 +14,9 @@ namespace fs = std::filesystem;
 namespace {
 
 /// A root of its own for each case.
-class TimersOnce : public testing::Test {
+class TimerMgrMgrOnce : public testing::Test {
 protected:
-    TimersOnce() { fs::create_directories(root_); }
+    TimerMgrMgrOnce() { fs::create_directories(root_); }
 
     std::string after(std::vector<std::string> const& steps, std::string const& root, std::string const& faults = {}) {
         ChildResult const result =
@@ -43,7 +43,7 @@ protected:
 
 } // namespace
 
-TEST_F(TimersOnce, makes_its_folder_with_the_first_of_all_calls) {
+TEST_F(TimerMgrMgrOnce, makes_its_folder_with_the_first_of_all_calls) {
     after({});
     EXPECT_FALSE(fs::exists(root_ / "timer")) << "not before";
     for (char const* step : {"mgr", "new", "get", "rip=0"}) {
@@ -55,17 +55,17 @@ TEST_F(TimersOnce, makes_its_folder_with_the_first_of_all_calls) {
     }
 }
 
-TEST_F(TimersOnce, Kept_timers_11_the_first_rip_number_other_than_0_stays) {
+TEST_F(TimerMgrMgrOnce, Kept_timers_11_the_first_rip_number_other_than_0_stays) {
     after({"new", "report", "rip=0", "report", "rip=7", "rip=9", "rip=0", "report"});
     EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_0.timer", "_child_7.timer"}));
 }
 
-TEST_F(TimersOnce, takes_a_negative_rip_number) {
+TEST_F(TimerMgrMgrOnce, takes_a_negative_rip_number) {
     after({"rip=-3", "rip=4", "new", "report"});
     EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_-3.timer"}));
 }
 
-TEST_F(TimersOnce, goes_on_without_a_folder) {
+TEST_F(TimerMgrMgrOnce, goes_on_without_a_folder) {
     std::string const root = root_.generic_string();
     EXPECT_EQ(after({"new", "report", "get"}, root, "xos_DirCreateEx:0:2"), "report\nfound\n");
     EXPECT_FALSE(fs::exists(root_ / "timer"));
@@ -76,15 +76,15 @@ TEST_F(TimersOnce, goes_on_without_a_folder) {
     EXPECT_FALSE(fs::exists(root_ / "missing")) << "parents are not made";
 }
 
-TEST_F(TimersOnce, goes_on_without_semaphores) {
+TEST_F(TimerMgrMgrOnce, goes_on_without_semaphores) {
     EXPECT_EQ(after({"new", "report", "get", "rip=5", "report"}, root_.generic_string(), "xos_SemMCreate:0:100"),
               "report\nfound\nreport\n");
     EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_0.timer", "_child_5.timer"}));
 }
 
-TEST_F(TimersOnce, makes_one_registry_for_many_threads) { EXPECT_EQ(after({"race"}), "one\n"); }
+TEST_F(TimerMgrMgrOnce, makes_one_registry_for_many_threads) { EXPECT_EQ(after({"race"}), "one\n"); }
 
-TEST_F(TimersOnce, uses_the_current_folder_without_a_configured_root) {
+TEST_F(TimerMgrMgrOnce, uses_the_current_folder_without_a_configured_root) {
     after({"new", "report"}, "");
     EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_0.timer"}));
 }
