@@ -1,5 +1,6 @@
 #include <zor_basis/containers/ptr_array.h>
 
+#include "tests/support/operations.h"
 #include "tests/support/random_steps.h"
 
 #include <gtest/gtest.h>
@@ -118,34 +119,55 @@ TEST(PtrArray, copies_the_slots_into_a_block_of_its_own) {
     EXPECT_EQ(copy[40], &values[1]);
 }
 
-TEST(PtrArrayModel, stays_what_a_plain_vector_is) {
+namespace {
+
+struct ArrayBesideVector {
+    std::uint64_t below(std::uint64_t bound) { return random() % bound; }
+    int* pointer() { return below(5) == 0 ? nullptr : &values[below(64)]; }
+
     std::mt19937_64 random = randomSource();
-    Array array(random() % 3);
-    std::vector<int*> model;
+    Array array{below(3)};
+    std::vector<int*> pointers;
+};
+
+void insertBack(ArrayBesideVector& both) {
+    int* const pointer = both.pointer();
+    ASSERT_EQ(both.array.insertBack(pointer), both.pointers.size());
+    both.pointers.push_back(pointer);
+}
+
+void set(ArrayBesideVector& both) {
+    int* const pointer = both.pointer();
+    std::uint64_t const index = both.below(40);
+    both.array.set(pointer, index);
+    if (index >= both.pointers.size()) both.pointers.resize(index + 1);
+    both.pointers[index] = pointer;
+}
+
+void makeAnew(ArrayBesideVector& both) {
+    both.array = Array(both.below(20));
+    both.pointers.clear();
+}
+
+constexpr Operation<ArrayBesideVector> ARRAY_OPERATIONS[] = {
+    {"insert at the back", 20, insertBack},
+    {"set", 20, set},
+    {"make anew", 1, makeAnew},
+};
+
+} // namespace
+
+TEST(PtrArrayModel, stays_what_a_plain_vector_is) {
+    ArrayBesideVector both;
     for (std::uint64_t step = randomSteps(100'000); step > 0; --step) {
-        int* const pointer = random() % 5 == 0 ? nullptr : &values[random() % 64];
-        std::uint64_t const capacity = array.capacity();
-        switch (random() % 3) {
-        case 0:
-            ASSERT_EQ(array.insertBack(pointer), model.size());
-            model.push_back(pointer);
-            break;
-        case 1: {
-            std::uint64_t const index = random() % 40;
-            array.set(pointer, index);
-            if (index >= model.size()) model.resize(index + 1);
-            model[index] = pointer;
-            break;
-        }
-        default:
-            if (random() % 20 == 0) {
-                array = Array(random() % 20);
-                model.clear();
-            }
-        }
-        ASSERT_TRUE(array.capacity() == capacity || array.capacity() >= 2 * capacity);
-        ASSERT_EQ(array.size(), model.size());
-        std::uint64_t const index = random() % (model.size() + 5);
-        ASSERT_EQ(array[index], index < model.size() ? model[index] : nullptr);
+        Operation<ArrayBesideVector> const& operation = drawn(ARRAY_OPERATIONS, both.random);
+        std::uint64_t const capacity = both.array.capacity();
+        operation.act(both);
+        ASSERT_FALSE(testing::Test::HasFatalFailure()) << operation.name;
+        ASSERT_TRUE(both.array.capacity() == capacity || both.array.capacity() >= 2 * capacity ||
+                    both.pointers.empty());
+        ASSERT_EQ(both.array.size(), both.pointers.size());
+        std::uint64_t const index = both.below(both.pointers.size() + 5);
+        ASSERT_EQ(both.array[index], index < both.pointers.size() ? both.pointers[index] : nullptr);
     }
 }

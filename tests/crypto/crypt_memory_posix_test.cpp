@@ -22,7 +22,7 @@ struct Watched {
 
 } // namespace
 
-TEST(CryptMemory, is_wiped_before_it_is_released) {
+TEST(CryptMemoryPosix, is_wiped_before_it_is_released) {
     CryptUser const user;
     {
         Watched const watched;
@@ -47,7 +47,7 @@ TEST(CryptMemory, is_wiped_before_it_is_released) {
     }
 }
 
-TEST(CryptMemory, may_be_short_for_a_hash) {
+TEST(CryptMemoryPosix, may_be_short_for_a_hash) {
     CryptUser const user;
     Watched const watched(0);
     std::unique_ptr<CrHash> const hash(user.crypt->createHash());
@@ -56,7 +56,7 @@ TEST(CryptMemory, may_be_short_for_a_hash) {
     EXPECT_FALSE(hash->hashData("x", 1));
 }
 
-TEST(CryptMemory, may_be_short_for_a_key) {
+TEST(CryptMemoryPosix, may_be_short_for_a_key) {
     CryptUser const user;
     std::unique_ptr<CrHash> const hash = user.hash("secret");
     Watched const watched(0);
@@ -65,7 +65,7 @@ TEST(CryptMemory, may_be_short_for_a_key) {
     EXPECT_FALSE(key->isValid());
 }
 
-TEST(CryptMemory, may_be_short_for_an_exported_key) {
+TEST(CryptMemoryPosix, may_be_short_for_an_exported_key) {
     CryptUser const user;
     std::unique_ptr<CrHash> const hash = user.hash("secret");
     for (std::size_t lacking : {0, 1}) {
@@ -80,7 +80,7 @@ TEST(CryptMemory, may_be_short_for_an_exported_key) {
     }
 }
 
-TEST(CryptMemory, may_be_short_for_a_message) {
+TEST(CryptMemoryPosix, may_be_short_for_a_message) {
     CryptUser const user;
     std::unique_ptr<CrKey> const key = user.key("secret");
     Blob const plain = blobOf("message");

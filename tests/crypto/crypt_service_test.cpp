@@ -90,14 +90,14 @@ std::uint32_t lastError() {
     return record->real.lastError();
 }
 
-struct CryptServiceTest : testing::Test {
-    CryptServiceTest() {
+struct CryptServiceRecorded : testing::Test {
+    CryptServiceRecorded() {
         record = &record_;
         record_.real = cryptService;
         cryptService = {acquire,   createHash, hashData, destroyHash, deriveKey,
                         exportKey, encrypt,    decrypt,  destroyKey,  lastError};
     }
-    ~CryptServiceTest() override {
+    ~CryptServiceRecorded() override {
         EXPECT_TRUE(record_.hashes.empty());
         EXPECT_TRUE(record_.keys.empty());
         EXPECT_EQ(record_.wronglyDestroyed, 0u);
@@ -138,7 +138,7 @@ void expectUseless(CrKey* key) {
 
 } // namespace
 
-TEST_F(CryptServiceTest, is_asked_for_a_new_set_of_keys_only_where_there_is_none) {
+TEST_F(CryptServiceRecorded, is_asked_for_a_new_set_of_keys_only_where_there_is_none) {
     std::unique_ptr<Crypt> const first(Crypt::make(""));
     EXPECT_TRUE(first->isValid());
     EXPECT_EQ(record_.newKeySets, std::vector<bool>{false});
@@ -151,7 +151,7 @@ TEST_F(CryptServiceTest, is_asked_for_a_new_set_of_keys_only_where_there_is_none
     EXPECT_EQ(record_.lastErrors, 0);
 }
 
-TEST_F(CryptServiceTest, Kept_crypto_03_may_be_missing_and_nobody_is_told) {
+TEST_F(CryptServiceRecorded, Kept_crypto_03_may_be_missing_and_nobody_is_told) {
     fail("acquire", 100);
     testing::internal::CaptureStdout();
     testing::internal::CaptureStderr();
@@ -171,7 +171,7 @@ TEST_F(CryptServiceTest, Kept_crypto_03_may_be_missing_and_nobody_is_told) {
     expectUseless(none.get());
 }
 
-TEST_F(CryptServiceTest, may_refuse_a_hash) {
+TEST_F(CryptServiceRecorded, may_refuse_a_hash) {
     CryptUser const user;
     fail("createHash");
     std::unique_ptr<CrHash> const hash(user.crypt->createHash());
@@ -181,7 +181,7 @@ TEST_F(CryptServiceTest, may_refuse_a_hash) {
     EXPECT_TRUE(user.hash("secret")->isValid()) << "the next one is good";
 }
 
-TEST_F(CryptServiceTest, may_refuse_data) {
+TEST_F(CryptServiceRecorded, may_refuse_data) {
     CryptUser const user;
     std::unique_ptr<CrHash> const hash(user.crypt->createHash());
     fail("hashData");
@@ -190,7 +190,7 @@ TEST_F(CryptServiceTest, may_refuse_data) {
     EXPECT_TRUE(hash->hashData("secret", 6));
 }
 
-TEST_F(CryptServiceTest, may_refuse_a_key) {
+TEST_F(CryptServiceRecorded, may_refuse_a_key) {
     CryptUser const user;
     fail("deriveKey");
     expectUseless(user.key("secret").get());
@@ -198,7 +198,7 @@ TEST_F(CryptServiceTest, may_refuse_a_key) {
     EXPECT_EQ(record_.exportables, (std::vector<bool>{false, false}));
 }
 
-TEST_F(CryptServiceTest, may_refuse_to_export) {
+TEST_F(CryptServiceRecorded, may_refuse_to_export) {
     CryptUser const user;
     for (char const* name : {"deriveKey", "exportLength", "exportKey"}) {
         SCOPED_TRACE(name);
@@ -218,7 +218,7 @@ TEST_F(CryptServiceTest, may_refuse_to_export) {
     }
 }
 
-TEST_F(CryptServiceTest, is_asked_to_export_by_the_length_that_it_told) {
+TEST_F(CryptServiceRecorded, is_asked_to_export_by_the_length_that_it_told) {
     CryptUser const user;
     for (std::uint64_t room : {0, 5, 27, 28, 29, 100}) {
         SCOPED_TRACE(room);
@@ -232,7 +232,7 @@ TEST_F(CryptServiceTest, is_asked_to_export_by_the_length_that_it_told) {
     }
 }
 
-TEST_F(CryptServiceTest, may_export_less_than_it_told) {
+TEST_F(CryptServiceRecorded, may_export_less_than_it_told) {
     CryptUser const user;
     static bool (*real)(Handle, char*, std::uint32_t&);
     real = cryptService.exportKey;
@@ -250,7 +250,7 @@ TEST_F(CryptServiceTest, may_export_less_than_it_told) {
     EXPECT_EQ(out.sizeBuf(), 40u);
 }
 
-TEST_F(CryptServiceTest, Kept_crypto_04_may_refuse_to_encrypt_and_leaves_the_message) {
+TEST_F(CryptServiceRecorded, Kept_crypto_04_may_refuse_to_encrypt_and_leaves_the_message) {
     CryptUser const user;
     std::unique_ptr<CrKey> const key = user.key("secret");
     Blob const plain = blobOf("message");
@@ -268,7 +268,7 @@ TEST_F(CryptServiceTest, Kept_crypto_04_may_refuse_to_encrypt_and_leaves_the_mes
     EXPECT_EQ(same, out);
 }
 
-TEST_F(CryptServiceTest, need_not_tell_the_padded_length_where_there_is_room) {
+TEST_F(CryptServiceRecorded, need_not_tell_the_padded_length_where_there_is_room) {
     CryptUser const user;
     std::unique_ptr<CrKey> const key = user.key("secret");
     std::string const expected = encrypted(*key, "message");
@@ -291,7 +291,7 @@ TEST_F(CryptServiceTest, need_not_tell_the_padded_length_where_there_is_room) {
     EXPECT_EQ(none.size(), 0u);
 }
 
-TEST_F(CryptServiceTest, may_refuse_to_decrypt) {
+TEST_F(CryptServiceRecorded, may_refuse_to_decrypt) {
     CryptUser const user;
     std::unique_ptr<CrKey> const key = user.key("secret");
     Blob const message = blobOf(encrypted(*key, "message"));
@@ -303,7 +303,7 @@ TEST_F(CryptServiceTest, may_refuse_to_decrypt) {
     EXPECT_EQ(bytesOf(out), "message");
 }
 
-TEST_F(CryptServiceTest, never_leaves_anything_behind_whichever_call_fails) {
+TEST_F(CryptServiceRecorded, never_leaves_anything_behind_whichever_call_fails) {
     // The whole way from secret to message and back, with every call failing in turn, once or for good.
     for (int times : {1, 1000}) {
         for (char const* name : {"acquire", "createHash", "hashData", "deriveKey", "exportLength", "exportKey",
@@ -329,7 +329,7 @@ TEST_F(CryptServiceTest, never_leaves_anything_behind_whichever_call_fails) {
     }
 }
 
-TEST_F(CryptServiceTest, gets_back_all_that_10000_calls_took) {
+TEST_F(CryptServiceRecorded, gets_back_all_that_10000_calls_took) {
     CryptUser const user;
     std::size_t most = 0;
     for (int i = 0; i < 10'000; ++i) {
@@ -345,7 +345,7 @@ TEST_F(CryptServiceTest, gets_back_all_that_10000_calls_took) {
     EXPECT_EQ(record_.calls["acquire"], 1);
 }
 
-TEST_F(CryptServiceTest, is_fed_lengths_beyond_32_bits_in_pieces) {
+TEST_F(CryptServiceRecorded, is_fed_lengths_beyond_32_bits_in_pieces) {
     CryptUser const user;
     std::unique_ptr<CrHash> const hash(user.crypt->createHash());
     record_.readsData = false; // so much memory there need not be
@@ -369,7 +369,7 @@ TEST_F(CryptServiceTest, is_fed_lengths_beyond_32_bits_in_pieces) {
     record_.readsData = true;
 }
 
-TEST_F(CryptServiceTest, is_not_asked_for_messages_that_it_cannot_count) {
+TEST_F(CryptServiceRecorded, is_not_asked_for_messages_that_it_cannot_count) {
     CryptUser const user;
     std::unique_ptr<CrKey> const key = user.key("secret");
     std::uint64_t const largest = 4'294'967'287;

@@ -65,81 +65,88 @@ TEST(Wildcard, matches_names_by_their_extension) {
     EXPECT_FALSE(matchesWildcard("*.txt", "note.text"));
 }
 
+namespace {
+
+struct Matching {
+    Row row;
+    char const* pattern;
+    char const* name;
+    bool expected;
+};
+
+Matching const MATCHING[] = {
+    {{}, "", "", true},
+    {{}, "", "a", false},
+    {{}, "a", "", false},
+    {{}, "*", "", true},
+    {{}, "***", "", true},
+    {{}, "?", "", false},
+    {{}, "*?", "", false},
+    {{}, "a", "a", true},
+    {{}, "a", "A", false},
+    {{}, "?", "a", true},
+    {{}, "?", "/", true},
+    {{}, "?", "ab", false},
+    {{}, "a?c", "abc", true},
+    {{}, "a?c", "a/c", true},
+    // the last star takes everything, slashes too
+    {{}, "*", "a/b\\c", true},
+    {{}, "a*", "a", true},
+    {{}, "a*", "a/b", true},
+    {{}, "a*", "b", false},
+    {{}, "*a", "banana", true},
+    {{}, "*an", "banana", false},
+    {{}, "b*n*a", "banana", true},
+    {{}, "*b", "a/b", true},
+    {{}, "*.*", "name", false},
+    {{}, "*.*", "name.", true},
+    {{}, "*.*", ".", true},
+    {{}, "**a**", "xax", true},
+    {{}, "*a*b*a", "aba", true},
+    {{}, "*a*b*a", "ab", false},
+    {{}, "*ab", "b", false},
+    {{}, "x*ab", "xb", false},
+    {{}, "a*a", "a", false},
+    {{}, "ab*bc", "abc", false},
+    // the empty end of the name is tried only against stars
+    {{}, "a*?", "a", false},
+    {{}, "a**", "a", true},
+    // runs of slashes of either kind are one
+    {{}, "a/b", "a\\b", true},
+    {{}, "a//b", "a/b", true},
+    {{}, "a/b", "a/\\/b", true},
+    {{}, "/", "//", true},
+    {{}, "//", "/", true},
+    {{}, "a/", "a", false},
+    {{}, "a", "a/", false},
+    {{}, "?/", "//", true},
+    {{}, "?/", "/", false},
+    {{}, "/?", "//", false},
+    {{}, "*/b", "a//b", true},
+    {{}, "*/", "a", false},
+    {{}, "*/", "///", true},
+    {{}, "*/*/b", "//b", false},
+    {{}, "*/*/b", "/a/b", true},
+    {{}, "/*/", "//", false},
+    // a star that meets a star is an equal character
+    {{}, "*", "*", true},
+    {{}, "*", "*a", false},
+    {{}, "*", "a*", true},
+    {{}, "**", "*a", true},
+    {{}, "*b", "*ab", false},
+    {{}, "**b", "*ab", true},
+    {{}, "a*c", "a*c", true},
+    {{}, "a*c", "a*bc", false},
+    {{}, "*a*", "xa*", true},
+    {{}, "*a*", "xa*y", false},
+    {{}, "*a*", "xa*yaz", true},
+    {{}, "*a*b", "a*xab", true},
+};
+
+} // namespace
+
 TEST(Wildcard, follows_the_rule_of_each_character) {
-    struct Case {
-        Row row;
-        char const* pattern;
-        char const* name;
-        bool expected;
-    };
-    for (Case const& c : {
-             Case{{}, "", "", true},
-             Case{{}, "", "a", false},
-             Case{{}, "a", "", false},
-             Case{{}, "*", "", true},
-             Case{{}, "***", "", true},
-             Case{{}, "?", "", false},
-             Case{{}, "*?", "", false},
-             Case{{}, "a", "a", true},
-             Case{{}, "a", "A", false},
-             Case{{}, "?", "a", true},
-             Case{{}, "?", "/", true},
-             Case{{}, "?", "ab", false},
-             Case{{}, "a?c", "abc", true},
-             Case{{}, "a?c", "a/c", true},
-             // the last star takes everything, slashes too
-             Case{{}, "*", "a/b\\c", true},
-             Case{{}, "a*", "a", true},
-             Case{{}, "a*", "a/b", true},
-             Case{{}, "a*", "b", false},
-             Case{{}, "*a", "banana", true},
-             Case{{}, "*an", "banana", false},
-             Case{{}, "b*n*a", "banana", true},
-             Case{{}, "*b", "a/b", true},
-             Case{{}, "*.*", "name", false},
-             Case{{}, "*.*", "name.", true},
-             Case{{}, "*.*", ".", true},
-             Case{{}, "**a**", "xax", true},
-             Case{{}, "*a*b*a", "aba", true},
-             Case{{}, "*a*b*a", "ab", false},
-             Case{{}, "*ab", "b", false},
-             Case{{}, "x*ab", "xb", false},
-             Case{{}, "a*a", "a", false},
-             Case{{}, "ab*bc", "abc", false},
-             // the empty end of the name is tried only against stars
-             Case{{}, "a*?", "a", false},
-             Case{{}, "a**", "a", true},
-             // runs of slashes of either kind are one
-             Case{{}, "a/b", "a\\b", true},
-             Case{{}, "a//b", "a/b", true},
-             Case{{}, "a/b", "a/\\/b", true},
-             Case{{}, "/", "//", true},
-             Case{{}, "//", "/", true},
-             Case{{}, "a/", "a", false},
-             Case{{}, "a", "a/", false},
-             Case{{}, "?/", "//", true},
-             Case{{}, "?/", "/", false},
-             Case{{}, "/?", "//", false},
-             Case{{}, "*/b", "a//b", true},
-             Case{{}, "*/", "a", false},
-             Case{{}, "*/", "///", true},
-             Case{{}, "*/*/b", "//b", false},
-             Case{{}, "*/*/b", "/a/b", true},
-             Case{{}, "/*/", "//", false},
-             // a star that meets a star is an equal character
-             Case{{}, "*", "*", true},
-             Case{{}, "*", "*a", false},
-             Case{{}, "*", "a*", true},
-             Case{{}, "**", "*a", true},
-             Case{{}, "*b", "*ab", false},
-             Case{{}, "**b", "*ab", true},
-             Case{{}, "a*c", "a*c", true},
-             Case{{}, "a*c", "a*bc", false},
-             Case{{}, "*a*", "xa*", true},
-             Case{{}, "*a*", "xa*y", false},
-             Case{{}, "*a*", "xa*yaz", true},
-             Case{{}, "*a*b", "a*xab", true},
-         }) {
+    for (Matching const& c : MATCHING) {
         SCOPED_TRACE(c.row);
         EXPECT_EQ(matchesWildcard(c.pattern, c.name), c.expected) << c.pattern << " | " << c.name;
         EXPECT_EQ(literally<ExactCase>(c.pattern, c.name), c.expected) << c.pattern << " | " << c.name;

@@ -6,7 +6,7 @@
 
 using namespace ZOR_Basis;
 
-TEST(CheckedFrequency, Kept_timers_03_of_a_missing_counter_is_reported_under_an_old_name) {
+TEST(CheckedFrequency, Kept_timers_03_that_is_missing_is_reported_under_an_old_name) {
     Assertions assertions;
     EXPECT_EQ(checkedFrequency({true, 10'000'000}), 10'000'000);
     EXPECT_EQ(assertions.take(), "");

@@ -11,7 +11,7 @@
 
 using namespace ZOR_Basis;
 
-TEST(HashWays, agree_for_every_length) {
+TEST(HashDjb2Ways, agree_for_every_length) {
     std::mt19937_64 random(7);
     for (std::size_t size = 0; size < 300; ++size) {
         for (int round = 0; round < 20; ++round) {
