@@ -23,16 +23,17 @@
 class DrivenLoggers : public testing::Test {
 protected:
     static constexpr std::uint32_t PERIOD = ZOR_Basis::LoggerImpl::PERIOD_MS;
+    static constexpr std::size_t BLOCK = ZOR_Basis::LoggerImpl::BLOCK_SIZE;
 
     DrivenLoggers() {
         handClock = 1'000'000;
-        self = this;
+        current_ = this;
         ZOR_Basis::systemCalls.openStream = open;
     }
     ~DrivenLoggers() override {
         xos_HostFailClear();
         ZOR_Basis::systemCalls.openStream = realOpen_;
-        self = nullptr;
+        current_ = nullptr;
         for (ZOR_Basis::LoggerImpl* logger : loggers_) {
             HQ_Basis::AlertTimer::Delete(logger->alertId());
             delete logger;
@@ -57,6 +58,9 @@ protected:
     }
     ZOR_Basis::LoggerImpl& start() { return start(name()); }
 
+    /// A line of so many bytes, its end included.
+    static std::string lineOf(std::size_t sizeWithEnd, char c = 'x') { return std::string(sizeWithEnd - 1, c); }
+
     static void write(ZOR_Basis::Logger& logger, std::string line) {
         line.append(2, '\0');
         logger.out(line.data());
@@ -77,14 +81,14 @@ protected:
 private:
     static std::FILE* open(char const* path, char const* mode) {
         {
-            std::lock_guard const held(self->openedMutex_);
-            self->opened.push_back(std::string(mode) + " " + path);
+            std::lock_guard const held(current_->openedMutex_);
+            current_->opened.push_back(std::string(mode) + " " + path);
         }
-        if (self->whileOpening) self->whileOpening();
-        return self->failsToOpen ? nullptr : self->realOpen_(path, mode);
+        if (current_->whileOpening) current_->whileOpening();
+        return current_->failsToOpen ? nullptr : current_->realOpen_(path, mode);
     }
 
-    static inline DrivenLoggers* self = nullptr;
+    static inline DrivenLoggers* current_ = nullptr;
     decltype(ZOR_Basis::systemCalls.openStream) const realOpen_ = ZOR_Basis::systemCalls.openStream;
     std::vector<ZOR_Basis::LoggerImpl*> loggers_;
     std::mutex openedMutex_;

@@ -52,4 +52,12 @@ std::string printed(std::size_t room, char const* format, Values... values) {
     return line.data();
 }
 
+/// Compares with `snprintf`. \return whether the short way led there
+template <class... Values>
+bool check(char const* format, Values... values) {
+    Written const written = writtenWith(ROOM, format, values...);
+    EXPECT_EQ(written.ours, printed(ROOM, format, values...)) << format;
+    return written.quickly;
+}
+
 #endif

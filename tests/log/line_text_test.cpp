@@ -1,5 +1,4 @@
 #include "tests/log/line_check.h"
-#include "tests/support/random_steps.h"
 #include "tests/support/skip.h"
 #include "tests/support/table.h"
 
@@ -10,21 +9,11 @@
 #include <climits>
 #include <cmath>
 #include <cstdint>
-#include <cstring>
 #include <limits>
-#include <vector>
 
 using namespace ZOR_Basis;
 
 namespace {
-
-/// Compares with `snprintf`. \return whether the short way led there
-template <class... Values>
-bool check(char const* format, Values... values) {
-    Written const written = writtenWith(ROOM, format, values...);
-    EXPECT_EQ(written.ours, printed(ROOM, format, values...)) << format;
-    return written.quickly;
-}
 
 constexpr double INFINITE = std::numeric_limits<double>::infinity();
 
@@ -62,67 +51,70 @@ TEST(LineText, goes_the_short_way_for_what_lines_consist_of) {
     }
 }
 
+namespace {
+
+constexpr double FIXED_DECIMALS[] = {0.0,
+                                     -0.0,
+                                     1.0,
+                                     -1.0,
+                                     0.5,
+                                     1.5,
+                                     2.5,
+                                     3.5,
+                                     -0.5,
+                                     -2.5,
+                                     0.125,
+                                     0.375,
+                                     0.0625,
+                                     0.1,
+                                     0.2,
+                                     0.3,
+                                     0.005,
+                                     0.015,
+                                     0.025,
+                                     1.005,
+                                     2.675,
+                                     0.9994999,
+                                     0.9995,
+                                     0.99951,
+                                     9.9995,
+                                     99.5,
+                                     999.9996,
+                                     0.0004999,
+                                     0.0005,
+                                     0.00051,
+                                     1e-3,
+                                     1e-5,
+                                     1e-10,
+                                     1e-19,
+                                     5e-20,
+                                     4.9e-20,
+                                     1e-300,
+                                     5e-324,
+                                     DBL_MIN,
+                                     DBL_EPSILON,
+                                     1e6,
+                                     123456.789,
+                                     1e15,
+                                     4503599627370495.5,
+                                     4503599627370496.5,
+                                     9007199254740993.0,
+                                     1e18,
+                                     9.2e18,
+                                     9223372036854774784.0,
+                                     0.3333333333333333,
+                                     1 / 3e9,
+                                     3.141592653589793,
+                                     2.718281828459045e-4,
+                                     4.8828125e-4,
+                                     2.44140625e-4};
+
+} // namespace
+
 TEST(LineText, rounds_fixed_decimals_as_exactly_as_printf) {
-    std::vector<double> const values = {
-        0.0,
-        -0.0,
-        1.0,
-        -1.0,
-        0.5,
-        1.5,
-        2.5,
-        3.5,
-        -0.5,
-        -2.5,
-        0.125,
-        0.375,
-        0.0625,
-        0.1,
-        0.2,
-        0.3,
-        0.005,
-        0.015,
-        0.025,
-        1.005,
-        2.675,
-        0.9994999,
-        0.9995,
-        0.99951,
-        9.9995,
-        99.5,
-        999.9996,
-        0.0004999,
-        0.0005,
-        0.00051,
-        1e-3,
-        1e-5,
-        1e-10,
-        1e-19,
-        5e-20,
-        4.9e-20,
-        1e-300,
-        5e-324,
-        DBL_MIN,
-        DBL_EPSILON,
-        1e6,
-        123456.789,
-        1e15,
-        4503599627370495.5,
-        4503599627370496.5,
-        9007199254740993.0,
-        1e18,
-        9.2e18,
-        9223372036854774784.0,
-        0.3333333333333333,
-        1 / 3e9,
-        3.141592653589793,
-        2.718281828459045e-4,
-        4.8828125e-4,
-        2.44140625e-4,
-    };
     for (char const* format : {"%f", "%.0f", "%.1f", "%.2f", "%.3f", "%.6f", "%.9f", "%.15f", "%.18f", "%.19f", "%lf",
                                "%.f", "%10.3f", "%-10.3f|", "%010.3f", "%+.3f", "% .3f", "%+010.2f", "%5.0f"}) {
-        for (double value : values) {
+        for (double value : FIXED_DECIMALS) {
             EXPECT_TRUE(check(format, value)) << format << " of " << value;
             EXPECT_TRUE(check(format, -value)) << format << " of " << -value;
         }
@@ -204,133 +196,5 @@ TEST(LineText, follows_the_rounding_mode) {
             std::fesetround(mode);
         }
         std::fesetround(FE_TONEAREST);
-    }
-}
-
-/* Random formats and values */
-
-namespace {
-
-class RandomConversion {
-public:
-    explicit RandomConversion(std::mt19937_64& random) : random_(random) {}
-
-    std::string text(char const* kinds, char const* length, bool hasPrecision) {
-        std::string made = "%";
-        char const flags[] = "-0+ ";
-        for (std::uint64_t i = random_() % 8; i < 3; ++i) made += flags[random_() % 4];
-        if (random_() % 3 == 0) made += std::to_string(1 + random_() % (random_() % 8 == 0 ? 60 : 14));
-        if (hasPrecision && random_() % 4 != 0) made += "." + std::to_string(random_() % (random_() % 4 == 0 ? 26 : 8));
-        made += length;
-        return made + kinds[random_() % std::strlen(kinds)];
-    }
-
-private:
-    std::mt19937_64& random_;
-};
-
-double randomDouble(std::mt19937_64& random) {
-    std::uint64_t const bits = random();
-    double number = 0;
-    switch (random() % 6) {
-    case 0: // any bits at all
-        std::memcpy(&number, &bits, sizeof number);
-        return number;
-    case 1: // in the middle between two decimals, or next to it
-        number = static_cast<double>(bits % 20001) / static_cast<double>(std::uint64_t{1} << (random() % 20));
-        return random() % 2 == 0 ? number : std::nextafter(number, random() % 2 == 0 ? 0.0 : 1e300);
-    case 2: // what people write
-        return static_cast<double>(static_cast<std::int64_t>(bits % 2'000'000) - 1'000'000) /
-               std::pow(10.0, static_cast<double>(random() % 9));
-    case 3: // a decimal with a 5 at its end
-        number = (static_cast<double>(bits % 100'000) * 10 + 5) / std::pow(10.0, static_cast<double>(1 + random() % 9));
-        return random() % 2 == 0 ? number : -number;
-    case 4: // whole numbers of all sizes
-        return static_cast<double>(static_cast<std::int64_t>(bits >> (random() % 64)));
-    default: // all sizes that are printed as decimals
-        return std::ldexp(static_cast<double>(bits >> 11), static_cast<int>(random() % 160) - 150);
-    }
-}
-
-std::uint64_t randomInteger(std::mt19937_64& random) {
-    std::uint64_t const number = random() >> (random() % 64);
-    return random() % 2 == 0 ? number : 0 - number;
-}
-
-std::string randomText(std::mt19937_64& random) {
-    std::string text;
-    std::uint64_t const size = random() % (random() % 50 == 0 ? 1100 : 30);
-    while (text.size() < size) text += static_cast<char>('!' + random() % 90);
-    return text;
-}
-
-constexpr char INTEGERS[] = "diuxXo";
-
-} // namespace
-
-TEST(LineText, is_the_one_of_printf_for_random_single_conversions) {
-    std::mt19937_64 random = randomSource();
-    RandomConversion conversion(random);
-    std::uint64_t const steps = randomSteps(400'000);
-    std::uint64_t quick = 0;
-    for (std::uint64_t i = 0; i < steps && !testing::Test::HasFailure(); ++i) {
-        std::uint64_t const n = randomInteger(random);
-        bool const precise = random() % 8 == 0;
-        auto const format = [&](char const* kinds, char const* length, bool hasPrecision) {
-            return "<" + conversion.text(kinds, length, hasPrecision) + ">%%";
-        };
-        switch (random() % 10) {
-        case 0:
-            quick += check(format(INTEGERS, "", precise).c_str(), static_cast<int>(n));
-            break;
-        case 1:
-            quick += check(format(INTEGERS, random() % 2 == 0 ? "h" : "hh", precise).c_str(), static_cast<int>(n));
-            break;
-        case 2:
-            quick += check(format(INTEGERS, "l", precise).c_str(), static_cast<long>(n));
-            break;
-        case 3:
-            quick += check(format(INTEGERS, "ll", precise).c_str(), static_cast<long long>(n));
-            break;
-        case 4:
-            quick += check(format(INTEGERS,
-                                  random() % 3 == 0   ? "z"
-                                  : random() % 2 == 0 ? "j"
-                                                      : "t",
-                                  precise)
-                               .c_str(),
-                           static_cast<std::intmax_t>(n));
-            break;
-        case 5: {
-            std::string const text = randomText(random);
-            quick += check(format("s", "", true).c_str(), text.c_str());
-            break;
-        }
-        case 6:
-            quick += check(format("c", "", false).c_str(), static_cast<int>(1 + n % 255));
-            break;
-        case 7:
-            quick += check(format("fFeEgG", random() % 4 == 0 ? "l" : "", true).c_str(), randomDouble(random));
-            break;
-        default:
-            quick += check(format("f", "", true).c_str(), randomDouble(random));
-            break;
-        }
-    }
-    EXPECT_GT(quick, steps / 3);
-}
-
-TEST(LineText, is_the_one_of_printf_for_random_lines) {
-    std::mt19937_64 random = randomSource();
-    RandomConversion conversion(random);
-    std::uint64_t const steps = randomSteps(200'000);
-    for (std::uint64_t i = 0; i < steps && !testing::Test::HasFailure(); ++i) {
-        std::string const text = randomText(random);
-        std::string const format = randomText(random).substr(0, 3) + " " + conversion.text("s", "", true) + " " +
-                                   conversion.text("d", "", false) + conversion.text("fffg", "", true) +
-                                   conversion.text("ux", "ll", false) + "%%";
-        if (format.substr(0, 3).find('%') != std::string::npos) continue;
-        check(format.c_str(), text.c_str(), static_cast<int>(randomInteger(random)), randomDouble(random),
-              static_cast<unsigned long long>(randomInteger(random)));
     }
 }

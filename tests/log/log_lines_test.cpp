@@ -146,7 +146,7 @@ TEST_F(LogLines, of_many_threads_come_whole) {
     end(log);
 }
 
-/* What never ends is shown in a process of its own. */
+// What never ends is shown in a process of its own.
 
 TEST_F(LogLines, Kept_log_01_of_a_closed_log_are_written_and_its_file_is_then_opened_for_ever) {
     for (char const* how : {"line", "session", "destroyed"}) {

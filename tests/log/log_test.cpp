@@ -1,7 +1,5 @@
 #include <zor_basis/log.h>
 
-#include "tests/support/table.h"
-
 #include <gtest/gtest.h>
 
 #include <type_traits>
@@ -20,12 +18,5 @@ TEST(Log, without_a_name_drops_everything) {
         EXPECT_TRUE(log->flush());
         log->init(nullptr);
         log->out("again");
-    }
-}
-
-TEST(Err, does_nothing) {
-    for (char const* text : {"text", "%s%n", "", static_cast<char const*>(nullptr)}) {
-        Err::err(text);
-        Err::trace(text);
     }
 }

@@ -12,7 +12,7 @@ namespace {
 
 constexpr int WRITERS = 8;
 
-class LoggerThreads : public DrivenLoggers {
+class LoggerImplThreads : public DrivenLoggers {
 protected:
     /// Has eight threads write numbered lines while the alert writes them out as often as it can.
     /// \param afterLine  is called behind each line, with its number
@@ -53,7 +53,7 @@ void expectAllLines(std::string const& text, std::uint64_t lines) {
 
 } // namespace
 
-TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
+TEST_F(LoggerImplThreads, lose_no_line_whatever_is_written_meanwhile) {
     LoggerImpl& logger = start();
     std::uint64_t const lines = randomSteps(2000);
     auto const newSession = [&](std::uint64_t i) {
@@ -67,7 +67,7 @@ TEST_F(LoggerThreads, lose_no_line_whatever_is_written_meanwhile) {
     expectAllLines(all, lines);
 }
 
-TEST_F(LoggerThreads, flush_each_line_once_and_in_order_while_the_alert_writes_too) {
+TEST_F(LoggerImplThreads, flush_each_line_once_and_in_order_while_the_alert_writes_too) {
     LoggerImpl& logger = start();
     std::uint64_t const lines = randomSteps(2000);
     auto const flush = [&](std::uint64_t i) {

@@ -15,7 +15,7 @@ namespace {
 
 constexpr int LINES = 2001;
 
-class LogAtTheEnd : public testing::Test {
+class ProcessEndOfLogs : public testing::Test {
 protected:
     void endBy(char const* how) const {
         ChildResult const result = run({"log_end_child", {how}, {{"XOS_ROOT", root.path()}}, root.path()});
@@ -45,7 +45,7 @@ int numberedLines(std::string const& text) {
 
 } // namespace
 
-TEST_F(LogAtTheEnd, has_every_line_in_its_file_after_a_normal_end) {
+TEST_F(ProcessEndOfLogs, has_every_line_in_its_file_after_a_normal_end) {
     struct Case {
         Row row;
         char const* how;
@@ -66,7 +66,7 @@ TEST_F(LogAtTheEnd, has_every_line_in_its_file_after_a_normal_end) {
     }
 }
 
-TEST_F(LogAtTheEnd, has_each_session_in_its_file) {
+TEST_F(ProcessEndOfLogs, has_each_session_in_its_file) {
     endBy("session");
     EXPECT_EQ(numberedLines(textOfAll()), LINES);
     EXPECT_EQ(numberedLines(textOf(file(0))), 99);
@@ -74,7 +74,7 @@ TEST_F(LogAtTheEnd, has_each_session_in_its_file) {
     EXPECT_FALSE(isThere(LINES / 100 + 1));
 }
 
-TEST_F(LogAtTheEnd, has_the_lines_of_the_thread_that_ends_the_process_while_others_log) {
+TEST_F(ProcessEndOfLogs, has_the_lines_of_the_thread_that_ends_the_process_while_others_log) {
     for (int i = 0; i < 10; ++i) {
         std::filesystem::remove_all(root / "tmp");
         endBy("busy");
@@ -82,7 +82,7 @@ TEST_F(LogAtTheEnd, has_the_lines_of_the_thread_that_ends_the_process_while_othe
     }
 }
 
-TEST_F(LogAtTheEnd, is_written_by_the_library_that_outlives_the_module_which_brought_it) {
+TEST_F(ProcessEndOfLogs, is_written_by_the_library_that_outlives_the_module_which_brought_it) {
     struct Case {
         Row row;
         char const* how;
