@@ -1,8 +1,8 @@
 #include <zor_basis/flat.h>
 
+#include "tests/support/scratch_root.h"
 #include "tests/timers/assertions.h"
 #include "tests/timers/opened.h"
-#include "tests/support/scratch_root.h"
 
 #include <gtest/gtest.h>
 

@@ -2,8 +2,8 @@
 #include <zor_basis/system/parse.h>
 
 #include "tests/support/scratch.h"
-#include "tests/support/table.h"
 #include "tests/support/scratch_root.h"
+#include "tests/support/table.h"
 
 #include <gtest/gtest.h>
 

@@ -119,19 +119,26 @@ TYPED_TEST(BufStrOf, streams_texts_and_numbers) {
     EXPECT_EQ(mixed, "abc1234ef103") << "a character streams as a number";
 }
 
+namespace {
+
+struct NewTail {
+    Row row;
+    char const* before;
+    std::uint64_t position;
+    char const* source;
+    std::uint64_t length;
+    char const* after;
+};
+
+NewTail const NEW_TAILS[] = {{{}, "abcd", 2, "xyz", 0, "abxyz"}, {{}, "abcd", 2, "xyz", 1, "abx"},
+                             {{}, "abcd", 2, "", 0, "ab"},       {{}, "abcd", 2, nullptr, 5, "ab"},
+                             {{}, "abcd", 4, "x", 0, "abcdx"},   {{}, "abcd", 9, "x", 0, "abcdx"},
+                             {{}, "abcd", 0, "x", 0, "x"},       {{}, "abcd", 9, "", 0, "abcd"}};
+
+} // namespace
+
 TYPED_TEST(BufStrOf, replaces_its_tail) {
-    struct Case {
-        Row row;
-        char const* before;
-        std::uint64_t position;
-        char const* source;
-        std::uint64_t length;
-        char const* after;
-    };
-    for (Case const& c :
-         {Case{{}, "abcd", 2, "xyz", 0, "abxyz"}, Case{{}, "abcd", 2, "xyz", 1, "abx"},
-          Case{{}, "abcd", 2, "", 0, "ab"}, Case{{}, "abcd", 2, nullptr, 5, "ab"}, Case{{}, "abcd", 4, "x", 0, "abcdx"},
-          Case{{}, "abcd", 9, "x", 0, "abcdx"}, Case{{}, "abcd", 0, "x", 0, "x"}, Case{{}, "abcd", 9, "", 0, "abcd"}}) {
+    for (NewTail const& c : NEW_TAILS) {
         SCOPED_TRACE(c.row);
         TypeParam s(c.before);
         EXPECT_EQ(&s.replaceTail(c.position, c.source, c.length), &s);
@@ -147,10 +154,10 @@ TYPED_TEST(BufStrOf, replaces_its_tail) {
     own.replaceTail(3, own);
     EXPECT_EQ(own, "acdacdef");
     TypeParam full;
-    for (std::uint64_t i = 0; i < Kind<TypeParam>::Inside; ++i) full += 'x';
+    for (std::uint64_t i = 0; i < Kind<TypeParam>::INSIDE; ++i) full += 'x';
     full.replaceTail(1, full);
-    EXPECT_EQ(full.sizeBuf(), Kind<TypeParam>::Inside + 1);
-    EXPECT_EQ(contentOf(full), std::string(Kind<TypeParam>::Inside + 1, 'x'));
+    EXPECT_EQ(full.sizeBuf(), Kind<TypeParam>::INSIDE + 1);
+    EXPECT_EQ(contentOf(full), std::string(Kind<TypeParam>::INSIDE + 1, 'x'));
 }
 
 TYPED_TEST(BufStrOf, changes_the_case_of_all_its_bytes) {
@@ -175,7 +182,7 @@ TYPED_TEST(BufStrOf, writes_hexadecimal_digits) {
         s.toHex(c.source);
         EXPECT_EQ(s, c.expected);
     }
-    std::uint64_t const n = Kind<TypeParam>::Inside;
+    std::uint64_t const n = Kind<TypeParam>::INSIDE;
     TypeParam grown;
     grown.toHex(std::string(n, 'A').c_str());
     EXPECT_EQ(grown.sizeBuf(), 2 * n) << "exactly the digits";

@@ -10,7 +10,7 @@
 
 using namespace ZOR_Basis;
 
-TEST(TextAtThePagesEnd, is_read_up_to_its_terminator_only) {
+TEST(CharOpsAtPageEndPosix, is_read_up_to_its_terminator_only) {
     LastPage first;
     LastPage second;
     for (std::size_t size = 1; size < 400; size += size < 70 ? 1 : 9) {
@@ -39,7 +39,7 @@ TEST(TextAtThePagesEnd, is_read_up_to_its_terminator_only) {
     }
 }
 
-TEST(TextAtThePagesEnd, wide_text_is_read_up_to_its_terminator_only) {
+TEST(CharOpsAtPageEndPosix, wide_text_is_read_up_to_its_terminator_only) {
     LastPage first;
     LastPage second;
     for (std::size_t size = 1; size < 300; ++size) {

@@ -1,12 +1,10 @@
-// The locale's character set, which only Linux has; convert_code_pages_win_test.cpp is its counterpart.
+// The locale's character set, which Windows has not; convert_code_pages_win_test.cpp is its counterpart.
 
 #include "basis/text/charset_posix.h"
 
-#include <zor_basis/text/convert.h>
-
 #include "tests/support/child.h"
 #include "tests/support/table.h"
-#include "tests/text/reference_utf.h"
+#include "tests/text/convert_check.h"
 
 #include <gtest/gtest.h>
 
@@ -22,9 +20,6 @@ using reference::WideText;
 
 namespace {
 
-std::string bytesOf(BufStr<255> const& text) { return {text.c_str(), text.size()}; }
-WideText unitsOf(WBStr const& text) { return {text.wstr(), text.size()}; }
-
 /// Another set for the length of a test.
 class LocalCharset {
 public:
@@ -32,31 +27,34 @@ public:
     ~LocalCharset() { Charset::setLocal(nullptr); }
 };
 
+struct LocalText {
+    Row row;
+    char const* charset;
+    std::string local;
+    WideText wide;
+};
+
+LocalText const LOCAL_TEXTS[] = {
+    {{}, "ISO-8859-1", "\xE4\xFF", ZB_W("\u00E4\u00FF")},
+    {{}, "ISO-8859-15", "\xA4", ZB_W("\u20AC")},
+    {{}, "KOI8-R", "\xC1\xC2", ZB_W("\u0430\u0431")},
+    {{}, "CP437", "\x84\xE1", ZB_W("\u00E4\u00DF")},
+    {{},
+     "SHIFT_JIS",
+     "\x82\xA0"
+     "a",
+     ZB_W("\u3042"
+          "a")},
+    {{}, "EUC-JP", "\xA4\xA2", ZB_W("\u3042")},
+    {{}, "ISO-2022-JP", "\x1B$B$\"\x1B(B", ZB_W("\u3042")},
+    {{}, "GB18030", "\x94\x39\xFC\x36", {0xD83D, 0xDE00}},
+    {{}, "utf8", "\xC3\xA4", ZB_W("\u00E4")},
+};
+
 } // namespace
 
-TEST(ConvertLocalLinux, converts_by_the_character_set) {
-    struct Case {
-        Row row;
-        char const* charset;
-        std::string local;
-        WideText wide;
-    };
-    for (Case const& c : {
-             Case{{}, "ISO-8859-1", "\xE4\xFF", ZB_W("\u00E4\u00FF")},
-             Case{{}, "ISO-8859-15", "\xA4", ZB_W("\u20AC")},
-             Case{{}, "KOI8-R", "\xC1\xC2", ZB_W("\u0430\u0431")},
-             Case{{}, "CP437", "\x84\xE1", ZB_W("\u00E4\u00DF")},
-             Case{{},
-                  "SHIFT_JIS",
-                  "\x82\xA0"
-                  "a",
-                  ZB_W("\u3042"
-                       "a")},
-             Case{{}, "EUC-JP", "\xA4\xA2", ZB_W("\u3042")},
-             Case{{}, "ISO-2022-JP", "\x1B$B$\"\x1B(B", ZB_W("\u3042")},
-             Case{{}, "GB18030", "\x94\x39\xFC\x36", {0xD83D, 0xDE00}},
-             Case{{}, "utf8", "\xC3\xA4", ZB_W("\u00E4")},
-         }) {
+TEST(CharsetPosix, converts_by_the_character_set) {
+    for (LocalText const& c : LOCAL_TEXTS) {
         SCOPED_TRACE(c.row);
         LocalCharset const charset(c.charset);
         WBStr wide;
@@ -77,7 +75,7 @@ TEST(ConvertLocalLinux, converts_by_the_character_set) {
     }
 }
 
-TEST(ConvertLocalLinux, refuses_what_is_invalid_in_the_set) {
+TEST(CharsetPosix, refuses_what_is_invalid_in_the_set) {
     struct Case {
         Row row;
         char const* charset;
@@ -108,7 +106,7 @@ TEST(ConvertLocalLinux, refuses_what_is_invalid_in_the_set) {
     }
 }
 
-TEST(ConvertLocalLinux, puts_a_question_mark_for_what_the_set_lacks) {
+TEST(CharsetPosix, puts_a_question_mark_for_what_the_set_lacks) {
     struct Case {
         Row row;
         char const* charset;
@@ -137,14 +135,14 @@ TEST(ConvertLocalLinux, puts_a_question_mark_for_what_the_set_lacks) {
     }
 }
 
-TEST(ConvertLocalLinux, fails_for_a_set_that_the_system_does_not_know) {
+TEST(CharsetPosix, fails_for_a_set_that_the_system_does_not_know) {
     LocalCharset const charset("NO-SUCH-SET");
     BufStr<255> narrow("x");
     EXPECT_FALSE(Convert::WideToLocal(ZB_W("a"), narrow));
     EXPECT_TRUE(narrow.empty());
 }
 
-TEST(ConvertLocalLinux, grows_its_output_for_long_text) {
+TEST(CharsetPosix, grows_its_output_for_long_text) {
     LocalCharset const charset("KOI8-R");
     std::string const local(5000, '\xC1');
     WBStr wide;
@@ -157,7 +155,7 @@ TEST(ConvertLocalLinux, grows_its_output_for_long_text) {
     EXPECT_EQ(narrow.sizeBuf(), 5001u);
 }
 
-TEST(ConvertLocalLinux, converts_on_several_threads_at_once) {
+TEST(CharsetPosix, converts_on_several_threads_at_once) {
     LocalCharset const charset("KOI8-R");
     auto work = [] {
         for (int i = 0; i < 2000; ++i) {
@@ -193,7 +191,7 @@ std::string childUnder(Environment const& environment, std::string const& hexTex
 
 } // namespace
 
-TEST(ConvertLocalLinux, takes_the_character_set_from_the_environment) {
+TEST(CharsetPosix, takes_the_character_set_from_the_environment) {
     struct Case {
         Row row;
         Environment environment;
@@ -217,7 +215,7 @@ TEST(ConvertLocalLinux, takes_the_character_set_from_the_environment) {
     }
 }
 
-TEST(ConvertLocalLinux, takes_the_character_set_of_an_installed_locale_whatever_its_name) {
+TEST(CharsetPosix, takes_the_character_set_of_an_installed_locale_whatever_its_name) {
     namespace fs = std::filesystem;
     fs::path const folder = fs::temp_directory_path() / ("zb_locale_" + std::to_string(::getpid()));
     fs::create_directories(folder);

@@ -9,7 +9,7 @@
 
 using namespace ZOR_Basis::detail;
 
-TEST(CompareWays, read_no_page_behind_a_terminator) {
+TEST(CompareTextWaysPosix, read_no_page_behind_a_terminator) {
     LastPage first;
     LastPage second;
     for (std::size_t size = 1; size < 300; ++size) {

@@ -1,6 +1,7 @@
 // The ways in which processors without long vectors compare texts, on whatever processor this is.
 
 #include "basis/text/text_pair.h"
+#include "tests/text/naive_order.h"
 
 #include <gtest/gtest.h>
 
@@ -10,18 +11,16 @@ using namespace ZOR_Basis::detail;
 
 namespace {
 
-constexpr std::size_t LongestMedium = 64;
-
-int sign(int order) { return (order > 0) - (order < 0); }
+constexpr std::size_t LONGEST_MEDIUM = 64;
 
 bool same(std::string const& a, std::string const& b) {
-    return a.size() <= LongestMedium ? sameMediumTexts(a.data(), b.data(), a.size())
-                                     : sameLongTexts<OwnedPair>(a.data(), b.data(), a.size());
+    return a.size() <= LONGEST_MEDIUM ? sameMediumTexts(a.data(), b.data(), a.size())
+                                      : sameLongTexts<OwnedPair>(a.data(), b.data(), a.size());
 }
 
 int order(std::string const& a, std::string const& b) {
-    return sign(a.size() <= LongestMedium ? orderOfMediumTexts(a.data(), b.data(), a.size())
-                                          : orderOfLongTexts<OwnedPair>(a.data(), b.data(), a.size()));
+    return signOf(a.size() <= LONGEST_MEDIUM ? orderOfMediumTexts(a.data(), b.data(), a.size())
+                                             : orderOfLongTexts<OwnedPair>(a.data(), b.data(), a.size()));
 }
 
 std::string makeText(std::size_t size) {
@@ -32,7 +31,7 @@ std::string makeText(std::size_t size) {
 
 } // namespace
 
-TEST(CompareWays, find_a_difference_at_every_place) {
+TEST(CompareTextWays, find_a_difference_at_every_place) {
     for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
         std::string const a = makeText(size);
         ASSERT_TRUE(same(a, a)) << size;
@@ -47,7 +46,7 @@ TEST(CompareWays, find_a_difference_at_every_place) {
     }
 }
 
-TEST(CompareWays, look_no_further_than_a_common_zero) {
+TEST(CompareTextWays, look_no_further_than_a_common_zero) {
     for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
         for (std::size_t zero = 0; zero < size; ++zero) {
             std::string a = makeText(size);
@@ -63,13 +62,13 @@ TEST(CompareWays, look_no_further_than_a_common_zero) {
     }
 }
 
-TEST(CompareWays, go_on_behind_the_length_for_the_order_only) {
+TEST(CompareTextWays, go_on_behind_the_length_for_the_order_only) {
     for (std::size_t size : {17U, 40U, 64U, 65U, 128U, 129U, 200U}) {
         std::string const a = makeText(size) + "1";
         std::string const b = makeText(size) + "2";
-        bool const isLong = size > LongestMedium;
+        bool const isLong = size > LONGEST_MEDIUM;
         EXPECT_TRUE((isLong ? sameLongTexts<OwnedPair> : sameMediumTexts)(a.data(), b.data(), size)) << size;
-        EXPECT_EQ(sign((isLong ? orderOfLongTexts<OwnedPair> : orderOfMediumTexts)(a.data(), b.data(), size)), -1)
+        EXPECT_EQ(signOf((isLong ? orderOfLongTexts<OwnedPair> : orderOfMediumTexts)(a.data(), b.data(), size)), -1)
             << size;
     }
 }

@@ -2,9 +2,8 @@
 
 #include "basis/platform/windows_api.h"
 
-#include <zor_basis/text/convert.h>
-
 #include "tests/support/table.h"
+#include "tests/text/convert_check.h"
 
 #include <gtest/gtest.h>
 
@@ -12,17 +11,12 @@
 
 using namespace ZOR_Basis;
 
-namespace {
-std::string bytesOf(BufStr<255> const& text) { return {text.c_str(), text.size()}; }
-std::wstring unitsOf(WBStr const& text) { return {text.wstr(), text.size()}; }
-} // namespace
-
-TEST(ConvertCodePagesWindows, are_those_that_the_tables_below_are_for) {
+TEST(ConvertCodePagesWin, are_those_that_the_tables_below_are_for) {
     EXPECT_EQ(GetACP(), 1252u);
     EXPECT_EQ(GetOEMCP(), 437u);
 }
 
-TEST(ConvertCodePagesWindows, convert_both_ways) {
+TEST(ConvertCodePagesWin, convert_both_ways) {
     struct Case {
         Row row;
         Convert::Encoding encoding;
@@ -50,7 +44,7 @@ TEST(ConvertCodePagesWindows, convert_both_ways) {
     }
 }
 
-TEST(ConvertCodePagesWindows, go_from_one_page_to_the_other) {
+TEST(ConvertCodePagesWin, go_from_one_page_to_the_other) {
     BufStr<255> narrow;
     EXPECT_TRUE(Convert::EncodeMB(Convert::ENC_OEM, "\x84", Convert::ENC_LOCAL, narrow));
     EXPECT_EQ(bytesOf(narrow), "\xE4");
@@ -64,7 +58,7 @@ TEST(ConvertCodePagesWindows, go_from_one_page_to_the_other) {
     EXPECT_EQ(bytesOf(narrow), "\xFC");
 }
 
-TEST(ConvertCodePagesWindows, put_a_default_for_what_they_lack) {
+TEST(ConvertCodePagesWin, put_a_default_for_what_they_lack) {
     BufStr<255> narrow;
     EXPECT_TRUE(Convert::WideToLocal(L"a\u3042z", narrow));
     EXPECT_EQ(bytesOf(narrow), "a?z");
@@ -72,7 +66,7 @@ TEST(ConvertCodePagesWindows, put_a_default_for_what_they_lack) {
     EXPECT_EQ(bytesOf(narrow), "a?z");
 }
 
-TEST(ConvertCodePagesWindows, refuse_a_byte_without_a_character) {
+TEST(ConvertCodePagesWin, refuse_a_byte_without_a_character) {
     WBStr wide;
     // 1252 as the system has it maps every byte; so only the multi-byte path can fail, through UTF-8.
     EXPECT_TRUE(Convert::LocalToWide("\x81", wide));

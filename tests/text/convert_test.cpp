@@ -1,33 +1,13 @@
-#include <zor_basis/text/convert.h>
+#include "tests/text/convert_check.h"
 
-#include "tests/support/random_steps.h"
 #include "tests/support/table.h"
-#include "tests/text/reference_utf.h"
 
 #include <gtest/gtest.h>
 
-#include <cstring>
 #include <string>
 
 using namespace ZOR_Basis;
 using reference::WideText;
-
-namespace {
-
-std::string bytesOf(BufStr<255> const& text) { return {text.c_str(), text.size()}; }
-WideText unitsOf(WBStr const& text) { return {text.wstr(), text.size()}; }
-
-Convert::Encoding encoding(std::uint32_t value) { return static_cast<Convert::Encoding>(value); }
-
-/// A result that was there before, on the heap, so that a function that forgets to empty its output is seen.
-template <class Text>
-Text filled() {
-    Text text;
-    for (int i = 0; i < 300; ++i) text += 'x';
-    return text;
-}
-
-} // namespace
 
 TEST(Convert, breathes) {
     WBStr wide;
@@ -38,211 +18,40 @@ TEST(Convert, breathes) {
     EXPECT_EQ(bytesOf(narrow), "\xC3\xA4pfel");
 }
 
-// ---- UTF-8 to wide -------------------------------------------------------------------------------------------------
+namespace {
 
-TEST(ConvertUtf8ToWide, accepts_the_bounds_of_every_length) {
-    struct Case {
-        Row row;
-        char const* text;
-        WideText expected;
-    };
-    for (Case const& c : {
-             Case{{}, "\x01", {0x01}},
-             Case{{}, "\x7F", {0x7F}},
-             Case{{}, "\xC2\x80", {0x80}},
-             Case{{}, "\xDF\xBF", {0x7FF}},
-             Case{{}, "\xE0\xA0\x80", {0x800}},
-             Case{{}, "\xED\x9F\xBF", {0xD7FF}},
-             Case{{}, "\xEE\x80\x80", {0xE000}},
-             Case{{}, "\xEF\xBF\xBF", {0xFFFF}},
-             Case{{}, "\xF0\x90\x80\x80", {0xD800, 0xDC00}},
-             Case{{}, "\xF4\x8F\xBF\xBF", {0xDBFF, 0xDFFF}},
-             Case{{},
-                  "\xEF\xBB\xBF"
-                  "a",
-                  {0xFEFF, 'a'}},
-         }) {
-        SCOPED_TRACE(c.row);
-        for (std::string const& around : {std::string(), std::string("ab"), std::string(40, 'z')}) {
-            WBStr wide = filled<WBStr>();
-            EXPECT_TRUE(Convert::Utf8ToWide(around + c.text + around, wide));
-            WideText const side(around.begin(), around.end());
-            EXPECT_EQ(unitsOf(wide), side + c.expected + side);
-        }
-    }
+/// Whether a conversion succeeds and empties the text that was there before.
+template <class Text, class Conversion>
+bool empties(Conversion convert) {
+    Text text = filled<Text>();
+    return convert(text) && text.empty();
 }
 
-TEST(ConvertUtf8ToWide, refuses_every_kind_of_invalid_text_and_leaves_nothing) {
-    struct Case {
-        Row row;
-        char const* text;
-    };
-    for (Case const& c : {
-             Case{{}, "\x80"},         // a continuation alone
-             Case{{}, "\xBF"},         //
-             Case{{}, "\xC3"},         // cut after the first byte
-             Case{{}, "\xE2\x82"},     // cut after the second
-             Case{{}, "\xE2"},         //
-             Case{{}, "\xF0\x9F\x98"}, // cut after the third
-             Case{{}, "\xF0\x9F"},     //
-             Case{{}, "\xF0"},         //
-             Case{{},
-                  "\xC3"
-                  "a"}, // a letter where a continuation belongs
-             Case{{},
-                  "\xE2\x82"
-                  "a"}, //
-             Case{{},
-                  "\xE2"
-                  "a\x82"}, //
-             Case{{},
-                  "\xF0\x9F\x98"
-                  "a"}, //
-             Case{{},
-                  "\xF0\x9F"
-                  "a\x80"}, //
-             Case{{},
-                  "\xF0"
-                  "a\x98\x80"},                    //
-             Case{{}, "\xC3\xC3\xA4"},             // a start where a continuation belongs
-             Case{{}, "\xC0\x80"},                 // overlong
-             Case{{}, "\xC0\xAF"},                 //
-             Case{{}, "\xC1\xBF"},                 //
-             Case{{}, "\xE0\x80\x80"},             //
-             Case{{}, "\xE0\x9F\xBF"},             //
-             Case{{}, "\xF0\x80\x80\x80"},         //
-             Case{{}, "\xF0\x8F\xBF\xBF"},         //
-             Case{{}, "\xED\xA0\x80"},             // a surrogate
-             Case{{}, "\xED\xBF\xBF"},             //
-             Case{{}, "\xED\xA0\xBD\xED\xB8\x80"}, // a pair of them
-             Case{{}, "\xF4\x90\x80\x80"},         // above U+10FFFF
-             Case{{}, "\xF5\x80\x80\x80"},         //
-             Case{{}, "\xF7\xBF\xBF\xBF"},         //
-             Case{{}, "\xF8\x88\x80\x80\x80"},     // no such start
-             Case{{}, "\xFC\x84\x80\x80\x80\x80"}, //
-             Case{{}, "\xFE"},                     //
-             Case{{}, "\xFF"},                     //
-         }) {
-        SCOPED_TRACE(c.row);
-        for (std::string const& around : {std::string(), std::string("ab"), std::string(40, 'z'), std::string(400, 'q'),
-                                          std::string("\xE2\x82\xAC\xE2\x82\xAC\xE2\x82\xAC\xE2\x82\xAC")}) {
-            WBStr wide = filled<WBStr>();
-            EXPECT_FALSE(Convert::Utf8ToWide(around + c.text, wide));
-            EXPECT_EQ(wide.size(), 0u);
-            EXPECT_EQ(wide.wstr()[0], 0);
-            EXPECT_FALSE(Convert::Utf8ToWide(around + c.text + around, wide));
-            EXPECT_EQ(wide.size(), 0u);
-        }
-    }
-}
+} // namespace
 
-TEST(ConvertUtf8ToWide, never_reads_past_the_given_length) {
-    // Cut right behind the first, second and third byte of four, with the rest of the character lying behind.
-    char const text[] = "ab\xF0\x9F\x98\x80";
-    WBStr wide;
-    for (std::uint64_t length : {3u, 4u, 5u}) EXPECT_FALSE(Convert::Utf8ToWide(text, wide, length)) << length;
-    EXPECT_TRUE(Convert::Utf8ToWide(text, wide, 2));
-    EXPECT_EQ(unitsOf(wide), ZB_W("ab"));
-    EXPECT_TRUE(Convert::Utf8ToWide(text, wide, 6));
-    EXPECT_EQ(wide.size(), 4u);
-}
-
-TEST(ConvertUtf8ToWide, takes_a_zero_inside_a_given_length_as_text) {
-    WBStr wide;
-    EXPECT_TRUE(Convert::Utf8ToWide("a\0b", wide, 3));
-    EXPECT_EQ(unitsOf(wide), WideText(ZB_W("a\0b"), 3));
-    EXPECT_TRUE(Convert::Utf8ToWide("\0ab", wide, 3));
-    EXPECT_EQ(unitsOf(wide), WideText(ZB_W("\0ab"), 3));
-}
-
-// ---- wide to UTF-8 -------------------------------------------------------------------------------------------------
-
-TEST(ConvertWideToUtf8, replaces_unpaired_surrogates) {
-    struct Case {
-        Row row;
-        WideText text;
-        char const* expected;
-    };
-    for (Case const& c : {
-             Case{{}, {0xD800}, "\xEF\xBF\xBD"},
-             Case{{}, {0xDC00}, "\xEF\xBF\xBD"},
-             Case{{},
-                  {0xDBFF, 'a'},
-                  "\xEF\xBF\xBD"
-                  "a"},
-             Case{{},
-                  {'a', 0xDFFF, 'b'},
-                  "a\xEF\xBF\xBD"
-                  "b"},
-             Case{{}, {0xDC00, 0xD800}, "\xEF\xBF\xBD\xEF\xBF\xBD"},
-             Case{{}, {0xD800, 0xD800, 0xDC00}, "\xEF\xBF\xBD\xF0\x90\x80\x80"},
-             Case{{}, {0xD83D, 0xDE00}, "\xF0\x9F\x98\x80"},
-             Case{{}, {0xDBFF, 0xDFFF}, "\xF4\x8F\xBF\xBF"},
-             Case{{}, {0x80, 0x7FF, 0x800, 0xFFFF}, "\xC2\x80\xDF\xBF\xE0\xA0\x80\xEF\xBF\xBF"},
-         }) {
-        SCOPED_TRACE(c.row);
-        BufStr<255> narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::WideToUtf8(c.text.c_str(), narrow, c.text.size()));
-        EXPECT_EQ(bytesOf(narrow), c.expected);
-    }
-}
-
-TEST(ConvertWideToUtf8, never_pairs_with_a_unit_past_the_given_length) {
-    WideText const text{'a', 0xD83D, 0xDE00};
-    BufStr<255> narrow;
-    EXPECT_TRUE(Convert::WideToUtf8(text.c_str(), narrow, 2));
-    EXPECT_EQ(bytesOf(narrow), "a\xEF\xBF\xBD");
-}
-
-TEST(ConvertWideToUtf8, Kept_convert_01_a_zero_inside_a_given_length_ends_the_result) {
-    BufStr<255> narrow;
-    EXPECT_TRUE(Convert::WideToUtf8(ZB_W("a\0b"), narrow, 3));
-    EXPECT_EQ(bytesOf(narrow), "a");
-    EXPECT_TRUE(Convert::WideToUtf8(ZB_W("\0b"), narrow, 2));
-    EXPECT_EQ(bytesOf(narrow), "");
-    EXPECT_TRUE(Convert::WideToLocal(ZB_W("a\0b"), narrow, 3));
-    EXPECT_EQ(bytesOf(narrow), "a");
-}
-
-// ---- what all functions share --------------------------------------------------------------------------------------
-
-TEST(Convert, gives_true_and_nothing_for_an_empty_source) {
-    for (char const* text : {static_cast<char const*>(nullptr), ""}) {
-        WBStr wide = filled<WBStr>();
-        EXPECT_TRUE(Convert::Utf8ToWide(text, wide));
-        EXPECT_TRUE(wide.empty());
-        wide = filled<WBStr>();
-        EXPECT_TRUE(Convert::LocalToWide(text, wide));
-        EXPECT_TRUE(wide.empty());
+TEST(Convert, gives_true_and_nothing_for_an_empty_narrow_source) {
+    for (char const* none : {static_cast<char const*>(nullptr), ""}) {
+        EXPECT_TRUE(empties<WBStr>([none](WBStr& out) { return Convert::Utf8ToWide(none, out); }));
+        EXPECT_TRUE(empties<WBStr>([none](WBStr& out) { return Convert::LocalToWide(none, out); }));
         for (std::uint32_t e : {0u, 1u, 2u}) {
-            wide = filled<WBStr>();
-            EXPECT_TRUE(Convert::ToWide(encoding(e), text, wide));
-            EXPECT_TRUE(wide.empty());
+            EXPECT_TRUE(empties<WBStr>([none, e](WBStr& out) { return Convert::ToWide(encoding(e), none, out); }));
         }
-        BufStr<255> narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::EncodeMB(Convert::ENC_UTF8, text, Convert::ENC_LOCAL, narrow));
-        EXPECT_TRUE(narrow.empty());
-        narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::ToLocal(Convert::ENC_OEM, text, narrow));
-        EXPECT_TRUE(narrow.empty());
-        narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::LocalToUtf8(text, narrow));
-        EXPECT_TRUE(narrow.empty());
-        narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::Utf8ToLocal(text, narrow));
-        EXPECT_TRUE(narrow.empty());
+        using Narrow = BufStr<255>;
+        EXPECT_TRUE(empties<Narrow>(
+            [none](Narrow& out) { return Convert::EncodeMB(Convert::ENC_UTF8, none, Convert::ENC_LOCAL, out); }));
+        EXPECT_TRUE(empties<Narrow>([none](Narrow& out) { return Convert::ToLocal(Convert::ENC_OEM, none, out); }));
+        EXPECT_TRUE(empties<Narrow>([none](Narrow& out) { return Convert::LocalToUtf8(none, out); }));
+        EXPECT_TRUE(empties<Narrow>([none](Narrow& out) { return Convert::Utf8ToLocal(none, out); }));
     }
-    for (WChar const* text : {static_cast<WChar const*>(nullptr), ZB_W("")}) {
-        BufStr<255> narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::WideToUtf8(text, narrow));
-        EXPECT_TRUE(narrow.empty());
-        narrow = filled<BufStr<255>>();
-        EXPECT_TRUE(Convert::WideToLocal(text, narrow));
-        EXPECT_TRUE(narrow.empty());
+}
+
+TEST(Convert, gives_true_and_nothing_for_an_empty_wide_source) {
+    using Narrow = BufStr<255>;
+    for (WChar const* none : {static_cast<WChar const*>(nullptr), ZB_W("")}) {
+        EXPECT_TRUE(empties<Narrow>([none](Narrow& out) { return Convert::WideToUtf8(none, out); }));
+        EXPECT_TRUE(empties<Narrow>([none](Narrow& out) { return Convert::WideToLocal(none, out); }));
         for (std::uint32_t e : {0u, 1u, 2u}) {
-            narrow = filled<BufStr<255>>();
-            EXPECT_TRUE(Convert::FromWide(text, encoding(e), narrow));
-            EXPECT_TRUE(narrow.empty());
+            EXPECT_TRUE(empties<Narrow>([none, e](Narrow& out) { return Convert::FromWide(none, encoding(e), out); }));
         }
     }
 }
@@ -331,7 +140,7 @@ TEST(Convert, keeps_a_large_enough_buffer) {
     EXPECT_EQ(wide.wstr(), block);
 }
 
-// ---- narrow to narrow ----------------------------------------------------------------------------------------------
+// ---- narrow to narrow
 
 TEST(ConvertEncodeMB, copies_between_equal_encodings) {
     for (std::uint32_t e : {0u, 1u, 2u, 9u}) {
@@ -385,75 +194,4 @@ TEST(ConvertLocal, takes_ascii_both_ways) {
     EXPECT_EQ(bytesOf(narrow), "Page 1");
     EXPECT_TRUE(Convert::Utf8ToLocal("Page 1", narrow));
     EXPECT_EQ(bytesOf(narrow), "Page 1");
-}
-
-// ---- against the second reading ------------------------------------------------------------------------------------
-
-namespace {
-
-std::uint32_t randomCharacter(std::mt19937_64& random) {
-    static constexpr std::uint32_t limits[] = {0x80, 0x80, 0x800, 0x10000, 0x110000};
-    for (;;) {
-        std::uint32_t const c = static_cast<std::uint32_t>(random() % limits[random() % 5]);
-        if (c != 0 && (c < 0xD800 || c > 0xDFFF)) return c;
-    }
-}
-
-/// Runs of the same kind of character, as the conversions treat those apart.
-std::vector<std::uint32_t> randomCharacters(std::mt19937_64& random) {
-    std::vector<std::uint32_t> found;
-    for (std::uint64_t run = random() % 5; run > 0; --run) {
-        std::uint32_t const c = randomCharacter(random);
-        found.insert(found.end(), random() % (random() % 4 == 0 ? 120 : 20), c);
-        found.push_back(randomCharacter(random));
-    }
-    return found;
-}
-
-} // namespace
-
-TEST(ConvertModel, agrees_with_the_second_reading_on_valid_text) {
-    std::mt19937_64 random = randomSource();
-    for (std::uint64_t step = randomSteps(20'000); step > 0; --step) {
-        std::vector<std::uint32_t> const characters = randomCharacters(random);
-        std::string const narrow = reference::utf8(characters);
-        WideText const wide = reference::utf16(characters);
-        WBStr toWide;
-        ASSERT_TRUE(Convert::Utf8ToWide(narrow.c_str(), toWide, narrow.size()));
-        ASSERT_EQ(unitsOf(toWide), wide);
-        BufStr<255> toNarrow;
-        ASSERT_TRUE(Convert::WideToUtf8(wide.c_str(), toNarrow, wide.size()));
-        ASSERT_EQ(bytesOf(toNarrow), narrow);
-    }
-}
-
-TEST(ConvertModel, agrees_with_the_second_reading_on_damaged_text) {
-    std::mt19937_64 random = randomSource();
-    for (std::uint64_t step = randomSteps(50'000); step > 0; --step) {
-        std::string text = reference::utf8(randomCharacters(random));
-        if (text.empty()) continue;
-        for (std::uint64_t damage = random() % 3; damage > 0; --damage)
-            text[random() % text.size()] = static_cast<char>(1 + random() % 255);
-        text.resize(1 + random() % text.size());
-        auto const expected = reference::characters(text);
-        WBStr wide;
-        ASSERT_EQ(Convert::Utf8ToWide(text.c_str(), wide, text.size()), expected.has_value());
-        ASSERT_EQ(unitsOf(wide), expected ? reference::utf16(*expected) : WideText());
-    }
-}
-
-TEST(ConvertModel, agrees_with_the_second_reading_on_any_units) {
-    std::mt19937_64 random = randomSource();
-    for (std::uint64_t step = randomSteps(50'000); step > 0; --step) {
-        WideText text;
-        for (std::uint64_t n = random() % 60; n > 0; --n) {
-            std::uint64_t const kind = random() % 4;
-            text.push_back(static_cast<WChar>(kind == 0   ? 1 + random() % 0x7F
-                                              : kind == 1 ? 0xD800 + random() % 0x800
-                                                          : 1 + random() % 0xFFFF));
-        }
-        BufStr<255> narrow;
-        ASSERT_TRUE(Convert::WideToUtf8(text.c_str(), narrow, text.size()));
-        ASSERT_EQ(bytesOf(narrow), reference::utf8(reference::characters(text)));
-    }
 }

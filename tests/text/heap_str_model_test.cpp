@@ -1,5 +1,6 @@
 // Random operations on HeapStr beside a standard string and a capacity.
 
+#include "tests/support/operations.h"
 #include "tests/support/random_steps.h"
 #include "tests/text/text_model.h"
 #include "zor_basis/text/heap_str.h"
@@ -21,7 +22,7 @@ public:
     std::uint64_t capacity() const { return capacity_; }
 };
 
-struct Model {
+struct HeapStrModelled {
     std::string content;
     std::uint64_t capacity = 0;
 
@@ -36,109 +37,156 @@ struct Model {
     }
 };
 
-class Walk {
+class HeapStrBesideModel {
 public:
-    Walk() : random_(randomSource()) { string_.emplace(); }
+    HeapStrBesideModel() : random(randomSource()) { remake(); }
 
-    std::string step() {
-        std::string const name = operate(*string_);
-        return model_.agrees(*string_) ? std::string() : name;
-    }
-
-private:
-    std::uint64_t below(std::uint64_t bound) { return random_() % bound; }
+    std::uint64_t below(std::uint64_t bound) { return random() % bound; }
     bool oneIn(std::uint64_t chances) { return below(chances) == 0; }
     std::string text() {
         std::string result(oneIn(10) ? below(300) : below(12), '\0');
         for (char& c : result) c = oneIn(30) ? '\0' : static_cast<char>('A' + below(60));
         return result;
     }
-    static std::uint64_t measured(std::string const& units) { return std::strlen(units.c_str()); }
-
-    std::string operate(Open& s) {
-        std::string const units = text();
-        std::uint64_t const n = oneIn(3) ? units.size() + below(4) : below(units.size() + 1);
-        std::uint64_t const from = below(model_.content.size() + 1);
-        std::string const own = model_.content.substr(from);
-        switch (below(14)) {
-        case 0:
-            s.set(units.c_str());
-            model_.set(units, measured(units));
-            return "set measured";
-        case 1:
-            s.set(units.c_str(), n);
-            model_.set(units, n);
-            return "set";
-        case 2:
-            s = Str(units.c_str(), n);
-            model_.set(units, n);
-            return "assign view";
-        case 3:
-            s = units;
-            model_.set(units, units.size());
-            return "assign standard string";
-        case 4:
-            s = units.c_str();
-            model_.set(units, measured(units));
-            return "assign text";
-        case 5: {
-            Open const other(units.c_str(), n);
-            s = other;
-            model_.set(TextModel<char>::stopAndPad(units, n), n);
-            return "assign string";
-        }
-        case 6:
-            s.set(s.c_str() + from);
-            model_.set(own, measured(own));
-            return "set its own tail";
-        case 7:
-            s.set(s.c_str() + from, n);
-            model_.set(own, n);
-            return "set a part of itself";
-        case 8:
-            s.cut();
-            if (!model_.content.empty()) model_.content.pop_back();
-            return "cut";
-        case 9: {
-            std::uint64_t const place = below(model_.content.size() + 3);
-            s.cut(place);
-            if (place < model_.content.size()) model_.content.resize(place);
-            return "cut to";
-        }
-        case 10:
-            s.toLower();
-            for (char& c : model_.content) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-            return "lower";
-        case 11:
-            if (!oneIn(4)) return "";
-            s.clear();
-            model_ = {};
-            return "clear";
-        case 12: {
-            Open const copy(s);
-            string_.emplace(copy);
-            model_.set(std::string(model_.content), model_.content.size());
-            return "copy";
-        }
-        default:
-            string_.emplace(units.c_str(), n);
-            model_.set(units, n);
-            return "make";
-        }
+    /// A length that is given with a text, sometimes beyond its end.
+    std::uint64_t lengthFor(std::string const& units) {
+        return oneIn(3) ? units.size() + below(4) : below(units.size() + 1);
     }
+    /// Where a part of its own text begins.
+    std::uint64_t place() { return below(model.content.size() + 1); }
 
-    std::mt19937_64 random_;
-    std::optional<Open> string_;
-    Model model_;
+    template <class... Arguments>
+    void remake(Arguments const&... arguments) {
+        held_.emplace(arguments...);
+    }
+    Open& string() { return *held_; }
+    bool agree() const { return model.agrees(*held_); }
+
+    std::mt19937_64 random;
+    HeapStrModelled model;
+
+private:
+    std::optional<Open> held_;
+};
+
+using Both = HeapStrBesideModel;
+
+std::uint64_t measured(std::string const& units) { return std::strlen(units.c_str()); }
+
+void setMeasured(Both& b) {
+    std::string const units = b.text();
+    b.string().set(units.c_str());
+    b.model.set(units, measured(units));
+}
+
+void set(Both& b) {
+    std::string const units = b.text();
+    std::uint64_t const n = b.lengthFor(units);
+    b.string().set(units.c_str(), n);
+    b.model.set(units, n);
+}
+
+void assignView(Both& b) {
+    std::string const units = b.text();
+    std::uint64_t const n = b.lengthFor(units);
+    b.string() = Str(units.c_str(), n);
+    b.model.set(units, n);
+}
+
+void assignStandardString(Both& b) {
+    std::string const units = b.text();
+    b.string() = units;
+    b.model.set(units, units.size());
+}
+
+void assignText(Both& b) {
+    std::string const units = b.text();
+    b.string() = units.c_str();
+    b.model.set(units, measured(units));
+}
+
+void assignString(Both& b) {
+    std::string const units = b.text();
+    std::uint64_t const n = b.lengthFor(units);
+    Open const other(units.c_str(), n);
+    b.string() = other;
+    b.model.set(TextModel<char>::stopAndPad(units, n), n);
+}
+
+void setItsTail(Both& b) {
+    std::uint64_t const from = b.place();
+    std::string const own = b.model.content.substr(from);
+    b.string().set(b.string().c_str() + from);
+    b.model.set(own, measured(own));
+}
+
+void setAPartOfItself(Both& b) {
+    std::uint64_t const from = b.place();
+    std::string const own = b.model.content.substr(from);
+    std::uint64_t const n = b.lengthFor(own);
+    b.string().set(b.string().c_str() + from, n);
+    b.model.set(own, n);
+}
+
+void cut(Both& b) {
+    b.string().cut();
+    if (!b.model.content.empty()) b.model.content.pop_back();
+}
+
+void cutTo(Both& b) {
+    std::uint64_t const place = b.below(b.model.content.size() + 3);
+    b.string().cut(place);
+    if (place < b.model.content.size()) b.model.content.resize(place);
+}
+
+void toLower(Both& b) {
+    b.string().toLower();
+    for (char& c : b.model.content) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+}
+
+void clear(Both& b) {
+    b.string().clear();
+    b.model = {};
+}
+
+void copy(Both& b) {
+    Open const copied(b.string());
+    b.remake(copied);
+    b.model.set(std::string(b.model.content), b.model.content.size());
+}
+
+void make(Both& b) {
+    std::string const units = b.text();
+    std::uint64_t const n = b.lengthFor(units);
+    b.remake(units.c_str(), n);
+    b.model.set(units, n);
+}
+
+constexpr Operation<Both> HEAP_STR_OPERATIONS[] = {
+    {"set measured", 4, setMeasured},
+    {"set", 4, set},
+    {"assign a view", 4, assignView},
+    {"assign a standard string", 4, assignStandardString},
+    {"assign a text", 4, assignText},
+    {"assign a string", 4, assignString},
+    {"set its own tail", 4, setItsTail},
+    {"set a part of itself", 4, setAPartOfItself},
+    {"cut", 4, cut},
+    {"cut to a place", 4, cutTo},
+    {"lower", 4, toLower},
+    {"clear", 1, clear},
+    {"copy", 4, copy},
+    {"make", 4, make},
 };
 
 } // namespace
 
 TEST(HeapStrModel, agrees_after_every_random_operation) {
-    Walk walk;
+    Both b;
     std::uint64_t const steps = randomSteps(1'000'000);
     for (std::uint64_t step = 0; step < steps; ++step) {
-        std::string const difference = walk.step();
-        ASSERT_EQ(difference, "") << "at step " << step;
+        Operation<Both> const& operation = drawn(HEAP_STR_OPERATIONS, b.random);
+        operation.act(b);
+        ASSERT_TRUE(b.agree()) << operation.name << " at step " << step;
     }
 }

@@ -198,3 +198,11 @@ TEST(HeapStr, is_a_key_of_hashed_containers) {
     EXPECT_EQ(set.size(), 2U);
     EXPECT_EQ(std::hash<HeapStr>()(HeapStr("ab\0c", 4)), std::hash<HeapStr>()(HeapStr("ab", 2)));
 }
+
+TEST(HeapStr, sets_a_text) {
+    HeapStr text;
+    EXPECT_EQ(content(text.set("abc")), "abc");
+    EXPECT_EQ(content(text.set("abc", 2)), "ab");
+    EXPECT_EQ(content(text.set("abc", 0)), "");
+    EXPECT_EQ(content(text.set(nullptr)), "");
+}

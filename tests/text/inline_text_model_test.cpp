@@ -1,42 +1,36 @@
 // Random operations on BufStr<15>, BufStr<255> and WBStr, each beside its model.
 
+#include "tests/support/operations.h"
 #include "tests/support/random_steps.h"
 #include "tests/text/string_kinds.h"
 #include "tests/text/text_model.h"
 
 #include <gtest/gtest.h>
 
-#include <array>
+#include <algorithm>
 #include <cctype>
-#include <functional>
 #include <memory>
 #include <optional>
-#include <vector>
+#include <string>
+#include <string_view>
 
 using namespace ZOR_Basis;
 
 namespace {
 
+/// A string, its model, and random sources for both.
 template <class String>
-class Walk {
-    using Char = typename Kind<String>::Char;
-    using View = typename Kind<String>::View;
-    using Text = std::basic_string<Char>;
+struct InlineTextBesideModel {
+    using Char = CharOf<String>;
+    using View = ViewOf<String>;
+    using Text = TextOf<String>;
     using Source = ModelSource<Char>;
-    static constexpr std::uint64_t N = Kind<String>::Inside;
-    static constexpr bool Narrow = sizeof(Char) == 1;
+    static constexpr std::uint64_t N = Kind<String>::INSIDE;
+    static constexpr bool NARROW = sizeof(Char) == 1;
 
-public:
-    Walk() : random_(randomSource()) { restart(); }
+    InlineTextBesideModel() { makeEmpty(); }
 
-    /// One step; empty text where string and model agree afterwards.
-    std::string step() {
-        std::string const name = operate();
-        return agree() ? std::string() : name;
-    }
-
-private:
-    std::uint64_t below(std::uint64_t bound) { return random_() % bound; }
+    std::uint64_t below(std::uint64_t bound) { return random() % bound; }
     bool oneIn(std::uint64_t chances) { return below(chances) == 0; }
 
     Char unit() {
@@ -76,8 +70,8 @@ private:
         if (oneIn(30)) return {nullptr, {{}, below(5)}, nullptr};
         std::uint64_t const given = oneIn(2) ? 0 : length();
         if (oneIn(5)) {
-            std::uint64_t const from = below(model_->content.size() + 1);
-            return {static_cast<Char const*>(*string_) + from, {model_->content.substr(from), given}, nullptr};
+            std::uint64_t const from = below(model->content.size() + 1);
+            return {static_cast<Char const*>(*string) + from, {model->content.substr(from), given}, nullptr};
         }
         Text const units = text();
         // Exactly as long as it must be, so that a sanitizer sees every read too far.
@@ -88,251 +82,294 @@ private:
         return {pointer, {units, given}, std::move(block)};
     }
 
-    void restart() {
-        switch (below(4)) {
-        case 0: {
-            string_.emplace();
-            model_.emplace(N);
-            break;
-        }
-        case 1: {
-            Text const units = text();
-            Source const s{units, 0};
-            string_.emplace(units.c_str());
-            model_.emplace(N);
-            model_->assign(s);
-            break;
-        }
-        case 2: {
-            Text const units = text();
-            std::uint64_t const given = length();
-            string_.emplace(View(units.c_str(), given));
-            model_.emplace(N);
-            model_->assign({units, given});
-            break;
-        }
-        default: {
-            if (!string_) return restart();
-            String const copy(*string_);
-            Source const s{model_->content, model_->content.size()};
-            string_.emplace(copy);
-            model_.emplace(N);
-            model_->assign(s);
-            // the copy of a copy has zeros behind the first one, as the first copy has
-            break;
-        }
-        }
+    /// Mostly a place within the text, sometimes behind it.
+    std::uint64_t place() {
+        std::uint64_t const size = model->content.size();
+        return oneIn(8) ? size + below(3) : below(size + 1);
     }
 
-    std::string operate() {
-        if (oneIn(40)) {
-            restart();
-            return "restart";
-        }
-        String& s = *string_;
-        TextModel<Char>& m = *model_;
-        std::uint64_t const size = m.content.size();
-        std::uint64_t const place = oneIn(8) ? size + below(3) : below(size + 1);
-        switch (below(Narrow ? 24 : 20)) {
-        case 0: {
-            Given const g = source();
-            s.copy(g.pointer, g.model.length);
-            m.assign(g.model);
-            return "copy";
-        }
-        case 1: {
-            Given const g = source();
-            if (g.pointer == static_cast<Char const*>(s)) return "";
-            s = g.pointer;
-            m.assign({g.model.units, 0});
-            return "assign text";
-        }
-        case 2: {
-            Given const g = source();
-            s = View(g.pointer, g.model.length);
-            m.assign(g.model);
-            return "assign view";
-        }
-        case 3: {
-            Text const units = text();
-            String const other(units.c_str(), units.size());
-            TextModel<Char> otherModel(N);
-            otherModel.assign({units, units.size()});
-            s = other;
-            m.assign({otherModel.content, otherModel.content.size()});
-            return "assign string";
-        }
-        case 4:
-        case 5: {
-            Given const g = source();
-            s.add(g.pointer, g.model.length);
-            m.append(g.model);
-            return "add text";
-        }
-        case 6: {
-            Given const g = source();
-            s += View(g.pointer, g.model.length);
-            m.append(g.model);
-            return "add view";
-        }
-        case 7: {
-            s.add(s);
-            m.append({Text(m.content), m.content.size()});
-            return "add itself";
-        }
-        case 8:
-        case 9: {
-            Char const c = unit();
-            s += c;
-            m.append(c);
-            return "add unit";
-        }
-        case 10: {
-            Given const g = source();
-            s.insert(place, g.pointer, g.model.length);
-            m.insert(place, g.model);
-            return "insert";
-        }
-        case 11: {
-            Given const g = source();
-            std::uint64_t const count = oneIn(10) ? ~std::uint64_t{0} : below(size + 3);
-            s.replace(place, count, g.pointer, g.model.length);
-            m.replace(place, count, g.model);
-            return "replace";
-        }
-        case 12: {
-            s.cut(place);
-            m.cut(place);
-            return "cut to";
-        }
-        case 13: {
-            s.cut();
-            if (size > 0) m.cut(size - 1);
-            return "cut";
-        }
-        case 14: {
-            s.clear();
-            m.content.clear();
-            return "clear";
-        }
-        case 15: {
-            std::uint64_t const n = length();
-            s.extendBuf(n);
-            m.extend(n);
-            return "extend";
-        }
-        case 16: {
-            Text units = text();
-            if (oneIn(4)) units.resize(m.capacity + 1, Char('w'));
-            if (units.size() > m.capacity + 1) units.resize(m.capacity + 1);
-            std::copy(units.begin(), units.end(), s.getBuf());
-            if (units.size() <= m.capacity) s.getBuf()[units.size()] = Char();
-            std::uint64_t const n = oneIn(2) ? 0 : length();
-            s.resize(n);
-            m.written(units, n);
-            return "write and resize";
-        }
-        case 17: {
-            if (size == 0) return "";
-            std::uint64_t const i = below(size);
-            Char const c = oneIn(4) ? Char() : unit();
-            s[i] = c;
-            m.content[i] = c;
-            return "write one";
-        }
-        case 18: {
-            s.NextLatin();
-            m.nextLatin();
-            return "count on";
-        }
-        case 19: {
-            String const& same = s;
-            s = same;
-            s = static_cast<View const&>(same);
-            s = static_cast<Char const*>(same);
-            return "assign itself";
-        }
-        default:
-            if constexpr (Narrow) return operateNarrow(s, m, place);
-            return "";
-        }
+    void makeEmpty() {
+        string.emplace();
+        model.emplace(N);
     }
-
-    std::string operateNarrow(String& s, TextModel<Char>& m, std::uint64_t place) {
-        switch (below(5)) {
-        case 0: {
-            Given const g = source();
-            s.replaceTail(place, g.pointer, g.model.length);
-            m.replaceTail(place, g.model);
-            return "replace tail";
-        }
-        case 1: {
-            int const number = static_cast<int>(random_());
-            s << number;
-            m.append({std::to_string(number), 0});
-            return "number";
-        }
-        case 2: {
-            s.toUpper();
-            for (char& c : m.content) c = static_cast<char>(std::toupper(static_cast<unsigned char>(c)));
-            return "upper";
-        }
-        case 3: {
-            Given const g = source();
-            std::string digits;
-            for (char c : Source{g.model.units, 0}.empty() ? "" : g.model.units) {
-                if (c == '\0') break;
-                digits += "0123456789abcdef"[static_cast<unsigned char>(c) / 16];
-                digits += "0123456789abcdef"[static_cast<unsigned char>(c) % 16];
-            }
-            if (g.pointer == nullptr) digits.clear();
-            s.toHex(g.pointer);
-            m.content.clear();
-            for (char digit : digits) m.append(digit);
-            return "to hex";
-        }
-        default: {
-            Given const g = source();
-            std::string digits = g.model.units.substr(0, g.model.units.find('\0'));
-            s.fromHex(g.pointer);
-            for (std::size_t i = 0; i + 1 < digits.size(); i += 2) {
-                auto const digit = [](char c) {
-                    auto const at = std::string_view("0123456789abcdefABCDEF").find(c);
-                    return at == std::string_view::npos ? 255U : static_cast<unsigned>(at > 15 ? at - 6 : at);
-                };
-                m.append(static_cast<char>(static_cast<unsigned char>(16 * digit(digits[i]) + digit(digits[i + 1]))));
-            }
-            return "from hex";
-        }
-        }
+    void makeOfText() {
+        Text const units = text();
+        string.emplace(units.c_str());
+        model.emplace(N);
+        model->assign({units, 0});
+    }
+    void makeOfView() {
+        Text const units = text();
+        std::uint64_t const given = length();
+        string.emplace(View(units.c_str(), given));
+        model.emplace(N);
+        model->assign({units, given});
+    }
+    /// The copy of a copy has zeros behind the first one, as the first copy has.
+    void makeOfItself() {
+        String const copy(*string);
+        Source const s{model->content, model->content.size()};
+        string.emplace(copy);
+        model.emplace(N);
+        model->assign(s);
     }
 
     bool agree() const {
-        String const& s = *string_;
+        String const& s = *string;
         Char const* held = s;
-        return s.size() == model_->content.size() && held[s.size()] == Char() &&
-               std::char_traits<Char>::compare(held, model_->content.data(), s.size()) == 0 &&
-               s.sizeBuf() == model_->capacity && isInside(s) == !model_->onHeap;
+        return s.size() == model->content.size() && held[s.size()] == Char() &&
+               std::char_traits<Char>::compare(held, model->content.data(), s.size()) == 0 &&
+               s.sizeBuf() == model->capacity && isInside(s) == !model->onHeap;
     }
 
-    std::mt19937_64 random_;
-    std::optional<String> string_;
-    std::optional<TextModel<Char>> model_;
+    std::mt19937_64 random = randomSource();
+    std::optional<String> string;
+    std::optional<TextModel<Char>> model;
+};
+
+template <class Both>
+void copyText(Both& b) {
+    auto const g = b.source();
+    b.string->copy(g.pointer, g.model.length);
+    b.model->assign(g.model);
+}
+
+template <class Both>
+void assignText(Both& b) {
+    auto const g = b.source();
+    if (g.pointer == static_cast<typename Both::Char const*>(*b.string)) return;
+    *b.string = g.pointer;
+    b.model->assign({g.model.units, 0});
+}
+
+template <class Both>
+void assignView(Both& b) {
+    auto const g = b.source();
+    *b.string = typename Both::View(g.pointer, g.model.length);
+    b.model->assign(g.model);
+}
+
+template <class String>
+void assignString(InlineTextBesideModel<String>& b) {
+    auto const units = b.text();
+    String const other(units.c_str(), units.size());
+    TextModel<CharOf<String>> otherModel(b.N);
+    otherModel.assign({units, units.size()});
+    *b.string = other;
+    b.model->assign({otherModel.content, otherModel.content.size()});
+}
+
+template <class String>
+void assignItself(InlineTextBesideModel<String>& b) {
+    String const& same = *b.string;
+    *b.string = same;
+    *b.string = static_cast<ViewOf<String> const&>(same);
+    *b.string = static_cast<CharOf<String> const*>(same);
+}
+
+template <class Both>
+void addText(Both& b) {
+    auto const g = b.source();
+    b.string->add(g.pointer, g.model.length);
+    b.model->append(g.model);
+}
+
+template <class Both>
+void addView(Both& b) {
+    auto const g = b.source();
+    *b.string += typename Both::View(g.pointer, g.model.length);
+    b.model->append(g.model);
+}
+
+template <class Both>
+void addItself(Both& b) {
+    b.string->add(*b.string);
+    b.model->append({typename Both::Text(b.model->content), b.model->content.size()});
+}
+
+template <class Both>
+void addUnit(Both& b) {
+    auto const c = b.unit();
+    *b.string += c;
+    b.model->append(c);
+}
+
+template <class Both>
+void insert(Both& b) {
+    std::uint64_t const place = b.place();
+    auto const g = b.source();
+    b.string->insert(place, g.pointer, g.model.length);
+    b.model->insert(place, g.model);
+}
+
+template <class Both>
+void replace(Both& b) {
+    std::uint64_t const place = b.place();
+    auto const g = b.source();
+    std::uint64_t const count = b.oneIn(10) ? ~std::uint64_t{0} : b.below(b.model->content.size() + 3);
+    b.string->replace(place, count, g.pointer, g.model.length);
+    b.model->replace(place, count, g.model);
+}
+
+template <class Both>
+void cutTo(Both& b) {
+    std::uint64_t const place = b.place();
+    b.string->cut(place);
+    b.model->cut(place);
+}
+
+template <class Both>
+void cut(Both& b) {
+    b.string->cut();
+    if (!b.model->content.empty()) b.model->cut(b.model->content.size() - 1);
+}
+
+template <class Both>
+void clear(Both& b) {
+    b.string->clear();
+    b.model->content.clear();
+}
+
+template <class Both>
+void extend(Both& b) {
+    std::uint64_t const n = b.length();
+    b.string->extendBuf(n);
+    b.model->extend(n);
+}
+
+template <class Both>
+void writeAndResize(Both& b) {
+    auto units = b.text();
+    std::uint64_t const most = b.model->capacity + 1;
+    if (b.oneIn(4)) units.resize(most, 'w');
+    if (units.size() > most) units.resize(most);
+    std::copy(units.begin(), units.end(), b.string->getBuf());
+    if (units.size() < most) b.string->getBuf()[units.size()] = 0;
+    std::uint64_t const n = b.oneIn(2) ? 0 : b.length();
+    b.string->resize(n);
+    b.model->written(units, n);
+}
+
+template <class Both>
+void writeOne(Both& b) {
+    if (b.model->content.empty()) return;
+    std::uint64_t const i = b.below(b.model->content.size());
+    auto const c = b.oneIn(4) ? typename Both::Char() : b.unit();
+    (*b.string)[i] = c;
+    b.model->content[i] = c;
+}
+
+template <class Both>
+void countOn(Both& b) {
+    b.string->NextLatin();
+    b.model->nextLatin();
+}
+
+template <class String>
+constexpr Operation<InlineTextBesideModel<String>> INLINE_TEXT_OPERATIONS[] = {
+    {"make an empty one", 1, [](auto& b) { b.makeEmpty(); }},
+    {"make of a text", 1, [](auto& b) { b.makeOfText(); }},
+    {"make of a view", 1, [](auto& b) { b.makeOfView(); }},
+    {"make of itself", 1, [](auto& b) { b.makeOfItself(); }},
+    {"copy", 8, copyText},
+    {"assign a text", 8, assignText},
+    {"assign a view", 8, assignView},
+    {"assign a string", 8, assignString},
+    {"assign itself", 8, assignItself},
+    {"add a text", 16, addText},
+    {"add a view", 8, addView},
+    {"add itself", 8, addItself},
+    {"add a unit", 16, addUnit},
+    {"insert", 8, insert},
+    {"replace", 8, replace},
+    {"cut to a place", 8, cutTo},
+    {"cut", 8, cut},
+    {"clear", 8, clear},
+    {"extend", 8, extend},
+    {"write and resize", 8, writeAndResize},
+    {"write one unit", 8, writeOne},
+    {"count on", 8, countOn},
+};
+
+// ---- narrow strings
+
+template <class Both>
+void replaceTail(Both& b) {
+    std::uint64_t const place = b.place();
+    auto const g = b.source();
+    b.string->replaceTail(place, g.pointer, g.model.length);
+    b.model->replaceTail(place, g.model);
+}
+
+template <class Both>
+void streamNumber(Both& b) {
+    int const number = static_cast<int>(b.random());
+    *b.string << number;
+    b.model->append({std::to_string(number), 0});
+}
+
+template <class Both>
+void toUpper(Both& b) {
+    b.string->toUpper();
+    for (char& c : b.model->content) c = static_cast<char>(std::toupper(static_cast<unsigned char>(c)));
+}
+
+template <class Both>
+void toHex(Both& b) {
+    auto const g = b.source();
+    std::string const units = g.pointer != nullptr ? g.model.units.substr(0, g.model.units.find('\0')) : "";
+    b.string->toHex(g.pointer);
+    b.model->content.clear();
+    for (char c : units) {
+        auto const byte = static_cast<unsigned char>(c);
+        for (unsigned digit : {byte / 16U, byte % 16U}) b.model->append("0123456789abcdef"[digit]);
+    }
+}
+
+unsigned valueOfDigit(char c) {
+    auto const at = std::string_view("0123456789abcdefABCDEF").find(c);
+    return at == std::string_view::npos ? 255U : static_cast<unsigned>(at > 15 ? at - 6 : at);
+}
+
+template <class Both>
+void fromHex(Both& b) {
+    auto const g = b.source();
+    std::string const digits = g.model.units.substr(0, g.model.units.find('\0'));
+    b.string->fromHex(g.pointer);
+    for (std::size_t i = 0; i + 1 < digits.size(); i += 2) {
+        unsigned const byte = 16 * valueOfDigit(digits[i]) + valueOfDigit(digits[i + 1]);
+        b.model->append(static_cast<char>(static_cast<unsigned char>(byte)));
+    }
+}
+
+template <class String>
+constexpr Operation<InlineTextBesideModel<String>> NARROW_TEXT_OPERATIONS[] = {
+    {"replace the tail", 1, replaceTail}, {"stream a number", 1, streamNumber},    {"upper", 1, toUpper},
+    {"to hexadecimal digits", 1, toHex},  {"from hexadecimal digits", 1, fromHex},
 };
 
 template <class String>
-class InlineStringModel : public testing::Test {};
+Operation<InlineTextBesideModel<String>> const& drawnFor(InlineTextBesideModel<String>& b) {
+    if constexpr (b.NARROW) {
+        if (b.oneIn(6)) return drawn(NARROW_TEXT_OPERATIONS<String>, b.random);
+    }
+    return drawn(INLINE_TEXT_OPERATIONS<String>, b.random);
+}
+
+template <class String>
+class InlineTextModel : public testing::Test {};
 
 } // namespace
 
-using Kinds = testing::Types<BufStr<15>, BufStr<255>, WBStr>;
-TYPED_TEST_SUITE(InlineStringModel, Kinds, );
+using ModelledKinds = testing::Types<BufStr<15>, BufStr<255>, WBStr>;
+TYPED_TEST_SUITE(InlineTextModel, ModelledKinds, );
 
-TYPED_TEST(InlineStringModel, agrees_after_every_random_operation) {
-    Walk<TypeParam> walk;
+TYPED_TEST(InlineTextModel, agrees_after_every_random_operation) {
+    InlineTextBesideModel<TypeParam> b;
     std::uint64_t const steps = randomSteps(1'000'000);
     for (std::uint64_t step = 0; step < steps; ++step) {
-        std::string const difference = walk.step();
-        ASSERT_EQ(difference, "") << "at step " << step;
+        auto const& operation = drawnFor(b);
+        operation.act(b);
+        ASSERT_TRUE(b.agree()) << operation.name << " at step " << step;
     }
 }

@@ -14,14 +14,14 @@ using namespace ZOR_Basis;
 namespace {
 
 template <class Text>
-class ComparingRanges : public testing::Test {};
+class StrComparingRanges : public testing::Test {};
 
-using Texts = testing::Types<Str, BufStr<15>, BufStr<255>, HeapStr, FPath>;
-TYPED_TEST_SUITE(ComparingRanges, Texts, );
+using RangeTexts = testing::Types<Str, BufStr<15>, BufStr<255>, HeapStr, FPath>;
+TYPED_TEST_SUITE(StrComparingRanges, RangeTexts, );
 
 } // namespace
 
-TYPED_TEST(ComparingRanges, are_found_by_literals_and_standard_strings) {
+TYPED_TEST(StrComparingRanges, are_found_by_literals_and_standard_strings) {
     std::vector<std::string> const own{"tray", "a", "z", "media", "a", "stacker"};
     std::vector<TypeParam> names(own.begin(), own.end());
     std::ranges::sort(names);

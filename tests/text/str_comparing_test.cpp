@@ -1,8 +1,7 @@
 // Narrow texts compare as texts with each other, with plain text and with standard strings: from both sides, through
-// operators and through the standard's function objects. Wide texts compare only as their headers say.
+// operators and through the standard's function objects.
 
 #include "zor_basis/files/f_path.h"
-#include "zor_basis/files/wc_path.h"
 #include "zor_basis/text.h"
 
 #include "tests/support/table.h"
@@ -150,35 +149,39 @@ void compareWith() {
 }
 
 template <class Text>
-class Comparing : public testing::Test {};
+class StrComparing : public testing::Test {};
 
 using ComparedTexts = testing::Types<Str, BufStr<15>, BufStr<255>, HeapStr, FPath>;
-TYPED_TEST_SUITE(Comparing, ComparedTexts, );
+TYPED_TEST_SUITE(StrComparing, ComparedTexts, );
 
 template <class Text>
-class ComparingOwner : public testing::Test {};
+class StrComparingOwner : public testing::Test {};
 
 using Owners = testing::Types<BufStr<15>, BufStr<255>, HeapStr, FPath>;
-TYPED_TEST_SUITE(ComparingOwner, Owners, );
+TYPED_TEST_SUITE(StrComparingOwner, Owners, );
 
 } // namespace
 
-TYPED_TEST(Comparing, sees_the_text_of_pointers_and_arrays) { compareWith<TypeParam, char const*, char*, char[100]>(); }
+TYPED_TEST(StrComparing, sees_the_text_of_pointers_and_arrays) {
+    compareWith<TypeParam, char const*, char*, char[100]>();
+}
 
-TYPED_TEST(Comparing, sees_the_text_of_standard_strings) { compareWith<TypeParam, std::string>(); }
+TYPED_TEST(StrComparing, sees_the_text_of_standard_strings) { compareWith<TypeParam, std::string>(); }
 
-TYPED_TEST(Comparing, sees_the_text_of_every_other_text_type) {
+TYPED_TEST(StrComparing, sees_the_text_of_every_other_text_type) {
     compareWith<TypeParam, Str, BufStr<15>, BufStr<255>, HeapStr, FPath>();
 }
 
-TYPED_TEST(Comparing, sees_the_text_of_whatever_converts_to_a_pointer) {
+TYPED_TEST(StrComparing, sees_the_text_of_whatever_converts_to_a_pointer) {
     compareAll<TypeParam, OldString>(false);
     compareAll<OldString, TypeParam>(false);
 }
 
-TYPED_TEST(ComparingOwner, sees_the_text_of_a_view_without_a_terminator) { compareWith<TypeParam, std::string_view>(); }
+TYPED_TEST(StrComparingOwner, sees_the_text_of_a_view_without_a_terminator) {
+    compareWith<TypeParam, std::string_view>();
+}
 
-TYPED_TEST(Comparing, finds_literals_in_ordered_containers) {
+TYPED_TEST(StrComparing, finds_literals_in_ordered_containers) {
     std::vector<std::string> const own{"tray", "a", "z", "media", "stacker"};
     std::map<TypeParam, int, std::less<>> sizes;
     std::set<TypeParam, std::greater<>> names;
@@ -201,13 +204,13 @@ TYPED_TEST(Comparing, finds_literals_in_ordered_containers) {
     EXPECT_EQ(names.count("b"), 0U);
 }
 
-TEST(Comparing, needs_no_string_to_search_a_container) {
+TEST(StrComparing, needs_no_string_to_search_a_container) {
     std::map<BufStr<15>, int, std::less<>> trays{{"tray1", 500}, {"tray2", 250}};
     bool const known = trays.contains("tray2");
     EXPECT_TRUE(known);
 }
 
-TYPED_TEST(Comparing, finds_literals_in_sorted_ranges) {
+TYPED_TEST(StrComparing, finds_literals_in_sorted_ranges) {
     std::vector<std::string> const own{"tray", "a", "z", "media", "a", "stacker"};
     std::vector<TypeParam> names(own.begin(), own.end());
     std::ranges::sort(names);
@@ -225,7 +228,7 @@ TYPED_TEST(Comparing, finds_literals_in_sorted_ranges) {
     EXPECT_TRUE(std::binary_search(names.begin(), names.end(), "media", std::greater<>()));
 }
 
-TYPED_TEST(ComparingOwner, Kept_text_01_the_right_hand_size_decides_beside_a_view_too) {
+TYPED_TEST(StrComparingOwner, Kept_text_01_the_right_hand_size_decides_beside_a_view_too) {
     struct Case {
         Row row;
         std::string text;
@@ -251,7 +254,7 @@ TYPED_TEST(ComparingOwner, Kept_text_01_the_right_hand_size_decides_beside_a_vie
     }
 }
 
-TYPED_TEST(ComparingOwner, a_view_of_a_part_of_a_text_is_not_the_text) {
+TYPED_TEST(StrComparingOwner, a_view_of_a_part_of_a_text_is_not_the_text) {
     TypeParam const text("abcdef");
     std::string_view const whole(text);
     EXPECT_TRUE(text == whole && whole == text);
@@ -260,7 +263,7 @@ TYPED_TEST(ComparingOwner, a_view_of_a_part_of_a_text_is_not_the_text) {
     EXPECT_TRUE(whole.substr(0, 3) < text && text > whole.substr(0, 3));
 }
 
-TYPED_TEST(ComparingOwner, Kept_text_02_a_view_is_ordered_up_to_its_first_zero) {
+TYPED_TEST(StrComparingOwner, Kept_text_02_a_view_is_ordered_up_to_its_first_zero) {
     TypeParam const text("ab");
     EXPECT_TRUE(std::is_eq(text <=> std::string_view("ab\0z", 4)));
     EXPECT_TRUE(text <= std::string_view("ab\0z", 4) && text >= std::string_view("ab\0z", 4));
@@ -268,7 +271,7 @@ TYPED_TEST(ComparingOwner, Kept_text_02_a_view_is_ordered_up_to_its_first_zero) 
     EXPECT_TRUE(text > std::string_view() && std::string_view() <= text);
 }
 
-TEST(Comparing, keeps_the_asymmetry_of_sizes_in_function_objects) {
+TEST(StrComparing, keeps_the_asymmetry_of_sizes_in_function_objects) {
     std::string const own("abcdef");
     Str const part(own.c_str(), 3);
     EXPECT_TRUE(std::equal_to<>()(part, "abcdef")) << "plain text is compared whole";
@@ -276,96 +279,4 @@ TEST(Comparing, keeps_the_asymmetry_of_sizes_in_function_objects) {
     EXPECT_TRUE(std::ranges::equal_to()(std::string("abc"), part));
     EXPECT_FALSE(std::less<>()(part, "abcdef")) << "ordering does not look at sizes";
     EXPECT_FALSE(std::less<>()("abcdef", part));
-}
-
-// ---- what must not compile ------------------------------------------------------------------------------------------
-
-namespace {
-
-template <class A, class B>
-concept Equal = requires(A const& a, B const& b) {
-    a == b;
-};
-template <class A, class B>
-concept Unequal = requires(A const& a, B const& b) {
-    a != b;
-};
-template <class A, class B>
-concept Less = requires(A const& a, B const& b) {
-    a < b;
-};
-template <class A, class B>
-concept Greater = requires(A const& a, B const& b) {
-    a > b;
-};
-template <class A, class B>
-concept NotGreater = requires(A const& a, B const& b) {
-    a <= b;
-};
-template <class A, class B>
-concept NotLess = requires(A const& a, B const& b) {
-    a >= b;
-};
-template <class A, class B>
-concept ThreeWay = requires(A const& a, B const& b) {
-    a <=> b;
-};
-
-template <class Object, class A, class B>
-inline constexpr bool takes = std::is_invocable_v<Object, A const&, B const&>;
-
-template <class A, class B>
-inline constexpr bool hasEquality = Equal<A, B>&& Unequal<A, B>&& takes<std::equal_to<>, A, B>;
-template <class A, class B>
-inline constexpr bool hasStrictOrder =
-    Less<A, B>&& Greater<A, B>&& takes<std::less<>, A, B>&& takes<std::greater<>, A, B>;
-template <class A, class B>
-inline constexpr bool hasNoStrictOrder =
-    !Less<A, B> && !Greater<A, B> && !takes<std::less<>, A, B> && !takes<std::greater<>, A, B>;
-template <class A, class B>
-inline constexpr bool hasNoOtherOrder =
-    !NotGreater<A, B> && !NotLess<A, B> && !ThreeWay<A, B> && !takes<std::less_equal<>, A, B> &&
-    !takes<std::greater_equal<>, A, B> && !takes<std::ranges::less, A, B> && !takes<std::ranges::greater, A, B> &&
-    !takes<std::ranges::less_equal, A, B> && !takes<std::ranges::greater_equal, A, B> &&
-    !takes<std::compare_three_way, A, B>;
-template <class A, class B>
-inline constexpr bool isIncomparable =
-    !Equal<A, B> && !Unequal<A, B> && !takes<std::equal_to<>, A, B> && hasNoStrictOrder<A, B> && hasNoOtherOrder<A, B>;
-
-/// Wide texts: equality with all, "<" and ">" between themselves, nothing else.
-template <class Wide, class... Others>
-inline constexpr bool isAsDeclared = (... && (hasEquality<Wide, Others> && hasStrictOrder<Wide, Others> &&
-                                              hasNoOtherOrder<Wide, Others>));
-template <class Wide, class... Plain>
-inline constexpr bool isOnlyEqual = (... && (hasEquality<Wide, Plain> && hasEquality<Plain, Wide> &&
-                                             hasNoStrictOrder<Wide, Plain> && hasNoStrictOrder<Plain, Wide> &&
-                                             hasNoOtherOrder<Wide, Plain> && hasNoOtherOrder<Plain, Wide>));
-template <class Text, class... Others>
-inline constexpr bool comparesWithNone = (... && (isIncomparable<Text, Others> && isIncomparable<Others, Text>));
-
-static_assert(isAsDeclared<WStr, WStr, WBStr, WFxStr, WcPath> && isAsDeclared<WBStr, WStr, WBStr, WFxStr, WcPath>);
-static_assert(isAsDeclared<WFxStr, WStr, WBStr, WFxStr, WcPath> && isAsDeclared<WcPath, WStr, WBStr, WFxStr, WcPath>);
-static_assert(isOnlyEqual<WStr, WChar const*, WChar*, WChar[4]> && isOnlyEqual<WBStr, WChar const*, WChar*, WChar[4]>);
-static_assert(isOnlyEqual<WFxStr, WChar const*, WChar*, WChar[4]>);
-static_assert(isOnlyEqual<WcPath, WChar const*, WChar*, WChar[4]>);
-static_assert(comparesWithNone<WStr, void const*, void*, char const*, int const*, Str, BufStr<15>, std::string>);
-static_assert(comparesWithNone<WBStr, void const*, void*, char const*, int const*, Str, HeapStr, std::string_view>);
-static_assert(comparesWithNone<WcPath, void const*, void*, char const*, int const*, FPath, std::string_view>);
-static_assert(comparesWithNone<Str, void const*, void*, unsigned char const*, int*, WStr, WChar const*>);
-static_assert(comparesWithNone<BufStr<15>, void const*, void*, unsigned char const*, int*, WBStr, WChar const*>);
-static_assert(comparesWithNone<HeapStr, void const*, void*, unsigned char const*, int*, WFxStr, WChar const*>);
-static_assert(comparesWithNone<FPath, void const*, void*, unsigned char const*, int*, WcPath, WChar const*>);
-static_assert(comparesWithNone<Str, std::string_view>, "nothing terminates a standard view");
-
-} // namespace
-
-TEST(Comparing, Kept_wide_01_function_objects_reverse_wide_texts_too) {
-    WBStr const a(ZB_W("a"));
-    WStr const b(ZB_W("b"));
-    EXPECT_TRUE(std::less<>()(b, a) && !std::less<>()(a, b));
-    EXPECT_TRUE(std::greater<>()(a, b) && !std::greater<>()(b, a));
-    EXPECT_TRUE(std::equal_to<>()(a, ZB_W("a")) && std::not_equal_to<>()(ZB_W("a"), b));
-    std::map<WBStr, int, std::less<>> const sizes{{ZB_W("a"), 1}, {ZB_W("c"), 3}, {ZB_W("b"), 2}};
-    EXPECT_EQ(sizes.begin()->second, 3);
-    EXPECT_EQ(sizes.find(b)->second, 2);
 }

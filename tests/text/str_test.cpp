@@ -92,14 +92,14 @@ TEST(Str, prints_as_its_text) {
 }
 
 TEST(Str, takes_every_integer_as_an_index) {
-    enum Place { Second = 1 };
+    enum Place { SECOND = 1 };
     Str const view("abc");
     EXPECT_EQ(view[0], 'a');
     EXPECT_EQ(view[1U], 'b');
     EXPECT_EQ(view[2L], 'c');
     EXPECT_EQ(view[std::uint64_t{2}], 'c');
     EXPECT_EQ(view[static_cast<short>(1)], 'b');
-    EXPECT_EQ(view[Second], 'b');
+    EXPECT_EQ(view[SECOND], 'b');
     EXPECT_EQ(view[3], '\0');
 }
 
@@ -132,32 +132,39 @@ TEST(Str, begins_with_a_prefix_of_the_given_size) {
     EXPECT_TRUE(Str(same, 2).beginWith(Str(same, 4)));
 }
 
+namespace {
+
+struct SizedPair {
+    Row row;
+    Str left;
+    Str right;
+    bool expected;
+};
+
+SizedPair const SIZED_PAIRS[] = {
+    {{}, Str("abcdef", 3), Str("abc", 3), true},
+    {{}, Str("abc", 3), Str("abcdef", 3), true},
+    {{}, Str("abcdef", 3), Str("abc", 0), false},
+    {{}, Str("abc", 3), Str("abcdef", 0), false},
+    {{}, Str("abc", 3), Str("abc", 0), true},
+    {{}, Str("abc", 0), Str("abc", 3), false},
+    {{}, Str("abc", 0), Str("abc", 0), true},
+    {{}, Str("abc", 2), Str("abc", 0), true},
+    {{}, Str("abc", 2), Str("abx", 2), true},
+    {{}, Str("abc", 2), Str("abc", 3), false},
+    {{}, Str("ab\0x", 4), Str("ab\0y", 4), true},
+    {{}, Str("ab\0x", 4), Str("ac\0x", 4), false},
+    {{}, Str("", 0), Str("", 0), true},
+    {{}, Str("", 0), Str(), true},
+    {{}, Str("a", 1), Str(nullptr, 0), false},
+    {{}, Str("", 0), Str(nullptr, 0), true},
+    {{}, Str("x", 0), Str(), false},
+};
+
+} // namespace
+
 TEST(Str, Kept_text_01_the_right_hand_size_alone_decides_how_equality_compares) {
-    struct Case {
-        Row row;
-        Str left;
-        Str right;
-        bool expected;
-    };
-    for (Case const& c : {
-             Case{{}, Str("abcdef", 3), Str("abc", 3), true},
-             Case{{}, Str("abc", 3), Str("abcdef", 3), true},
-             Case{{}, Str("abcdef", 3), Str("abc", 0), false},
-             Case{{}, Str("abc", 3), Str("abcdef", 0), false},
-             Case{{}, Str("abc", 3), Str("abc", 0), true},
-             Case{{}, Str("abc", 0), Str("abc", 3), false},
-             Case{{}, Str("abc", 0), Str("abc", 0), true},
-             Case{{}, Str("abc", 2), Str("abc", 0), true},
-             Case{{}, Str("abc", 2), Str("abx", 2), true},
-             Case{{}, Str("abc", 2), Str("abc", 3), false},
-             Case{{}, Str("ab\0x", 4), Str("ab\0y", 4), true},
-             Case{{}, Str("ab\0x", 4), Str("ac\0x", 4), false},
-             Case{{}, Str("", 0), Str("", 0), true},
-             Case{{}, Str("", 0), Str(), true},
-             Case{{}, Str("a", 1), Str(nullptr, 0), false},
-             Case{{}, Str("", 0), Str(nullptr, 0), true},
-             Case{{}, Str("x", 0), Str(), false},
-         }) {
+    for (SizedPair const& c : SIZED_PAIRS) {
         SCOPED_TRACE(c.row);
         std::string const own(c.left.c_str(), std::max<std::size_t>(std::strlen(c.left), c.left.size()));
         Str const left(own.c_str(), c.left.size()); // equal literals may be one object, which is always equal
@@ -215,17 +222,31 @@ TEST(Str, compares_for_equality_from_both_sides) {
     EXPECT_TRUE(view != nullptr && nullptr != view && Str() == nullptr && nullptr == Str());
 }
 
+namespace {
+
+struct OrderedPair {
+    Row row;
+    char const* left;
+    char const* right;
+    int expected;
+};
+
+OrderedPair const ORDERED_PAIRS[] = {{{}, "a", "b", -1},
+                                     {{}, "b", "a", 1},
+                                     {{}, "a", "a", 0},
+                                     {{}, "a", "ab", -1},
+                                     {{}, "", "a", -1},
+                                     {{}, "", "", 0},
+                                     {{}, "z", "\xE9", -1},
+                                     {{}, "\xFF", "\x01", 1},
+                                     {{}, "a", nullptr, 1},
+                                     {{}, "", nullptr, 0},
+                                     {{}, "0123456789abcdefX", "0123456789abcdefY", -1}};
+
+} // namespace
+
 TEST(Str, Kept_text_02_ordering_does_not_look_at_sizes) {
-    struct Case {
-        Row row;
-        char const* left;
-        char const* right;
-        int expected;
-    };
-    for (Case const& c : {Case{{}, "a", "b", -1}, Case{{}, "b", "a", 1}, Case{{}, "a", "a", 0}, Case{{}, "a", "ab", -1},
-                          Case{{}, "", "a", -1}, Case{{}, "", "", 0}, Case{{}, "z", "\xE9", -1},
-                          Case{{}, "\xFF", "\x01", 1}, Case{{}, "a", nullptr, 1}, Case{{}, "", nullptr, 0},
-                          Case{{}, "0123456789abcdefX", "0123456789abcdefY", -1}}) {
+    for (OrderedPair const& c : ORDERED_PAIRS) {
         SCOPED_TRACE(c.row);
         std::string const copy(c.left);
         Str const left(copy.c_str(), 1);

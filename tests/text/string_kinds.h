@@ -16,18 +16,22 @@ template <std::uint64_t N>
 struct Kind<ZOR_Basis::BufStr<N>> {
     using Char = char;
     using View = ZOR_Basis::Str;
-    static constexpr std::uint64_t Inside = N;
+    static constexpr std::uint64_t INSIDE = N;
 };
 
 template <>
 struct Kind<ZOR_Basis::WBStr> {
     using Char = ZOR_Basis::WChar;
     using View = ZOR_Basis::WStr;
-    static constexpr std::uint64_t Inside = 255;
+    static constexpr std::uint64_t INSIDE = 255;
 };
 
 template <class String>
-using TextOf = std::basic_string<typename Kind<String>::Char>;
+using CharOf = typename Kind<String>::Char;
+template <class String>
+using ViewOf = typename Kind<String>::View;
+template <class String>
+using TextOf = std::basic_string<CharOf<String>>;
 
 /// ASCII text in the characters of a kind, inner zeros included.
 template <class String>
