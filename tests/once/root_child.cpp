@@ -118,37 +118,47 @@ void set(char const* text) {
     WcPath::pathRoot = static_cast<WStr const&>(units);
 }
 
+void copyRoot() {
+    FPath out("old");
+    std::printf("%s ", Sys::root(out) ? "true" : "false");
+    print(static_cast<Str const&>(out));
+}
+
+/// What can be asked for on the command line. \param value  the argument behind it, where one is needed
+struct Step {
+    char const* name;
+    bool hasValue;
+    void (*perform)(char const* value);
+};
+
+constexpr Step STEPS[] = {
+    {"root", false, [](char const*) { print(static_cast<Str const&>(Sys::root())); }},
+    {"temp", false, [](char const*) { print(static_cast<Str const&>(Sys::temp())); }},
+    {"copy", false, [](char const*) { copyRoot(); }},
+    {"fake", true, narrow},
+    {"wide", true, wide},
+    {"pathroot", false, [](char const*) { print(static_cast<WStr const&>(WcPath::pathRoot)); }},
+    {"set", true, set},
+    {"clear", false, [](char const*) { WcPath::pathRoot.clear(); }},
+    {"ask", false, [](char const*) { ask(); }},
+    {"race", true, race},
+    {"refill", true, refill},
+};
+
+Step const* stepOf(char const* name) {
+    for (Step const& step : STEPS) {
+        if (std::strcmp(step.name, name) == 0) return &step;
+    }
+    return nullptr;
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
     for (int i = 1; i < argc; ++i) {
-        if (std::strcmp(argv[i], "root") == 0) {
-            print(static_cast<Str const&>(Sys::root()));
-        } else if (std::strcmp(argv[i], "temp") == 0) {
-            print(static_cast<Str const&>(Sys::temp()));
-        } else if (std::strcmp(argv[i], "copy") == 0) {
-            FPath out("old");
-            std::printf("%s ", Sys::root(out) ? "true" : "false");
-            print(static_cast<Str const&>(out));
-        } else if (std::strcmp(argv[i], "fake") == 0 && ++i < argc) {
-            narrow(argv[i]);
-        } else if (std::strcmp(argv[i], "wide") == 0 && ++i < argc) {
-            wide(argv[i]);
-        } else if (std::strcmp(argv[i], "pathroot") == 0) {
-            print(static_cast<WStr const&>(WcPath::pathRoot));
-        } else if (std::strcmp(argv[i], "set") == 0 && ++i < argc) {
-            set(argv[i]);
-        } else if (std::strcmp(argv[i], "clear") == 0) {
-            WcPath::pathRoot.clear();
-        } else if (std::strcmp(argv[i], "ask") == 0) {
-            ask();
-        } else if (std::strcmp(argv[i], "race") == 0 && ++i < argc) {
-            race(argv[i]);
-        } else if (std::strcmp(argv[i], "refill") == 0 && ++i < argc) {
-            refill(argv[i]);
-        } else {
-            return 2;
-        }
+        Step const* const step = stepOf(argv[i]);
+        if (step == nullptr || (step->hasValue && ++i == argc)) return 2;
+        step->perform(argv[i]);
     }
     return 0;
 }

@@ -64,6 +64,10 @@ bool waitUntil(Condition condition) {
     return true;
 }
 
+void endUnless(bool done) {
+    if (!done) std::_Exit(2);
+}
+
 void assign() {
     VDPTempDir other(false);
     FPath const before = other.path();
@@ -114,59 +118,66 @@ void race(int count) {
     for (std::string const& lines : paths) std::fputs(lines.c_str(), stdout);
 }
 
+void make(bool deletesOnDestroy) {
+    folders.emplace_back(deletesOnDestroy);
+    print(folders.back().path().c_str());
+}
+
+void create() {
+    FPath path("before");
+    VDPTempDir::Create(path);
+    print(path.c_str());
+}
+
+void put(std::string const& name) { std::ofstream((folders.back().path().c_str() + ("/" + name)).c_str()) << "text"; }
+
+void replaceByFile() {
+    fs::remove_all(folders.back().path().c_str());
+    std::ofstream(folders.back().path().c_str()) << "text";
+}
+
+/// What can be asked for on the command line, as "NAME" or "NAME=VALUE".
+struct Step {
+    char const* name;
+    void (*perform)(std::string const& value);
+};
+
+constexpr Step STEPS[] = {
+    {"init", [](std::string const& value) { VDPTempDir::Init(std::atoi(value.c_str())); }},
+    {"root", [](std::string const&) { print(VDPTempDir::Root().c_str()); }},
+    {"make", [](std::string const&) { make(true); }},
+    {"keep", [](std::string const&) { make(false); }},
+    {"create", [](std::string const&) { create(); }},
+    {"drop", [](std::string const&) { folders.pop_back(); }},
+    {"deletes", [](std::string const& value) { folders.back().deleteOnDestroy(value == "1"); }},
+    {"copy", [](std::string const&) { folders.emplace_back(folders.back()); }},
+    {"assign", [](std::string const&) { assign(); }},
+    {"status", [](std::string const&) { print(folders.back().status() ? "there" : "gone"); }},
+    {"put", put},
+    {"replace", [](std::string const&) { replaceByFile(); }},
+    {"calls", [](std::string const& value) { print(std::to_string(xos_HostCalls(value.c_str())).c_str()); }},
+    {"last", [](std::string const& value) { print(xos_HostLastCall(value.c_str())); }},
+    {"fail", [](std::string const& value) { xos_HostFail(value.c_str(), 0, 1); }},
+    {"touch", [](std::string const& value) { std::ofstream(value.c_str()).flush(); }},
+    {"wait", [](std::string const& value) { endUnless(waitUntil([&value] { return fs::exists(value); })); }},
+    {"background", [](std::string const&) { helper = std::thread([] { VDPTempDir::Create(madeByHelper); }); }},
+    {"tried",
+     [](std::string const& value) {
+         endUnless(awaitAttempts(xos_HostCalls("xos_FileStatByNameEx") + std::stoul(value)));
+     }},
+    {"join", [](std::string const&) { joinHelper(); }},
+    {"remove", [](std::string const& value) { fs::remove(value); }},
+    {"unblock", unblock},
+    {"threads", [](std::string const& value) { race(std::atoi(value.c_str())); }},
+};
+
 bool perform(std::string const& name, std::string const& value) {
-    if (name == "init") {
-        VDPTempDir::Init(std::atoi(value.c_str()));
-    } else if (name == "root") {
-        print(VDPTempDir::Root().c_str());
-    } else if (name == "make" || name == "keep") {
-        folders.emplace_back(name == "make");
-        print(folders.back().path().c_str());
-    } else if (name == "create") {
-        FPath path("before");
-        VDPTempDir::Create(path);
-        print(path.c_str());
-    } else if (name == "drop") {
-        folders.pop_back();
-    } else if (name == "deletes") {
-        folders.back().deleteOnDestroy(value == "1");
-    } else if (name == "copy") {
-        folders.emplace_back(folders.back());
-    } else if (name == "assign") {
-        assign();
-    } else if (name == "status") {
-        print(folders.back().status() ? "there" : "gone");
-    } else if (name == "put") {
-        std::ofstream((folders.back().path().c_str() + ("/" + value)).c_str()) << "text";
-    } else if (name == "replace") {
-        fs::remove_all(folders.back().path().c_str());
-        std::ofstream(folders.back().path().c_str()) << "text";
-    } else if (name == "calls") {
-        print(std::to_string(xos_HostCalls(value.c_str())).c_str());
-    } else if (name == "last") {
-        print(xos_HostLastCall(value.c_str()));
-    } else if (name == "fail") {
-        xos_HostFail(value.c_str(), 0, 1);
-    } else if (name == "touch") {
-        std::ofstream(value.c_str()).flush();
-    } else if (name == "wait") {
-        return waitUntil([&value] { return fs::exists(value); });
-    } else if (name == "background") {
-        helper = std::thread([] { VDPTempDir::Create(madeByHelper); });
-    } else if (name == "tried") {
-        return awaitAttempts(xos_HostCalls("xos_FileStatByNameEx") + std::stoul(value));
-    } else if (name == "join") {
-        joinHelper();
-    } else if (name == "remove") {
-        fs::remove(value);
-    } else if (name == "unblock") {
-        unblock(value);
-    } else if (name == "threads") {
-        race(std::atoi(value.c_str()));
-    } else {
-        return false;
+    for (Step const& step : STEPS) {
+        if (name != step.name) continue;
+        step.perform(value);
+        return true;
     }
-    return true;
+    return false;
 }
 
 } // namespace

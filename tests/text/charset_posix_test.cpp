@@ -172,7 +172,7 @@ TEST(CharsetPosix, converts_on_several_threads_at_once) {
     other.join();
 }
 
-// ---- the environment, each in a process of its own -----------------------------------------------------------------
+// ---- the environment, each in a process of its own ------------------------------------------------------------------
 
 namespace {
 

@@ -140,7 +140,7 @@ TEST(Convert, keeps_a_large_enough_buffer) {
     EXPECT_EQ(wide.wstr(), block);
 }
 
-// ---- narrow to narrow
+// ---- narrow to narrow -----------------------------------------------------------------------------------------------
 
 TEST(ConvertEncodeMB, copies_between_equal_encodings) {
     for (std::uint32_t e : {0u, 1u, 2u, 9u}) {

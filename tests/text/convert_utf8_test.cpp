@@ -9,7 +9,7 @@
 using namespace ZOR_Basis;
 using reference::WideText;
 
-// ---- UTF-8 to wide
+// ---- UTF-8 to wide --------------------------------------------------------------------------------------------------
 
 namespace {
 
@@ -140,7 +140,7 @@ TEST(ConvertUtf8ToWide, takes_a_zero_inside_a_given_length_as_text) {
     EXPECT_EQ(unitsOf(wide), WideText(ZB_W("\0ab"), 3));
 }
 
-// ---- wide to UTF-8
+// ---- wide to UTF-8 --------------------------------------------------------------------------------------------------
 
 TEST(ConvertWideToUtf8, replaces_unpaired_surrogates) {
     struct Case {

@@ -1,6 +1,7 @@
 #include "zor_basis/text/heap_str.h"
 
 #include "tests/support/table.h"
+#include "tests/text/call_content.h"
 #include "tests/text/string_kinds.h"
 
 #include <gtest/gtest.h>
@@ -13,8 +14,6 @@ using namespace ZOR_Basis;
 static_assert(sizeof(HeapStr) == 24);
 
 namespace {
-
-std::string contentOf(Str const& s) { return {s.c_str(), s.size()}; }
 
 class Opened : public HeapStr {
 public:
@@ -54,7 +53,7 @@ TEST(HeapStr, holds_exactly_what_it_is_given) {
           Case{{}, HeapStr(Exact<char>("abc"), 5), std::string("abc\0\0", 5)},
           Case{{}, HeapStr(std::string("a\0b", 3)), std::string("a\0\0", 3)}}) {
         SCOPED_TRACE(c.row);
-        EXPECT_EQ(contentOf(c.made), c.expected);
+        EXPECT_EQ(contentOfAny(c.made), c.expected);
         EXPECT_EQ(c.made.c_str()[c.made.size()], '\0');
         EXPECT_EQ(c.made.c_str() == Str::StrEmpty, c.expected.empty());
     }
@@ -70,7 +69,7 @@ TEST(HeapStr, Kept_text_13_a_length_of_zero_is_empty_and_never_measured) {
     s = "old";
     s = Str("abc", 0);
     EXPECT_TRUE(s.empty());
-    EXPECT_EQ(contentOf(HeapStr("\0ab", 3)), std::string(3, '\0')) << "and an empty text keeps its length";
+    EXPECT_EQ(contentOfAny(HeapStr("\0ab", 3)), std::string(3, '\0')) << "and an empty text keeps its length";
 }
 
 TEST(HeapStr, assigns_every_kind_of_source) {
@@ -125,7 +124,7 @@ TEST(HeapStr, takes_parts_of_its_own_text) {
     s.set(s.c_str() + 1, 2);
     EXPECT_EQ(s, "de");
     s.set(s.c_str() + 1, 2);
-    EXPECT_EQ(contentOf(s), std::string("e\0", 2)) << "in the same block";
+    EXPECT_EQ(contentOfAny(s), std::string("e\0", 2)) << "in the same block";
     s.set("abcdef");
     s.cut(3);
     HeapStr const& same = s;
@@ -201,8 +200,8 @@ TEST(HeapStr, is_a_key_of_hashed_containers) {
 
 TEST(HeapStr, sets_a_text) {
     HeapStr text;
-    EXPECT_EQ(content(text.set("abc")), "abc");
-    EXPECT_EQ(content(text.set("abc", 2)), "ab");
-    EXPECT_EQ(content(text.set("abc", 0)), "");
-    EXPECT_EQ(content(text.set(nullptr)), "");
+    EXPECT_EQ(contentOfAny(text.set("abc")), "abc");
+    EXPECT_EQ(contentOfAny(text.set("abc", 2)), "ab");
+    EXPECT_EQ(contentOfAny(text.set("abc", 0)), "");
+    EXPECT_EQ(contentOfAny(text.set(nullptr)), "");
 }

@@ -291,7 +291,7 @@ constexpr Operation<InlineTextBesideModel<String>> INLINE_TEXT_OPERATIONS[] = {
     {"count on", 8, countOn},
 };
 
-// ---- narrow strings
+// ---- narrow strings -------------------------------------------------------------------------------------------------
 
 template <class Both>
 void replaceTail(Both& b) {

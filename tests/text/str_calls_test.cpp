@@ -110,7 +110,7 @@ TYPED_TEST(StrCalls, take_a_literal_0_for_a_null_pointer) {
 
 #pragma GCC diagnostic pop
 
-// ---- paths
+// ---- paths ----------------------------------------------------------------------------------------------------------
 
 TEST(FPathCalls, make_a_path_from_two_parts) {
     std::string const string("d");

@@ -1,6 +1,8 @@
 #include "zor_basis/text/str.h"
 
 #include "tests/support/table.h"
+#include "tests/text/naive_order.h"
+#include "tests/text/string_kinds.h"
 #include "zor_basis/text/buf_str.h"
 
 #include <gtest/gtest.h>
@@ -18,19 +20,6 @@ static_assert(std::is_trivially_copyable_v<Str> && !std::is_polymorphic_v<Str>);
 static_assert(std::is_convertible_v<char const*, Str> && std::is_convertible_v<std::string, Str>);
 static_assert(std::is_convertible_v<Str, char const*> && !std::is_convertible_v<Str, std::string_view>);
 static_assert(std::is_constructible_v<std::string_view, Str>);
-
-namespace {
-
-/// A text in a block of its own, without a byte behind its terminator.
-struct ExactText {
-    explicit ExactText(std::string const& text) : bytes(text.begin(), text.end()) { bytes.push_back('\0'); }
-    operator char const*() const { return bytes.data(); }
-    std::vector<char> bytes;
-};
-
-int sign(int order) { return (order > 0) - (order < 0); }
-
-} // namespace
 
 TEST(Str, breathes) {
     Str const view("job.ps");
@@ -177,32 +166,32 @@ TEST(Str, Kept_text_01_the_right_hand_size_alone_decides_how_equality_compares) 
 }
 
 TEST(Str, equality_reads_nothing_behind_a_terminator) {
-    ExactText const a("ab");
-    ExactText const b("ab");
-    ExactText const c("ax");
+    Exact<char> const a("ab");
+    Exact<char> const b("ab");
+    Exact<char> const c("ax");
     EXPECT_TRUE(Str(a, 100) == Str(b, 100));
     EXPECT_FALSE(Str(a, 100) == Str(c, 100));
     EXPECT_TRUE(Str(a, 100).beginWith(Str(b, 100)));
     EXPECT_EQ(Str(a).compare(b, 100), 0);
-    EXPECT_EQ(Str("", 64), ExactText("")) << "and sizes do not matter for plain text";
+    EXPECT_EQ(Str("", 64), Exact<char>("")) << "and sizes do not matter for plain text";
 }
 
 TEST(Str, equality_sees_a_difference_at_every_place) {
     for (std::size_t size = 1; size < 150; ++size) {
         std::string const text(size, 'a');
-        ExactText const left(text);
-        ASSERT_TRUE(Str(left, size) == Str(ExactText(text), size)) << size;
+        Exact<char> const left(text);
+        ASSERT_TRUE(Str(left, size) == Str(Exact<char>(text), size)) << size;
         for (std::size_t place = 0; place < size; ++place) {
             for (char other : {'b', '\0', '\xE9'}) {
                 std::string changed = text;
                 changed[place] = other;
-                ASSERT_FALSE(Str(left, size) == Str(ExactText(changed), size)) << size << ' ' << place;
+                ASSERT_FALSE(Str(left, size) == Str(Exact<char>(changed), size)) << size << ' ' << place;
                 ASSERT_FALSE(Str(left, size) == changed) << size << ' ' << place;
                 std::string both = text;
                 both[place] = '\0';
                 std::string tail = both;
                 if (place + 1 < size) tail[place + 1] = other;
-                ASSERT_TRUE(Str(ExactText(both), size) == Str(ExactText(tail), size)) << size << ' ' << place;
+                ASSERT_TRUE(Str(Exact<char>(both), size) == Str(Exact<char>(tail), size)) << size << ' ' << place;
             }
         }
     }
@@ -270,7 +259,7 @@ TEST(Str, Kept_text_02_ordering_does_not_look_at_sizes) {
     char const* same = "abc";
     EXPECT_EQ(Str(same, 1).compare(Str(same, 3)), 0);
     EXPECT_FALSE(Str(same, 1) < Str(same, 3));
-    EXPECT_FALSE(Str(ExactText("ab"), 1) == Str("ab", 2)) << "equality disagrees with the order here";
+    EXPECT_FALSE(Str(Exact<char>("ab"), 1) == Str("ab", 2)) << "equality disagrees with the order here";
 }
 
 TEST(Str, compares_a_number_of_bytes) {
@@ -281,7 +270,7 @@ TEST(Str, compares_a_number_of_bytes) {
     EXPECT_EQ(view.compare("xyz", 0), 0);
     EXPECT_EQ(view.compare(view.c_str(), 3), 0);
     EXPECT_GT(Str("\xE9").compare("z", 1), 0);
-    EXPECT_EQ(sign(view.compare("abd", 100)), -1);
+    EXPECT_EQ(signOf(view.compare("abd", 100)), -1);
 }
 
 TEST(Str, hashes_its_text_to_the_terminator) {

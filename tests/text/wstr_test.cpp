@@ -1,6 +1,7 @@
 #include "zor_basis/text/wstr.h"
 
 #include "tests/support/table.h"
+#include "tests/text/string_kinds.h"
 
 #include <gtest/gtest.h>
 
@@ -28,13 +29,6 @@ static_assert(HasLess<WStr, WStr> && !HasLessOrEqual<WStr, WStr>);
 static_assert(!HasLess<WStr, WChar const*> && !HasLess<WChar const*, WStr> && !HasLessOrEqual<WChar const*, WStr>);
 
 using WText = std::basic_string<WChar>;
-
-/// A text in a block of its own, without a unit behind its terminator.
-struct ExactWideText {
-    explicit ExactWideText(WText const& text) : units(text.begin(), text.end()) { units.push_back(0); }
-    operator WChar const*() const { return units.data(); }
-    std::vector<WChar> units;
-};
 
 } // namespace
 
@@ -111,8 +105,8 @@ TEST(WStr, is_compared_from_the_other_side_too) {
 }
 
 TEST(WStr, equality_reads_nothing_behind_a_terminator) {
-    ExactWideText const a(WText(2, WChar('a')));
-    ExactWideText const b(WText(2, WChar('a')));
+    Exact<WChar> const a(WText(2, WChar('a')));
+    Exact<WChar> const b(WText(2, WChar('a')));
     EXPECT_TRUE(WStr(a, 100) == WStr(b, 100));
     EXPECT_EQ(WStr(a).compare(b, 100), 0);
 }
