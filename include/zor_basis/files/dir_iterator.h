@@ -1,7 +1,7 @@
 /// \file
 /// `DirIteratorW`: lists the entries of one directory by wide name.
 ///
-///     DirIteratorW list(LOOK_FILES, folder);
+///     DirIteratorW list(LOOK_FILES, ZB_W("jobs"));
 ///     while (WChar const* name = list->next()) use(name, list->size());
 ///
 /// Entries come in the system's order, unsorted; hidden ones are included, "." and ".." are not. On Windows the system

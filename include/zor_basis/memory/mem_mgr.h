@@ -10,7 +10,7 @@
 /// Sizes are in bytes. If memory is short, `alloc` returns null. Freeing null does nothing.
 ///
 ///     MemMgrPtr nodes(MemMgr::makeSmlBlk(sizeof(Node), 100, 10000, alignof(Node)));
-///     if (void* place = nodes->alloc()) list = new (place) Node;
+///     if (void* place = nodes->alloc()) use(new (place) Node);
 ///
 /// \thread the standard manager: like the runtime's heap; the others: one thread at a time
 

@@ -18,7 +18,7 @@
 ///     std::unique_ptr<MultiTaskQueue> queue(MultiTaskQueue::New(MultiTaskQueue::Continue, 4));
 ///     for (int i = 0; i < 4; ++i) queue->add(Pages::render, &pages, false, true, false);
 ///     queue->wait(); // never more than four pages at a time
-///     if (queue->failed()) ...
+///     if (queue->failed()) report("a page is missing");
 ///
 /// A job is started when a task is created for it, and finishes when its function returns. `add` starts it unless as
 /// many jobs run as the limit says; a forced job (`startNow`) starts regardless of the limit. Otherwise it waits.

@@ -2,7 +2,7 @@
 /// `SemSet`: locks by number, for any number of objects, without a permanent lock for each of them.
 ///
 ///     SemSet jobs(1000);
-///     if (jobs->take(jobNumber)) { ...; jobs->give(jobNumber); }
+///     if (jobs->take(jobNumber)) { render(); jobs->give(jobNumber); }
 ///
 /// A key has its own mutex from the first `take` to the last `give`. Keys are spread over buckets; two keys in one
 /// bucket share only brief book-keeping, never a mutex.

@@ -13,9 +13,7 @@
 /// A report is a file in the folder "timer" of the root folder, named SECONDS_MANAGER_RIP.timer: the time in seconds
 /// since 1970 UTC as a signed 32-bit number, the manager's name, and the number that `setRip` set. It consists of a
 /// header of two lines, the line of column titles, and a row (`PileTimer::print`, in microseconds) for every timer in
-/// ascending order of ids.
-///
-///     1700000000_render_0.timer
+/// ascending order of ids. An example of a name is "1700000000_render_0.timer".
 ///
 /// \kept timers-08: reports of one manager within one second go into the same file, each with its own header
 /// \thread thread-safe: `Mgr`, `New`, `Get`, `setRip`, `setActive`, `active`; with each other `createTimer`, `create`,

@@ -104,6 +104,7 @@ public:
 
     /// \name Flat listing
     ///
+    ///     FileIterator list(folder, LOOK_FILES, "*.txt", nullptr);
     ///     while (char const* name = list.next()) use(name);
     /// @{
     /// Closes an open listing and opens a new one.
