@@ -10,6 +10,12 @@
 
 namespace ZOR_Basis {
 
+/// Names for the boolean arguments.
+inline constexpr bool NEW_KEY_SET = true;
+inline constexpr bool EXISTING_KEY_SET = false;
+inline constexpr bool EXPORTABLE = true;
+inline constexpr bool NOT_EXPORTABLE = false;
+
 /// The functions return whether they succeeded; a handle of 0 makes them fail.
 struct CryptService {
     /// A provider, a hash or a key; 0 is none.

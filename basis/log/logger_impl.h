@@ -5,6 +5,7 @@
 #define BASIS_LOG_LOGGER_IMPL_H
 
 #include "basis/containers/linked_list.h"
+#include "basis/ground/choices.h"
 #include "basis/platform/hq_basis.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/log/logger.h"
@@ -88,7 +89,7 @@ private:
     Buffer* current_ = nullptr;
     std::uint64_t session_ = 0;
     HeapStr name_;
-    Lock lock_{Lock::Mutex, false};
+    Lock lock_{Lock::Mutex, UNLOCKED};
     bool closing_ = false;
     std::uint32_t alertId_ = 0;
     std::uint32_t lastWrite_ = 0;

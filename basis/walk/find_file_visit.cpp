@@ -1,5 +1,6 @@
 #include "zor_basis/walk/find_file_visit.h"
 
+#include "basis/ground/choices.h"
 #include "zor_basis/walk/file_iterator.h"
 
 #include <cstring>
@@ -51,7 +52,7 @@ using namespace ZOR_Basis;
 int zbFindFile(Str const& dir, char const* wildcard, LookForType type, FPath& found, bool firstOnly, bool deep) {
     FileIterator walk(dir, type, wildcard, nullptr);
     FindFileVisit search(!firstOnly, firstOnly ? 1 : 0);
-    walk.doIt(&search, deep, false);
+    walk.doIt(&search, deep, IGNORING_FAILURES);
     found = search.getPath();
     return search.getNum();
 }
