@@ -38,10 +38,6 @@ bool isFileNow(char const* path) {
 
 } // namespace
 
-IFile::~IFile() = default;
-
-std::uint64_t IFile::getline(char*, std::uint64_t) { return 0; }
-
 bool File::attach(IFile* file) {
     file_ = file;
     return isOpen();

@@ -3,8 +3,12 @@
 #include "basis/files/whole_entry.h"
 #include "basis/ground/choices.h"
 
-using namespace ZOR_Basis;
+namespace ZOR_Basis {
 
 bool FileDeleteVisitor::perform(FileEntry* entry) { return freeDestination(entry->getFullPath(), OVERWRITING); }
 
-bool zbCheckRemoveFileDir(FPath const& path, bool remove) { return freeDestination(path, remove); }
+} // namespace ZOR_Basis
+
+bool zbCheckRemoveFileDir(ZOR_Basis::FPath const& path, bool remove) {
+    return ZOR_Basis::freeDestination(path, remove);
+}
