@@ -36,7 +36,8 @@ struct CryptService {
     /// \param n  its length; becomes the padded one
     /// \param data  null: only the length is wanted
     bool (*encrypt)(Handle key, char* data, std::uint32_t& n, std::uint32_t room);
-    /// Decrypts a whole message in place. \param n  its length; becomes that without the padding
+    /// Decrypts a whole message in place.
+    /// \param n  its length; becomes that without the padding
     bool (*decrypt)(Handle key, char* data, std::uint32_t& n);
     void (*destroyKey)(Handle key);
     /// The code of the calling thread's last error.

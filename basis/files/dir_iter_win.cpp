@@ -2,7 +2,7 @@
 
 #include "basis/files/dir_iter.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <new>
 

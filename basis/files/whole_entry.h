@@ -13,7 +13,8 @@ bool removeFile(char const* path);
 
 bool copyFile(char const* dst, char const* src, bool overwrite);
 
-/// Removes a directory with all its contents. \return true also if nothing exists there
+/// Removes a directory with all its contents.
+/// \return true also if nothing exists there
 bool removeTree(char const* path);
 
 /// Frees the path of a destination, where the status says that something exists.

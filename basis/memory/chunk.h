@@ -31,12 +31,14 @@ struct LB {
 
 using Chunks = SngList<LB>;
 
-/// A record over memory of the caller. \return null when memory runs out
+/// A record over memory of the caller.
+/// \return null when memory runs out
 inline Chunks::Unit* borrowChunk(std::uint64_t size, void* memory) {
     return new (std::nothrow) Chunks::Unit{nullptr, LB(size, static_cast<char*>(memory), LB::BORROWED)};
 }
 
-/// A record over memory of its own. \return null when memory runs out
+/// A record over memory of its own.
+/// \return null when memory runs out
 inline Chunks::Unit* makeChunk(std::uint64_t size) {
     char* const data = static_cast<char*>(std::malloc(size));
     if (data == nullptr) return nullptr;

@@ -34,7 +34,8 @@ public:
 class JobCursor {
 public:
     void moveTo(JobEntry* entry) { place_.store(wordOf(entry), std::memory_order_release); }
-    /// Goes to the next entry. \pre is somewhere
+    /// Goes to the next entry.
+    /// \pre is somewhere
     void advance() {
         JobEntry* const entry = nearest();
         moveTo(isBetween() ? entry : entry->next);

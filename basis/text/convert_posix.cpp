@@ -1,4 +1,4 @@
-// Conversions by our own UTF-8 and by the locale's character set. The sibling is convert_win.cpp.
+// The sibling is convert_win.cpp. Conversions by our own UTF-8 and by the locale's character set.
 
 #include "basis/text/convert_impl.h"
 

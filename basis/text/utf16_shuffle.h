@@ -1,6 +1,6 @@
 /// \file
-/// A block of UTF-16 becomes UTF-8 of one byte or two a unit, or of three: with SSSE3. Without it, characters beyond ASCII
-/// are taken by themselves.
+/// A block of UTF-16 becomes UTF-8 of one or two bytes a unit, or of three: with SSSE3. Without it, characters beyond
+/// ASCII are taken by themselves.
 
 #ifndef BASIS_TEXT_UTF16_SHUFFLE_H
 #define BASIS_TEXT_UTF16_SHUFFLE_H
@@ -13,7 +13,8 @@ namespace ZOR_Basis::Utf {
 
 constexpr Selection SHORTENED_UNITS = makeSelection(1, 2);
 
-/// Stores a block of units up to 0x7FF, each as one byte or two. \return the bytes; 0 if there are greater units
+/// Stores a block of units up to 0x7FF, each as one byte or two.
+/// \return the bytes; 0 if there are greater units
 ZB_SSSE3 inline unsigned storeMixedBlock(__m128i block, char* out) {
     if (bitsOf(without(block, 0xF800)) != 0xFFFF) return 0;
     __m128i const ascii = without(block, 0xFF80);
@@ -27,7 +28,8 @@ ZB_SSSE3 inline unsigned storeMixedBlock(__m128i block, char* out) {
 inline constexpr std::uint64_t LONG_BLOCK_BYTES = 3 * BLOCK_UNITS;
 inline constexpr std::uint64_t LONG_BLOCK_ROOM = LONG_BLOCK_BYTES + 4; // what is stored beyond the block
 
-/// Stores a block of units of three bytes each. \return whether it is one
+/// Stores a block of units of three bytes each.
+/// \return whether it is one
 ZB_SSSE3 inline bool storeLongBlock(__m128i block, char* out) {
     __m128i const high = _mm_and_si128(block, units(0xF800));
     if (bitsOf(_mm_or_si128(zeroUnits(high), _mm_cmpeq_epi16(high, units(0xD800)))) != 0) return false;

@@ -21,7 +21,8 @@ private:
     Handle handle_;
 };
 
-/// Walks one folder, not its sub-folders, up to the first entry whose handling fails. \return whether none did
+/// Walks one folder, not its sub-folders, up to the first entry whose handling fails.
+/// \return whether none did
 template <class Handle>
 bool forEachEntry(ZOR_Basis::FPath const& folder, ZOR_Basis::LookForType type, Handle handle) {
     EachEntry<Handle> visitor(std::move(handle));
