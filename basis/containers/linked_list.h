@@ -23,7 +23,8 @@ public:
         ++count_;
     }
 
-    /// The node keeps its own links. \pre it is in the list
+    /// The node keeps its own links.
+    /// \pre it is in the list
     void unlink(Node* node) {
         (node->previous != nullptr ? node->previous->next : first_) = node->next;
         (node->next != nullptr ? node->next->previous : last_) = node->previous;

@@ -1,6 +1,7 @@
 #include "zor_basis/crypto/cr_hash.h"
 
 #include "basis/crypto/cr_hash_impl.h"
+#include "basis/ground/choices.h"
 #include "zor_basis/store/blob.h"
 
 namespace ZOR_Basis {
@@ -12,7 +13,7 @@ constexpr std::uint64_t LARGEST_PIECE = std::uint64_t{1} << 30;
 bool exportTo(Blob& out, CryptService::Handle key) {
     std::uint32_t n = 0;
     if (!cryptService.exportKey(key, nullptr, n)) return false;
-    out.alloc(n, false);
+    out.alloc(n, DISCARDING_BYTES);
     if (out.sizeBuf() < n) return false;
     if (!cryptService.exportKey(key, out.buf(), n)) return false;
     out.setSize(n);
@@ -40,7 +41,7 @@ bool CrHashWin::hashData(void const* data, std::uint64_t len) {
 
 bool CrHashWin::exportKey(Blob& out) {
     CryptService::Handle key = 0;
-    if (!cryptService.deriveKey(provider_, hash_, true, key)) return false;
+    if (!cryptService.deriveKey(provider_, hash_, EXPORTABLE, key)) return false;
     bool const done = exportTo(out, key);
     cryptService.destroyKey(key);
     return done;

@@ -13,7 +13,7 @@ class CrKeyWin final : public CrKey {
 public:
     /// Derives the key of what a hash holds.
     CrKeyWin(CryptService::Handle provider, CryptService::Handle hash) {
-        cryptService.deriveKey(provider, hash, false, key_);
+        cryptService.deriveKey(provider, hash, NOT_EXPORTABLE, key_);
     }
     CrKeyWin(CrKeyWin const&) = delete;
     CrKeyWin& operator=(CrKeyWin const&) = delete;

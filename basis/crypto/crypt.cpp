@@ -29,7 +29,7 @@ Crypt* Crypt::make(char const*) {
 }
 
 CryptWin::CryptWin() {
-    if (cryptService.acquire(provider_, false) || cryptService.acquire(provider_, true)) return;
+    if (cryptService.acquire(provider_, EXISTING_KEY_SET) || cryptService.acquire(provider_, NEW_KEY_SET)) return;
     describeFailure();
 }
 

@@ -10,6 +10,12 @@
 
 namespace ZOR_Basis {
 
+/// Names for the boolean arguments.
+inline constexpr bool NEW_KEY_SET = true;
+inline constexpr bool EXISTING_KEY_SET = false;
+inline constexpr bool EXPORTABLE = true;
+inline constexpr bool NOT_EXPORTABLE = false;
+
 /// The functions return whether they succeeded; a handle of 0 makes them fail.
 struct CryptService {
     /// A provider, a hash or a key; 0 is none.
@@ -30,7 +36,8 @@ struct CryptService {
     /// \param n  its length; becomes the padded one
     /// \param data  null: only the length is wanted
     bool (*encrypt)(Handle key, char* data, std::uint32_t& n, std::uint32_t room);
-    /// Decrypts a whole message in place. \param n  its length; becomes that without the padding
+    /// Decrypts a whole message in place.
+    /// \param n  its length; becomes that without the padding
     bool (*decrypt)(Handle key, char* data, std::uint32_t& n);
     void (*destroyKey)(Handle key);
     /// The code of the calling thread's last error.

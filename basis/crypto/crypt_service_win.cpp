@@ -2,7 +2,7 @@
 
 #include "basis/crypto/crypt_service.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <wincrypt.h>
 

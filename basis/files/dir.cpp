@@ -4,6 +4,7 @@
 #include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
 #include "basis/files/system_calls.h"
+#include "basis/ground/choices.h"
 #include "zor_basis/files/f_stat.h"
 #include "zor_basis/files/wc_path.h"
 
@@ -127,7 +128,7 @@ bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
     // kept dir-03: a caller that moves expects the source to be gone; it is better to send a job again than to find it
     // twice.
     KeepLastError const whyNotCopied;
-    Rem(src, true, flagB);
+    Rem(src, WITH_CONTENTS, flagB);
     return copied;
 }
 

@@ -1,6 +1,6 @@
 // The sibling is dir_iter_win.cpp.
 
-#include "zor_basis/files/dir_iterator.h"
+#include "basis/files/dir_iter.h"
 
 #include "basis/files/os_path_posix.h"
 #include "basis/files/system_calls.h"
@@ -17,17 +17,10 @@
 namespace ZOR_Basis {
 namespace {
 
-class PosixDirIterW final : public DirIterImplW {
+class PosixDirIterW final : public SystemDirIterW {
 public:
-    PosixDirIterW(LookForType type, WChar const* path) : DirIterImplW(type, path) {}
+    PosixDirIterW(LookForType type, WChar const* path) : SystemDirIterW(type, path) {}
     ~PosixDirIterW() override { close(); }
-
-    void finish() override {
-        close();
-        removeWildCard();
-        first_ = true;
-        lastError_ = 0;
-    }
 
     WChar const* next() override {
         if (first_) start();
@@ -102,7 +95,7 @@ private:
         return status_;
     }
 
-    void close() {
+    void close() override {
         if (directory_ != nullptr) closedir(directory_);
         directory_ = nullptr;
         entry_ = nullptr;

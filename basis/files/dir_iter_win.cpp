@@ -1,8 +1,8 @@
 // The sibling is dir_iter_posix.cpp.
 
-#include "zor_basis/files/dir_iterator.h"
+#include "basis/files/dir_iter.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <new>
 
@@ -14,17 +14,10 @@ constexpr std::int64_t SECONDS_FROM_1601_TO_1970 = 11'644'473'600;
 
 std::uint64_t join(DWORD high, DWORD low) { return static_cast<std::uint64_t>(high) << 32 | low; }
 
-class WinDirIterW final : public DirIterImplW {
+class WinDirIterW final : public SystemDirIterW {
 public:
-    WinDirIterW(LookForType type, WChar const* path) : DirIterImplW(type, path) {}
+    WinDirIterW(LookForType type, WChar const* path) : SystemDirIterW(type, path) {}
     ~WinDirIterW() override { close(); }
-
-    void finish() override {
-        close();
-        removeWildCard();
-        first_ = true;
-        lastError_ = 0;
-    }
 
     WChar const* next() override {
         while (step()) {
@@ -61,7 +54,7 @@ private:
         return search_ != INVALID_HANDLE_VALUE;
     }
 
-    void close() {
+    void close() override {
         if (search_ != INVALID_HANDLE_VALUE) FindClose(search_);
         search_ = INVALID_HANDLE_VALUE;
     }

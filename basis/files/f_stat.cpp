@@ -1,6 +1,7 @@
 #include "zor_basis/files/f_stat.h"
 
 #include "basis/files/path_rules.h"
+#include "basis/files/platform_flags.h"
 #include "basis/files/system_calls.h"
 
 namespace ZOR_Basis {
@@ -63,7 +64,7 @@ bool FStat::update(char const* path, bool platformFallback) {
     path = PathRules::orEmpty(path);
     xos_Stat record{};
     if (!systemCalls.status(path, record)) {
-        if (!platformFallback || xos_FileStatByNameEx(path, &record, 0x4000) != 0) return false;
+        if (!platformFallback || xos_FileStatByNameEx(path, &record, NAMES_AS_STORED) != 0) return false;
     }
     type_ = kindOf(record.st_mode_);
     modified_ = record.st_mtime_;

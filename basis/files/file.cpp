@@ -4,6 +4,7 @@
 #include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
 #include "basis/files/platform_flags.h"
+#include "basis/files/whole_entry.h"
 #include "zor_basis/files/dir.h"
 #include "zor_basis/files/f_stat.h"
 
@@ -14,8 +15,6 @@ namespace {
 
 using PathRules::orEmpty;
 
-constexpr std::uint32_t WRITE_AND_CREATE = 0x54;
-
 IFile* makeBackend(char const* path, int mode, bool flag) {
     if ((mode & File::FILE_CRT) == 0) {
         return new (std::nothrow) FileXosBasics(path, flag ? mode | File::FILE_NOCREATEFLAG : mode);
@@ -24,15 +23,9 @@ IFile* makeBackend(char const* path, int mode, bool flag) {
     return new (std::nothrow) FileStdDir(path, mode);
 }
 
-bool remove(char const* path) { return xos_FileRemove(orEmpty(path), REMOVE_ALWAYS) == 0; }
-
-bool copy(char const* dst, char const* src, bool overwrite) {
-    return xos_FileCopy(orEmpty(dst), orEmpty(src), overwrite ? 1 : 0) == 0;
-}
-
 /// Opens a file, which makes it where nothing is.
 bool touch(char const* path) {
-    xos_File const made = xos_FileOpen(orEmpty(path), WRITE_AND_CREATE);
+    xos_File const made = xos_FileOpen(orEmpty(path), OPEN_WRITES | OPEN_CREATES);
     if (made != 0) xos_FileCloseEx(made, 0);
     return made != 0;
 }
@@ -43,15 +36,7 @@ bool isFileNow(char const* path) {
     return entry.isFile();
 }
 
-bool removeEntry(char const* path, FStat const& entry) {
-    return entry.isDir() ? Dir::Rem(path, true, false) : remove(path);
-}
-
 } // namespace
-
-IFile::~IFile() = default;
-
-std::uint64_t IFile::getline(char*, std::uint64_t) { return 0; }
 
 bool File::attach(IFile* file) {
     file_ = file;
@@ -87,30 +72,25 @@ bool File::Rem(char const* path, bool flagA, bool flagB) {
 
 bool File::Copy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     if (makeDirs && !Dir::NewFor(dst)) return false;
-    return copy(dst, src, overwrite);
+    return copyFile(dst, src, overwrite);
 }
 
 bool File::Move(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     if (makeDirs && !Dir::NewFor(dst)) return false;
-    if (xos_FileMove(orEmpty(dst), orEmpty(src), overwrite ? 1 : 0) == 0) return true;
+    if (xos_FileMove(orEmpty(dst), orEmpty(src), overwriteIf(overwrite)) == 0) return true;
     bool const hasPlace = !makeDirs || Dir::NewFor(dst);
-    bool const copied = hasPlace && copy(dst, src, overwrite);
+    bool const copied = hasPlace && copyFile(dst, src, overwrite);
     // kept file-04: a caller that moves expects the source to be gone; it is better to send a job again than to find it
     // twice.
     KeepLastError const whyNotCopied;
-    remove(src);
+    removeFile(src);
     return copied;
 }
 
 bool File::LinkOrCopy(char const* dst, char const* src, bool overwrite, bool makeDirs) {
     FStat const entry(dst);
-    if (entry.exist()) {
-        if (!overwrite) return refuse(Reason::ALREADY_THERE);
-        if (!removeEntry(dst, entry)) return false;
-    } else if (makeDirs && !Dir::NewFor(dst)) {
-        return false;
-    }
-    return Dir::Link(dst, src) || copy(dst, src, true);
+    bool const isFree = entry.exist() ? freeDestination(dst, entry, overwrite) : !makeDirs || Dir::NewFor(dst);
+    return isFree && linkOrCopy(dst, src);
 }
 
 } // namespace ZOR_Basis

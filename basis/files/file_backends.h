@@ -27,7 +27,8 @@ public:
     bool flush() override;
     std::int64_t seek(int origin, int offset) override;
     bool isOpen() override { return handle_ != 0; }
-    /// Closes the file before the end of the object's life. \return whether all that was written has arrived
+    /// Closes the file before the end of the object's life.
+    /// \return whether all that was written has arrived
     bool close() { return xos_FileCloseEx(std::exchange(handle_, 0), 0) == 0; }
 
 private:

@@ -1,6 +1,7 @@
 #include "basis/files/file_backends.h"
 #include "basis/files/last_error.h"
 #include "basis/files/path_rules.h"
+#include "basis/files/platform_flags.h"
 #include "zor_basis/files/file.h"
 
 #include <cstring>
@@ -11,12 +12,12 @@ namespace {
 std::uint32_t flagsOf(int mode) {
     // The platform layer's text mode, 0x20, is never asked for: what is written comes back as it was.
     std::uint32_t flags = 0;
-    if ((mode & File::FILE_READ) != 0) flags |= 0x02;
-    if ((mode & File::FILE_WRITE) != 0) flags |= 0x14;
-    if ((mode & File::FILE_TRUNC) != 0) flags |= 0x01;
-    if ((mode & File::FILE_APPEND) != 0) flags |= 0x08;
-    if ((mode & File::FILE_NOCREATEFLAG) == 0) flags |= 0x40;
-    if ((mode & File::FILE_PLATFORM_EXTRA) != 0) flags |= 0x4000000;
+    if ((mode & File::FILE_READ) != 0) flags |= OPEN_READS;
+    if ((mode & File::FILE_WRITE) != 0) flags |= OPEN_WRITES;
+    if ((mode & File::FILE_TRUNC) != 0) flags |= OPEN_TRUNCATES;
+    if ((mode & File::FILE_APPEND) != 0) flags |= OPEN_APPENDS;
+    if ((mode & File::FILE_NOCREATEFLAG) == 0) flags |= OPEN_CREATES;
+    if ((mode & File::FILE_PLATFORM_EXTRA) != 0) flags |= ENCRYPTED_STORE;
     return flags;
 }
 

@@ -23,7 +23,8 @@ enum class Reason {
     LOGON_REFUSED,
 };
 
-/// Sets the last error. \return false
+/// Sets the last error.
+/// \return false
 bool refuse(Reason reason);
 
 /// The last error at the time of construction.

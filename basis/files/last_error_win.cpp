@@ -2,7 +2,7 @@
 
 #include "basis/files/last_error.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <cerrno>
 

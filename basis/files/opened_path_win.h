@@ -6,7 +6,7 @@
 #define BASIS_FILES_OPENED_PATH_WIN_H
 
 #include "basis/files/last_error.h"
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 #include "zor_basis/files/f_path.h"
 
 namespace ZOR_Basis {

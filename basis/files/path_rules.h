@@ -98,7 +98,9 @@ bool isSub(Char const* path, Char const* directory) {
 }
 
 /// Writes the normalised form: each run of slashes as one "/", the first run as two where it begins the text with two,
-/// or, for a URL, wherever it stands. \param out  room for the source's length + 1 \return the characters written
+/// or, for a URL, wherever it stands.
+/// \param out  room for the source's length + 1
+/// \return the characters written
 template <class Char>
 std::uint64_t normalize(Char const* source, bool url, Char* out) {
     Char* const begin = out;

@@ -137,7 +137,7 @@ private:
     static void normalizeOther(String& path, Char const* source, std::uint64_t length, bool url) {
         path.clear();
         path.extendBuf(length + 2);
-        Text::setSize(path, PathRules::normalize(source, url, path.getBuf()));
+        path.setSize(PathRules::normalize(source, url, path.getBuf()));
     }
 };
 

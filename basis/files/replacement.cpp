@@ -4,6 +4,8 @@
 #include "basis/files/platform_flags.h"
 #include "basis/files/replacement_impl.h"
 #include "basis/files/system_calls.h"
+#include "basis/files/whole_entry.h"
+#include "basis/ground/choices.h"
 
 #include <atomic>
 
@@ -11,7 +13,6 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr int MOST_ATTEMPTS = 100;
-constexpr int REPLACES = 1;
 
 /// A name in the folder of the target that is new in all likelihood, and short whatever the target's is.
 void nameBeside(FPath const& target, FPath& temporary) {
@@ -28,7 +29,7 @@ Replacement::~Replacement() {
     if (temporary_.empty()) return;
     KeepLastError const kept;
     file_.reset();
-    xos_FileRemove(temporary_, REMOVE_ALWAYS);
+    removeFile(temporary_);
 }
 
 bool Replacement::open(char const* path, int mode) {
@@ -51,7 +52,7 @@ bool Replacement::makeTemporary() {
 
 bool Replacement::putInPlace() {
     if (!file_->flush() || !file_->close()) return false;
-    if (xos_FileMove(target_, temporary_, REPLACES) != 0) return false;
+    if (xos_FileMove(target_, temporary_, overwriteIf(OVERWRITING)) != 0) return false;
     temporary_.clear();
     return true;
 }

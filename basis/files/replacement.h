@@ -31,7 +31,8 @@ public:
     /// \param mode  as for `File::open`
     /// \error also where the file that is there may not be written, or is no file
     bool open(char const* path, int mode);
-    /// What takes the content. \pre it is open
+    /// What takes the content.
+    /// \pre it is open
     IFile& content() { return *file_; }
     /// Flushes the content to the disk and then renames the temporary file.
     bool putInPlace();

@@ -18,7 +18,8 @@ bool followLinks(char const* path, FPath& target);
 enum class Made { YES, NAME_TAKEN, FAILED };
 
 /// Makes an empty file that nothing had the name of, with the owner and the permissions of the target if there is one,
-/// as far as the system allows. \return FAILED also where a target may not be written, or is no file
+/// as far as the system allows.
+/// \return FAILED also where a target may not be written, or is no file
 Made makeBeside(char const* temporary, char const* target);
 
 /// Whether a name may begin behind this character of a path.

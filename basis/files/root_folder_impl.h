@@ -11,7 +11,8 @@ namespace ZOR_Basis::RootFolder {
 /// Whether all absolute paths begin at one place, "/".
 extern bool const HAS_ONE_FILE_SYSTEM;
 
-/// Writes the current folder. \return false if it does not fit `size` bytes, or is not to be had
+/// Writes the current folder.
+/// \return false if it does not fit `size` bytes, or is not to be had
 bool currentFolder(char* out, std::uint64_t size);
 
 } // namespace ZOR_Basis::RootFolder

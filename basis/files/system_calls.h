@@ -26,7 +26,8 @@ enum SystemError : std::uint32_t {
 };
 
 struct SystemCalls {
-    /// Status by a narrow path; on Linux of a link itself. \return whether there is an entry
+    /// Status by a narrow path; on Linux of a link itself.
+    /// \return whether there is an entry
     bool (*status)(char const* path, xos_Stat& record);
     /// The same of what a link leads to.
     bool (*statusOfTarget)(char const* path, xos_Stat& record);

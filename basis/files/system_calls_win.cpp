@@ -3,7 +3,7 @@
 #include "basis/files/system_calls.h"
 
 #include "basis/files/last_error.h"
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <direct.h>
 #include <sys/stat.h>

@@ -1,7 +1,7 @@
 #include "basis/system/mode_flags.h"
 #include "zor_basis/flat.h"
 
-using namespace ZOR_Basis;
+namespace ModeFlags = ZOR_Basis::ModeFlags;
 
 namespace {
 

@@ -5,12 +5,12 @@
 
 #include <cstring>
 
-using namespace ZOR_Basis;
+namespace PathRules = ZOR_Basis::PathRules;
 
 namespace {
 
 int escapeDigit(char c) {
-    int const value = Str::hexToDigit(c);
+    int const value = ZOR_Basis::Str::hexToDigit(c);
     return value < 0 ? 0 : value;
 }
 

@@ -1,9 +1,12 @@
+#include "basis/ground/choices.h"
 #include "zor_basis/flat.h"
 #include "zor_basis/timers/base_timer.h"
 #include "zor_basis/timers/pile_timer.h"
 #include "zor_basis/timers/timer_mgr.h"
 
-using namespace ZOR_Basis;
+using ZOR_Basis::BaseTimer;
+using ZOR_Basis::PileTimer;
+using ZOR_Basis::TimerMgr;
 
 namespace {
 
@@ -20,7 +23,7 @@ void asTimer(zbTimerDat& measurement, Act act) {
 
 void zbTimerBaseStart(zbTimerDat* measurement, int suspended) {
     // kept flat-01: a caller's record may hold anything before its first start.
-    if (measurement != nullptr) *measurement = BaseTimer(true, suspended != 0);
+    if (measurement != nullptr) *measurement = BaseTimer(ZOR_Basis::STARTED, suspended != 0);
 }
 
 void zbTimerBaseStop(zbTimerDat* measurement, zbPileTimer* pile) {
@@ -37,7 +40,7 @@ void zbTimerBaseResume(zbTimerDat* measurement) {
     if (measurement != nullptr) asTimer(*measurement, [](BaseTimer& timer) { timer.resume(); });
 }
 
-void zbTimerStart(zbPileTimer* timer) { PileTimer::start(timer, false); }
+void zbTimerStart(zbPileTimer* timer) { PileTimer::start(timer, ZOR_Basis::NOT_SUSPENDED); }
 void zbTimerStop(zbPileTimer* timer) { PileTimer::stop(timer); }
 void zbTimerSuspend(zbPileTimer* timer) { PileTimer::suspend(timer); }
 void zbTimerResume(zbPileTimer* timer) { PileTimer::resume(timer); }
@@ -46,10 +49,10 @@ zbTimerMgr* zbTimerMgrNew(char const* name, uint64_t maxId) { return TimerMgr::N
 zbTimerMgr* zbTimerMgrGetMgr(char const* name) { return TimerMgr::Get(name); }
 
 zbPileTimer* zbTimerMgrCreate(zbTimerMgr* manager, char const* name, uint64_t id) {
-    return TimerMgr::create(manager, name, id, false);
+    return TimerMgr::create(manager, name, id, ZOR_Basis::FOR_ONE_THREAD);
 }
 zbPileTimer* zbTimerMgrCreateMT(zbTimerMgr* manager, char const* name, uint64_t id) {
-    return TimerMgr::create(manager, name, id, true);
+    return TimerMgr::create(manager, name, id, ZOR_Basis::FOR_THREADS);
 }
 zbPileTimer* zbTimerMgrGet(zbTimerMgr* manager, uint64_t id) { return TimerMgr::get(manager, id); }
 

@@ -1,7 +1,7 @@
 // The sibling is clock_posix.cpp.
 #include "basis/ground/clock.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 namespace ZOR_Basis::PerformanceCounter {
 

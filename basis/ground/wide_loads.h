@@ -26,7 +26,8 @@ ZB_AVX2 ZB_INLINE bool hasZero(__m256i bytes) noexcept {
 }
 
 ZB_AVX512 ZB_INLINE __m512i load64(void const* from) noexcept { return _mm512_loadu_si512(from); }
-/// The first `count` of 64 bytes, zeros behind them; what is behind is not read. \pre count is 1 to 64
+/// The first `count` of 64 bytes, zeros behind them; what is behind is not read.
+/// \pre count is 1 to 64
 ZB_AVX512 ZB_INLINE __m512i loadFirst(void const* from, std::uint64_t count) noexcept {
     return _mm512_maskz_loadu_epi8(~std::uint64_t{0} >> (64 - count), from);
 }

@@ -119,14 +119,16 @@ private:
         runEnd_ = nullptr;
     }
 
-    /// Goes back to the last "*", one character further on. \return false: there is no such "*", or the name ends
+    /// Goes back to the last "*", one character further on.
+    /// \return false: there is no such "*", or the name ends
     bool retry() noexcept {
         if (behindStar_ == nullptr || ++start_ == nameEnd_) return false;
         pattern_ = behindStar_;
         return findStart();
     }
 
-    /// Goes on to the next character that what follows the "*" can begin with. \return false: there is none
+    /// Goes on to the next character that what follows the "*" can begin with.
+    /// \return false: there is none
     bool findStart() noexcept {
         Char const wanted = *behindStar_;
         if (wanted != Char('?') && wanted != Char('*') && !isSlash(wanted)) {

@@ -24,7 +24,8 @@ struct Conversion {
     /// What follows all that, whatever it is.
     char kind = '\0';
 
-    /// Reads what follows a "%". \return behind the kind
+    /// Reads what follows a "%".
+    /// \return behind the kind
     char const* read(char const* text) {
         text = readFlags(text);
         int number = 0;

@@ -40,7 +40,8 @@ inline int decimalDigits(std::uint64_t number) {
     return digits + (number >= POWERS_OF_TEN[digits] || digits == 0 ? 1 : 0);
 }
 
-/// Writes exactly so many digits, the last ones of the number. \return their end
+/// Writes exactly so many digits, the last ones of the number.
+/// \return their end
 inline char* writeDigits(char* to, std::uint64_t number, int digits) {
     static constexpr char PAIRS[] = "0001020304050607080910111213141516171819202122232425262728293031323334353637383940"
                                     "4142434445464748495051525354555657585960616263646566676869707172737475767778798081"

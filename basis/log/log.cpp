@@ -9,8 +9,7 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr std::size_t LINE_ROOM = 1024;
-/// The logger's, for the end of the line.
-constexpr std::size_t RESERVED = 1;
+constexpr std::size_t TEXT_ROOM = LINE_ROOM - LoggerImpl::RESERVED;
 
 } // namespace
 
@@ -28,11 +27,11 @@ void Log::out(char const* format, ...) const {
     char line[LINE_ROOM];
     LineArguments arguments;
     va_start(arguments.list, format);
-    char* end = writeLineText(line, LINE_ROOM - RESERVED, format, arguments);
+    char* end = writeLineText(line, TEXT_ROOM, format, arguments);
     va_end(arguments.list);
     if (end == nullptr) {
         va_start(arguments.list, format);
-        end = writeAnyLineText(line, LINE_ROOM - RESERVED, format, arguments);
+        end = writeAnyLineText(line, TEXT_ROOM, format, arguments);
         va_end(arguments.list);
     }
     logger_->out(line, end);

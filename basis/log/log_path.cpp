@@ -1,5 +1,6 @@
 #include "basis/log/log_path.h"
 
+#include "basis/ground/choices.h"
 #include "zor_basis/files/dir.h"
 
 #include <charconv>
@@ -9,8 +10,6 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr char FOLDER[] = "/scsi0/tmp/zb_log";
-constexpr bool WITH_PARENTS = true;
-constexpr bool WITH_DOT = true;
 constexpr int MOST_DIGITS = 20;
 
 } // namespace

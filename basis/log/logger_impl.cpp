@@ -41,8 +41,6 @@ Loggers& loggers() {
     return *all;
 }
 
-Logger::~Logger() = default;
-
 LoggerImpl::LoggerImpl(char const* name) : name_(name) {
     std::lock_guard const held(loggers().mutex);
     loggers().list.append(this);

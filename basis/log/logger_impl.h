@@ -5,6 +5,7 @@
 #define BASIS_LOG_LOGGER_IMPL_H
 
 #include "basis/containers/linked_list.h"
+#include "basis/ground/choices.h"
 #include "basis/platform/hq_basis.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/log/logger.h"
@@ -17,11 +18,21 @@ namespace ZOR_Basis {
 
 class MemMgr;
 
-class LoggerImpl final : public Logger {
+class LoggerImpl;
+
+/// The neighbours among all loggers.
+struct LoggerLinks {
+    LoggerImpl* previous = nullptr;
+    LoggerImpl* next = nullptr;
+};
+
+class LoggerImpl final : public LoggerLinks, public Logger {
 public:
     static constexpr std::size_t BLOCK_SIZE = 4096;
     /// Milliseconds between looks at what there is to write, and of silence before a block is written that is not full.
     static constexpr std::uint32_t PERIOD_MS = 8192;
+    /// Bytes that `out` needs behind a line's terminator, whose place the line feed takes.
+    static constexpr std::size_t RESERVED = 1;
 
     /// Starts a logger with its alert and its folders.
     /// \return it ends itself, some time after `close`; null where memory is short or no alert is to be had
@@ -47,10 +58,6 @@ public:
     /// A logger in the copy of the process that made it: its lines are the original's to write.
     bool isCopy() const { return isCopy_; }
     void becomeCopy() { isCopy_ = true; }
-
-    /// The neighbours among all loggers.
-    LoggerImpl* previous = nullptr;
-    LoggerImpl* next = nullptr;
 
 private:
     struct Buffer {
@@ -88,7 +95,7 @@ private:
     Buffer* current_ = nullptr;
     std::uint64_t session_ = 0;
     HeapStr name_;
-    Lock lock_{Lock::Mutex, false};
+    Lock lock_{Lock::Mutex, UNLOCKED};
     bool closing_ = false;
     std::uint32_t alertId_ = 0;
     std::uint32_t lastWrite_ = 0;

@@ -2,7 +2,7 @@
 
 #include "basis/log/logger_impl.h"
 #include "basis/log/loggers.h"
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 namespace ZOR_Basis {
 namespace {

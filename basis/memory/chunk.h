@@ -13,6 +13,10 @@
 namespace ZOR_Basis {
 
 struct LB {
+    /// Memory from `malloc`, which is released with the record, or the caller's.
+    static constexpr bool OWNED = true;
+    static constexpr bool BORROWED = false;
+
     LB(std::uint64_t bytes, char* memory, bool isOwned) : size(bytes), data(memory), owned(isOwned) {}
     LB(LB const&) = delete;
     LB& operator=(LB const&) = delete;
@@ -22,21 +26,23 @@ struct LB {
 
     std::uint64_t size;
     char* data;
-    bool owned; ///< from `malloc`, and released with the record; else the caller's
+    bool owned;
 };
 
 using Chunks = SngList<LB>;
 
-/// A record over memory of the caller. \return null when memory runs out
+/// A record over memory of the caller.
+/// \return null when memory runs out
 inline Chunks::Unit* borrowChunk(std::uint64_t size, void* memory) {
-    return new (std::nothrow) Chunks::Unit{nullptr, LB(size, static_cast<char*>(memory), false)};
+    return new (std::nothrow) Chunks::Unit{nullptr, LB(size, static_cast<char*>(memory), LB::BORROWED)};
 }
 
-/// A record over memory of its own. \return null when memory runs out
+/// A record over memory of its own.
+/// \return null when memory runs out
 inline Chunks::Unit* makeChunk(std::uint64_t size) {
     char* const data = static_cast<char*>(std::malloc(size));
     if (data == nullptr) return nullptr;
-    Chunks::Unit* const chunk = new (std::nothrow) Chunks::Unit{nullptr, LB(size, data, true)};
+    Chunks::Unit* const chunk = new (std::nothrow) Chunks::Unit{nullptr, LB(size, data, LB::OWNED)};
     if (chunk == nullptr) std::free(data);
     return chunk;
 }

@@ -18,10 +18,12 @@ public:
     void free(void* p, std::uint64_t size) override;
     void free(void* p) override;
 
-    /// Whether the chunks, the place in the current one and all freed elements agree. \cost a walk over all of them
+    /// Whether the chunks, the place in the current one and all freed elements agree.
+    /// \cost a walk over all of them
     bool isConsistent() const;
     std::uint64_t chunkCount() const { return chunks_.size(); }
-    /// Bytes of the chunk that elements are carved from. \pre there is one
+    /// Bytes of the chunk that elements are carved from.
+    /// \pre there is one
     std::uint64_t chunkSize() const { return chunks_.first()->value.size; }
 
 private:

@@ -12,8 +12,7 @@
 /// accepted and ignored.
 ///
 /// \thread every function may be called by any thread at any time; one open file, listing or configuration group
-///     belongs
-/// to one thread at a time
+///     belongs to one thread at a time
 
 #ifndef BASIS_PLATFORM_XOS_BASICS_H
 #define BASIS_PLATFORM_XOS_BASICS_H
@@ -98,7 +97,7 @@ XOS_API uint32_t xos_MsCount(void);
 
 /// Opens a file.
 /// \param flags  0x02 read; 0x14 write, and create what is not there (0x04 without creating); 0x01 truncate; 0x08 write
-///               at the end whatever the position; 0x20 text: on Windows line ends are translated
+///     at the end whatever the position; 0x20 text: on Windows line ends are translated
 /// \return 0 on failure, also for a directory, for flags without any access, and if a handle that cannot write would
 ///     truncate or create
 XOS_API xos_File xos_FileOpen(char const* path, uint32_t flags);

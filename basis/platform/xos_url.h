@@ -14,7 +14,7 @@ ZB_PLATFORM_C_BEGIN
 /// Stand-alone: `http`, `https` and `file` URLs. Up to 10 redirects are followed, to `http` and `https` only. `file`
 /// URLs name regular files of this machine, on Windows also `file://server/share/...`. Blanks and bytes above 126 in a
 /// URL count as their percent escapes. Proxies are the system's.
-/// \param first   the user name for the server that `url` names, or null; no other server gets it
+/// \param first  the user name for the server that `url` names, or null; no other server gets it
 /// \param second  the password, or null
 /// \return 0 when the server answered with success (200 to 299) and the body arrived and could be stored
 /// \error an unknown scheme, no response within 30 s, any other status, a connection that is silent for 60 s, a body

@@ -1,5 +1,6 @@
 #include "zor_basis/store/blob.h"
 
+#include "basis/ground/choices.h"
 #include "basis/text/wipe.h"
 #include "zor_basis/files/i_file.h"
 
@@ -98,7 +99,7 @@ bool Blob::operator<(Blob const& other) const {
 bool Blob::read(IFile* file) {
     std::uint32_t length = 0;
     if (file == nullptr || file->read(&length, sizeof length) != sizeof length) return false;
-    alloc(length, false);
+    alloc(length, DISCARDING_BYTES);
     if (capacity_ < length) return false;
     // kept blob-02: the bytes behind those that came are what was in the block.
     size_ = length;

@@ -2,6 +2,7 @@
 
 #include "basis/files/replacement.h"
 #include "basis/files/system_calls.h"
+#include "basis/ground/choices.h"
 #include "basis/store/dict_index.h"
 #include "basis/store/dict_records.h"
 #include "zor_basis/files/file.h"
@@ -13,8 +14,6 @@ namespace {
 
 constexpr int LOAD = File::FILE_READ | File::FILE_BINARY | File::FILE_SEQUENTIAL;
 constexpr int SAVE = File::FILE_WRITE | File::FILE_TRUNC | File::FILE_BINARY | File::FILE_SEQUENTIAL;
-/// Leaves out the platform layer's flag 0x40.
-constexpr bool WITHOUT_CREATE_FLAG = true;
 constexpr int SAVE_BESIDE = SAVE | File::FILE_NOCREATEFLAG;
 
 bool isValue(Blob const& blob, RecordBytes bytes) {

@@ -1,5 +1,7 @@
 #include "basis/store/dict_records.h"
 
+#include "basis/ground/choices.h"
+
 #include <algorithm>
 #include <cstring>
 
@@ -56,11 +58,11 @@ bool RecordReader::makeRoom() {
         at_ = 0;
         return true;
     }
-    buffer_.alloc(std::max(PIECE, 2 * capacity), true);
+    buffer_.alloc(std::max(PIECE, 2 * capacity), KEEPING_BYTES);
     return buffer_.sizeBuf() != capacity;
 }
 
-RecordWriter::RecordWriter(IFile& file) : file_(file) { buffer_.alloc(PIECE, false); }
+RecordWriter::RecordWriter(IFile& file) : file_(file) { buffer_.alloc(PIECE, DISCARDING_BYTES); }
 
 bool RecordWriter::add(Blob const& blob) {
     std::uint32_t const length = static_cast<std::uint32_t>(blob.size());

@@ -25,7 +25,8 @@ public:
     RecordReader(RecordReader const&) = delete;
     RecordReader& operator=(RecordReader const&) = delete;
 
-    /// Goes to the next record. \return false where no complete one is left
+    /// Goes to the next record.
+    /// \return false where no complete one is left
     bool next();
     RecordBytes key() const { return bytes(0); }
     RecordBytes value() const { return bytes(1); }
@@ -64,7 +65,8 @@ public:
     RecordWriter(RecordWriter const&) = delete;
     RecordWriter& operator=(RecordWriter const&) = delete;
 
-    /// Adds the stored form of a blob. \return false once something could not be written
+    /// Adds the stored form of a blob.
+    /// \return false once something could not be written
     bool add(Blob const& blob);
     /// Writes what is still gathered.
     bool finish();

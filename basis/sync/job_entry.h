@@ -20,20 +20,22 @@ struct JobLinks {
 
 class JobEntry final : public JobLinks, public MTQ_Dat {
 public:
-    JobEntry(MultiTaskQueue* queue, Function function, void* argument, bool ownsArgument, bool removeWhenDone)
-        : MTQ_Dat(queue, function, argument, ownsArgument, removeWhenDone) {}
+    JobEntry(MultiTaskQueue* queue, Task run, Function function, void* argument, bool ownsArgument, bool removeWhenDone)
+        : MTQ_Dat(queue, run, function, argument, ownsArgument, removeWhenDone) {}
 
     using MTQ_Dat::callFunction;
     using MTQ_Dat::finish;
     using MTQ_Dat::queue;
     using MTQ_Dat::removesWhenDone;
+    using MTQ_Dat::Task;
 };
 
 /// At an entry, between the one before it and it, or nowhere. One word, so that it can be read while others change it.
 class JobCursor {
 public:
     void moveTo(JobEntry* entry) { place_.store(wordOf(entry), std::memory_order_release); }
-    /// Goes to the next entry. \pre is somewhere
+    /// Goes to the next entry.
+    /// \pre is somewhere
     void advance() {
         JobEntry* const entry = nearest();
         moveTo(isBetween() ? entry : entry->next);

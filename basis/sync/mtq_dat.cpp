@@ -1,7 +1,6 @@
 #include "zor_basis/sync/mtq_dat.h"
 
 #include "basis/platform/xos_basics.h"
-#include "basis/sync/mtq_task.h"
 
 #include <thread>
 
@@ -25,7 +24,7 @@ MTQ_Dat::~MTQ_Dat() {
 bool MTQ_Dat::start() {
     starting_.store(true, std::memory_order_relaxed);
     started_.store(true, std::memory_order_release);
-    xos_TaskParams const params{runQueuedJob, this, 0, PRIORITY, 0, TASK_NAME, 0};
+    xos_TaskParams const params{run_, this, 0, PRIORITY, 0, TASK_NAME, 0};
     xos_Task const task = xos_TaskCreate(&params);
     bool const made = task != NO_TASK;
     task_.store(task, std::memory_order_relaxed);

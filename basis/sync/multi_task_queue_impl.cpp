@@ -2,7 +2,6 @@
 
 #include "basis/memory/node_memory.h"
 #include "basis/sync/held_semaphore.h"
-#include "basis/sync/mtq_task.h"
 
 #include <thread>
 
@@ -12,12 +11,13 @@ namespace {
 /// Between looks at the running jobs, where their signal cannot be waited for.
 constexpr std::uint32_t LOOK_AGAIN_MS = 1;
 
-} // namespace
-
+/// What the task of a job does. \param job  an `MTQ_Dat`
 void runQueuedJob(void* job) {
     auto& entry = static_cast<JobEntry&>(*static_cast<MTQ_Dat*>(job));
     static_cast<MTQ_Impl*>(entry.queue())->run(entry);
 }
+
+} // namespace
 
 MTQ_Impl::MTQ_Impl(ErrPolicy policy, int limit)
     : policy_(policy), limit_(limit), mutex_(xos_SemMCreate()), completion_(xos_SemBCreate(0)) {}
@@ -33,7 +33,8 @@ MTQ_Impl::~MTQ_Impl() {
 bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument, bool startNow, bool removeWhenDone) {
     HeldSemaphore const held(mutex_);
     if (!mayProceed()) return false;
-    auto* const job = makeNode<JobEntry>(jobMemory_, this, function, argument, ownsArgument, removeWhenDone);
+    auto* const job =
+        makeNode<JobEntry>(jobMemory_, this, runQueuedJob, function, argument, ownsArgument, removeWhenDone);
     if (job == nullptr) return false;
     jobs_.append(job);
     if (startNow || running() < limit_) return start(*job);
@@ -43,6 +44,8 @@ bool MTQ_Impl::add(MTQ_Dat::Function function, void* argument, bool ownsArgument
 
 /// \pre the mutex is held
 bool MTQ_Impl::start(JobEntry& job) {
+    // Its holder takes the mutex again: the platform layer lets the owner do so, and the steps of starting a job, which
+    // count and may fail the queue, hold it by themselves.
     HeldSemaphore const held(mutex_);
     running_.fetch_add(1, std::memory_order_relaxed);
     bool const made = job.start();

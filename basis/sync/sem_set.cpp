@@ -6,8 +6,6 @@
 
 namespace ZOR_Basis {
 
-ISemSet::~ISemSet() = default;
-
 SemSet::SemSet(std::size_t size) : set_(new (std::nothrow) SemArray(size)) {}
 SemSet& SemSet::operator=(SemSet const& other) = default;
 SemSet::~SemSet() { delete set_; }

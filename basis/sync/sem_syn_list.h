@@ -27,7 +27,8 @@ public:
     virtual bool give(std::uint64_t key);
 
     std::uint64_t size() const { return count_; }
-    /// Whether links, ends and count agree and every entry has users. \pre nothing else runs
+    /// Whether links, ends and count agree and every entry has users.
+    /// \pre nothing else runs
     bool isConsistent() const;
 
 private:

@@ -25,7 +25,8 @@ public:
     /// \name Reading
     /// @{
 
-    /// Waits for a writer to finish. \return what `isUnchanged` compares with
+    /// Waits for a writer to finish.
+    /// \return what `isUnchanged` compares with
     std::uint32_t beginReading() const {
         for (unsigned tries = 1;; ++tries) {
             std::uint32_t const now = sequence_.load(std::memory_order_acquire);

@@ -1,6 +1,7 @@
 #include "basis/system/accounts_posix.h"
 
 #include "basis/files/last_error.h"
+#include "basis/ground/choices.h"
 #include "basis/system/query_calls_posix.h"
 #include "zor_basis/store/blob.h"
 
@@ -21,7 +22,7 @@ bool find(Account& account, Ask ask) {
     int result = ask(&record, first, sizeof first, &found);
     Blob larger;
     for (std::uint64_t room = 4 * ROOM; result == ERANGE && room <= MOST_ROOM; room *= 4) {
-        larger.alloc(room, false);
+        larger.alloc(room, DISCARDING_BYTES);
         result = ask(&record, larger.buf(), larger.sizeBuf(), &found);
     }
     if (result != 0) errno = result;

@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/ground/choices.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/registry_win.h"
 
@@ -54,8 +55,8 @@ bool translate(Str const& given, BufStr<255>& domain, Blob Entry::*from, Blob En
     RegistryKey const key(HKEY_LOCAL_MACHINE, DOMAIN_CACHE);
     if (!key.isOpen()) return false;
     Entry entry;
-    entry.shortName.alloc(VALUE_ROOM, false);
-    entry.fullName.alloc(VALUE_ROOM, false);
+    entry.shortName.alloc(VALUE_ROOM, DISCARDING_BYTES);
+    entry.fullName.alloc(VALUE_ROOM, DISCARDING_BYTES);
     DWORD type = REG_NONE;
     for (DWORD index = 0; read(key, index, entry, type); ++index) {
         // kept sys-04: compared byte by byte, as the names are handed on to where case may matter.

@@ -3,6 +3,7 @@
 #include "zor_basis/system/sys.h"
 
 #include "basis/files/last_error.h"
+#include "basis/ground/choices.h"
 #include "basis/system/profiles_win.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/registry_win.h"
@@ -23,7 +24,7 @@ bool isLocalKind(UINT kind) { return kind == DRIVE_FIXED || kind == DRIVE_CDROM 
 
 bool isOnLocalVolume(BufStr<255> const& path) {
     Blob volume;
-    volume.alloc(std::max(LEAST_PATH_ROOM, path.size() + 1), false);
+    volume.alloc(std::max(LEAST_PATH_ROOM, path.size() + 1), DISCARDING_BYTES);
     return volume.buf() != nullptr &&
            queryCalls.volumePath(path, volume.buf(), static_cast<DWORD>(volume.sizeBuf())) != FALSE &&
            isLocalKind(queryCalls.driveType(volume.val()));
@@ -70,7 +71,7 @@ bool unmapByConnection(BufStr<255> const& path, FPath& unc) {
     BufStr<15> drive;
     drive.add(letterOf(path)).add(":");
     Blob remote;
-    remote.alloc(VALUE_ROOM, false);
+    remote.alloc(VALUE_ROOM, DISCARDING_BYTES);
     for (;;) {
         DWORD n = static_cast<DWORD>(remote.sizeBuf());
         DWORD const result = queryCalls.connection(drive, remote.buf(), &n);

@@ -15,7 +15,8 @@ namespace ZOR_Basis {
 
 class Identity {
 public:
-    /// That of the calling thread, and that of an account. \return whether the system told
+    /// That of the calling thread, and that of an account.
+    /// \return whether the system told
     bool readOwn();
     bool read(Account const& account);
 

@@ -2,6 +2,7 @@
 
 #include "basis/files/last_error.h"
 #include "basis/files/os_path_posix.h"
+#include "basis/ground/choices.h"
 #include "basis/system/query_calls_posix.h"
 #include "basis/system/text_parts.h"
 
@@ -112,7 +113,7 @@ bool isLocalKind(Str const& kind) { return isOneOf(LOCAL_KINDS, kind); }
 bool networkPath(Mount const& mount, FPath& path) {
     if (isOneOf(NFS_SHARES, mount.kind)) return splitNfsSource(mount.source, path);
     if (!isOneOf(WINDOWS_SHARES, mount.kind)) return false;
-    path.normalize(mount.source, false);
+    path.normalize(mount.source, NOT_A_URL);
     return true;
 }
 

@@ -26,7 +26,8 @@ bool findMount(FPath const& path, Mount& mount);
 /// Whether a kind of file system has its data on a disk or in the memory of this machine.
 bool isLocalKind(Str const& kind);
 
-/// The network path of a mounted share: "//server/share". \return false for what is no share
+/// The network path of a mounted share: "//server/share".
+/// \return false for what is no share
 bool networkPath(Mount const& mount, FPath& path);
 
 } // namespace ZOR_Basis

@@ -33,6 +33,9 @@ namespace {
 
 constexpr int SIGNALLED = 128;
 constexpr int WITHOUT_LIMIT = -1;
+/// Where a program is looked for.
+constexpr bool ALONG_THE_PATH = true;
+constexpr bool AS_NAMED = false;
 constexpr std::size_t MOST_UNAWAITED = 4096;
 
 /// Takes what is left of an ended child from the system. \return false: it is no child of ours, or no longer
@@ -126,14 +129,14 @@ bool start(char const* application, char const* commandLine, pid_t& child) {
     SpawnSettings const settings;
     if (detail::isNothing(commandLine)) {
         char* const words[] = {const_cast<char*>(application), nullptr};
-        return settings.start(application, false, words, child);
+        return settings.start(application, AS_NAMED, words, child);
     }
     // Blanks before the name of a program that is searched for are no empty name.
     if (application == nullptr) commandLine += std::strspn(commandLine, " \t");
     CommandLine const line(commandLine);
     if (line.words() == nullptr) return refuse(Reason::NO_MEMORY);
-    return application != nullptr ? settings.start(application, false, line.words(), child)
-                                  : settings.start(line.words()[0], true, line.words(), child);
+    return application != nullptr ? settings.start(application, AS_NAMED, line.words(), child)
+                                  : settings.start(line.words()[0], ALONG_THE_PATH, line.words(), child);
 }
 
 /// \param take  takes what is left of the child then; else that stays for the application, which made it

@@ -1,5 +1,6 @@
 #include "basis/system/profiles_win.h"
 
+#include "basis/ground/choices.h"
 #include "basis/system/distinguished_name.h"
 #include "basis/system/query_calls_win.h"
 #include "basis/system/registry_win.h"
@@ -16,7 +17,7 @@ constexpr char POLICY_STATE[] = "SOFTWARE\\Microsoft\\Windows\\CurrentVersion\\G
 
 /// The name of the subkey at an index.
 bool readKeyName(DWORD index, Blob& buffer, BufStr<255>& name) {
-    buffer.alloc(VALUE_ROOM, false);
+    buffer.alloc(VALUE_ROOM, DISCARDING_BYTES);
     for (;;) {
         DWORD n = static_cast<DWORD>(buffer.sizeBuf());
         LSTATUS const result =

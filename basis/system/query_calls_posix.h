@@ -22,7 +22,8 @@ struct QueryCalls {
     int (*userByName)(char const*, passwd*, char*, std::size_t, passwd**);
     int (*groupsOf)(char const*, gid_t, gid_t*, int*);
     int (*groups)(int, gid_t*);
-    /// Change the calling thread alone, unlike those of the C library. \return whether they succeeded
+    /// Change the calling thread alone, unlike those of the C library.
+    /// \return whether they succeeded
     bool (*setGroups)(std::size_t, gid_t const*);
     bool (*setEffectiveGroup)(gid_t);
     bool (*setEffectiveUser)(uid_t);

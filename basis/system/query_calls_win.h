@@ -4,7 +4,7 @@
 #ifndef BASIS_SYSTEM_QUERY_CALLS_WIN_H
 #define BASIS_SYSTEM_QUERY_CALLS_WIN_H
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <winnetwk.h>
 

@@ -1,6 +1,7 @@
 #include "basis/system/registry_win.h"
 
 #include "basis/files/last_error.h"
+#include "basis/ground/choices.h"
 #include "basis/system/query_calls_win.h"
 
 namespace ZOR_Basis {
@@ -18,7 +19,7 @@ bool told(LSTATUS result) {
 bool growBuffer(Blob& buffer, std::uint64_t reported) {
     std::uint64_t const room = reported > buffer.sizeBuf() ? reported : 2 * buffer.sizeBuf();
     if (room == 0 || room > MOST_ROOM) return false;
-    buffer.alloc(room, false);
+    buffer.alloc(room, DISCARDING_BYTES);
     return buffer.sizeBuf() >= room;
 }
 
@@ -40,7 +41,7 @@ bool RegistryKey::has(char const* value) const {
 
 bool RegistryKey::read(char const* value, Blob& buffer, Growth growth) const {
     if (!isOpen()) return false;
-    buffer.alloc(VALUE_ROOM, false);
+    buffer.alloc(VALUE_ROOM, DISCARDING_BYTES);
     if (buffer.sizeBuf() < VALUE_ROOM) return false;
     DWORD type = REG_NONE;
     DWORD n = 0;

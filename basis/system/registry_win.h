@@ -4,7 +4,7 @@
 #ifndef BASIS_SYSTEM_REGISTRY_WIN_H
 #define BASIS_SYSTEM_REGISTRY_WIN_H
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 #include "basis/system/text_parts.h"
 #include "zor_basis/store/blob.h"
 #include "zor_basis/text/buf_str.h"
@@ -16,8 +16,8 @@ namespace ZOR_Basis {
 /// Bytes with which a value is asked for.
 inline constexpr std::uint64_t VALUE_ROOM = 512;
 
-/// Makes the result of a call of the registry, which comes without, the last error if it is one. \return whether it is
-/// none
+/// Makes the result of a call of the registry, which comes without, the last error if it is one.
+/// \return whether it is none
 bool told(LSTATUS result);
 
 /// Makes room for what did not fit: as much as was reported, or twice as much where that is no more. The old bytes go.
@@ -43,7 +43,8 @@ public:
     /// terminator.
     /// \param growth  whether a text longer than the buffer is asked for again
     bool read(char const* value, Blob& buffer, Growth growth) const;
-    /// The same with a buffer of its own. \return false, with `out` as it was, where there is no such text
+    /// The same with a buffer of its own.
+    /// \return false, with `out` as it was, where there is no such text
     template <std::uint64_t N>
     bool read(char const* value, BufStr<N>& out) const {
         Blob buffer;

@@ -4,6 +4,7 @@
 #ifndef BASIS_SYSTEM_SECRET_TEXT_H
 #define BASIS_SYSTEM_SECRET_TEXT_H
 
+#include "basis/ground/choices.h"
 #include "zor_basis/store/blob.h"
 #include "zor_basis/text/str.h"
 
@@ -12,7 +13,7 @@ namespace ZOR_Basis {
 class SecretText {
 public:
     explicit SecretText(Str const& text) {
-        bytes_.alloc(text.size() + 1, false);
+        bytes_.alloc(text.size() + 1, DISCARDING_BYTES);
         if (bytes_.sizeBuf() <= text.size()) return;
         bytes_.add(text.size(), text);
         bytes_.add(1, "");

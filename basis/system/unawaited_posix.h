@@ -27,7 +27,8 @@ public:
         if (size_ < MOST) children_[size_++] = child;
     }
 
-    /// From now on the child is the caller's to await. \return false: it is none of these
+    /// From now on the child is the caller's to await.
+    /// \return false: it is none of these
     bool remove(pid_t child) {
         std::lock_guard const lock(mutex_);
         auto* const end = children_.data() + size_;

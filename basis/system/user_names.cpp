@@ -2,6 +2,7 @@
 
 #include "zor_basis/system/sys.h"
 
+#include "basis/ground/choices.h"
 #include "basis/system/text_parts.h"
 
 #include <cstring>
@@ -10,8 +11,8 @@ namespace ZOR_Basis {
 
 bool Sys::ParseUser(Str const& full, BufStr<15>& user, BufStr<15>& domain) {
     if (full.empty()) {
-        bool const known = CurrentUser(user, false);
-        CurrentDomain(domain, false);
+        bool const known = CurrentUser(user, OF_THE_THREAD);
+        CurrentDomain(domain, OF_THE_COMPUTER);
         return known;
     }
     BufStr<255> const text(full);

@@ -3,6 +3,7 @@
 #include "zor_basis/system/sys.h"
 
 #include "basis/files/last_error.h"
+#include "basis/ground/choices.h"
 #include "basis/system/accounts_posix.h"
 #include "basis/system/query_calls_posix.h"
 #include "basis/system/text_parts.h"
@@ -68,7 +69,7 @@ bool Sys::DefaultLogin(BufStr<15>& login) {
 
 bool Sys::CurHumanUser(BufStr<15>& user) {
     user.clear();
-    return readSessionUser(user) || CurrentUser(user, false);
+    return readSessionUser(user) || CurrentUser(user, OF_THE_THREAD);
 }
 
 } // namespace ZOR_Basis

@@ -1,6 +1,8 @@
 #include "zor_basis/system/vdp_temp_dir.h"
 
 #include "basis/files/platform_flags.h"
+#include "basis/files/whole_entry.h"
+#include "basis/ground/choices.h"
 #include "basis/memory/never_destroyed.h"
 #include "basis/platform/xos_basics.h"
 #include "basis/sync/held_semaphore.h"
@@ -65,8 +67,8 @@ void VDPTempDir::choose(int n) {
     FPath folder = Sys::temp();
     if (n > 0) folder.add(SHARED_FOLDER);
     if (n == CLEARS_THE_FOLDER) {
-        Dir::Rem(folder, true, false);
-        Dir::New(folder, true);
+        removeTree(folder);
+        Dir::New(folder, WITH_PARENTS);
     }
     std::lock_guard const held(*parts);
     _GlbTmp = folder;
@@ -84,7 +86,7 @@ void VDPTempDir::prepare() {
 void VDPTempDir::nextPath(FPath& path) {
     incrementDecimal(_CurName);
     std::lock_guard const held(*parts);
-    path.assign(_GlbTmp, _CurName).addExt(_ExtRip, false);
+    path.assign(_GlbTmp, _CurName).addExt(_ExtRip, WITHOUT_DOT);
 }
 
 void VDPTempDir::Create(FPath& path) {

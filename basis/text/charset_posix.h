@@ -18,9 +18,11 @@ void setLocal(char const* name);
 
 bool isUtf8(char const* charset);
 
-/// Converts `size` bytes of the set into the empty `out`. \return false, with an empty `out`, if the text is invalid
+/// Converts `size` bytes of the set into the empty `out`.
+/// \return false, with an empty `out`, if the text is invalid
 bool toWide(char const* charset, char const* text, std::uint64_t size, WBStr& out);
-/// Converts `size` units to the set into the empty `out`, "?" for what it lacks. \return false if there is no such set
+/// Converts `size` units to the set into the empty `out`, "?" for what it lacks.
+/// \return false if there is no such set
 bool fromWide(char const* charset, WChar const* text, std::uint64_t size, BufStr<255>& out);
 
 } // namespace ZOR_Basis::Charset

@@ -1,4 +1,4 @@
-// Conversions by our own UTF-8 and by the locale's character set. The sibling is convert_win.cpp.
+// The sibling is convert_win.cpp. Conversions by our own UTF-8 and by the locale's character set.
 
 #include "basis/text/convert_impl.h"
 
@@ -42,7 +42,7 @@ bool wideToUtf8(WChar const* text, std::uint64_t size, BufStr<255>& out) {
         out.resize(written.size);
     } else {
         out.getBuf()[out.sizeBuf()] = '\0';
-        detail::InlineText<BufStr<255>, char, 255>::setSize(out, written.size);
+        out.setSize(written.size);
     }
     return true;
 }

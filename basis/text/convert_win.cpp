@@ -1,8 +1,8 @@
-// Conversions by the system's code pages. The sibling is convert_posix.cpp.
+// The sibling is convert_posix.cpp. Conversions by the system's code pages.
 
 #include "basis/text/convert_impl.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 namespace ZOR_Basis::ConvertImpl {
 namespace {

@@ -106,7 +106,7 @@ ZB_AVX2 ZB_INLINE bool copyReadable(char* target, char const* source, std::uint6
 /// At most 256 bytes, of which some may lie in the next page. Only a text that goes on there can be read there.
 ZB_AVX2 ZB_COLD bool copyAcrossPages(char* target, char const* source, std::uint64_t length) noexcept {
     std::uint64_t const inPage =
-        std::min(length, PageSize - (reinterpret_cast<std::uintptr_t>(source) & (PageSize - 1)));
+        std::min(length, PAGE_BYTES - (reinterpret_cast<std::uintptr_t>(source) & (PAGE_BYTES - 1)));
     return !overlap(target, source, length) && copyReadable(target, source, inPage) &&
            copyReadable(target + inPage, source + inPage, length - inPage);
 }

@@ -15,8 +15,8 @@ template <class Char>
 class HeldText {
 public:
     HeldText(Char const* text, std::uint64_t length) : held_(length != 0) {
-        if (length >= Inside) {
-            block_ = static_cast<Char*>(length < Longest ? std::malloc((length + 1) * sizeof(Char)) : nullptr);
+        if (length >= INSIDE) {
+            block_ = static_cast<Char*>(length < LONGEST ? std::malloc((length + 1) * sizeof(Char)) : nullptr);
             if (block_ == nullptr) std::abort();
         }
         if (!held_) return;
@@ -34,14 +34,14 @@ public:
     }
 
 private:
-    static constexpr std::uint64_t Inside = 256;
-    static constexpr std::uint64_t Longest = std::uint64_t{1} << 62;
+    static constexpr std::uint64_t INSIDE = 256;
+    static constexpr std::uint64_t LONGEST = std::uint64_t{1} << 62;
 
     Char* copy() noexcept { return block_ != nullptr ? block_ : inside_; }
 
     bool held_;
     Char* block_ = nullptr;
-    Char inside_[Inside];
+    Char inside_[INSIDE];
 };
 
 } // namespace ZOR_Basis::detail

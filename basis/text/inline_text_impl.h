@@ -13,9 +13,9 @@
 
 namespace ZOR_Basis::detail {
 
-inline constexpr std::uint64_t TooLong = std::numeric_limits<std::uint64_t>::max();
+inline constexpr std::uint64_t TOO_LONG = std::numeric_limits<std::uint64_t>::max();
 
-inline std::uint64_t plus(std::uint64_t a, std::uint64_t b) noexcept { return a > TooLong - b ? TooLong : a + b; }
+inline std::uint64_t plus(std::uint64_t a, std::uint64_t b) noexcept { return a > TOO_LONG - b ? TOO_LONG : a + b; }
 
 template <class Owner, class Char, std::uint64_t N>
 bool InlineText<Owner, Char, N>::holds(Owner const& o, Char const* place) noexcept {
@@ -25,7 +25,7 @@ bool InlineText<Owner, Char, N>::holds(Owner const& o, Char const* place) noexce
 
 template <class Owner, class Char, std::uint64_t N>
 inline Char* InlineText<Owner, Char, N>::allocate(Owner& o, std::uint64_t capacity) {
-    Char* block = capacity != TooLong ? o.alloc(capacity + 1) : nullptr;
+    Char* block = capacity != TOO_LONG ? o.alloc(capacity + 1) : nullptr;
     if (block == nullptr) std::abort();
     return block;
 }

@@ -28,10 +28,10 @@ void Str::ToUpper(char* text, std::uint64_t n) noexcept {
 }
 
 void Str::ch2hex(char c, char* digits) noexcept {
-    static constexpr char const* hexDigits = "0123456789abcdef";
+    static constexpr char const* HEX_DIGITS = "0123456789abcdef";
     auto const byte = static_cast<unsigned char>(c);
-    digits[0] = hexDigits[byte >> 4];
-    digits[1] = hexDigits[byte & 15];
+    digits[0] = HEX_DIGITS[byte >> 4];
+    digits[1] = HEX_DIGITS[byte & 15];
 }
 
 char Str::decodeHexChar(char const* digits) noexcept {

@@ -16,8 +16,8 @@ namespace ZOR_Basis::detail {
 
 template <class Char>
 Char const* textOrEmpty(Char const* text) noexcept {
-    static constexpr Char Empty[1] = {};
-    return text != nullptr ? text : Empty;
+    static constexpr Char EMPTY[1] = {};
+    return text != nullptr ? text : EMPTY;
 }
 
 #if ZB_VECTOR_TEXT
@@ -100,7 +100,7 @@ ZB_INLINE int orderOfShortTexts(char const* a, char const* b, std::uint64_t leng
 }
 
 /// Of 32 places, a bit each.
-constexpr unsigned AllSame = 0xFFFFFFFF;
+constexpr unsigned ALL_SAME = 0xFFFFFFFF;
 
 /// Two texts of 17 to 64 bytes in four vectors, which overlap each other in shorter ones. They are compared as memory
 /// first. Only where they differ does it matter whether they ended before that; such texts are rare, and the runtime
@@ -125,7 +125,7 @@ public:
     /// The place of the first difference; where there is none, the length.
     ZB_INLINE std::uint64_t difference() const noexcept {
         unsigned const front = samePlaces(0) | samePlaces(1) << 16;
-        if (front != AllSame) {
+        if (front != ALL_SAME) {
             auto const place = static_cast<std::uint64_t>(std::countr_one(front));
             return place < 16 ? place : place - 16 + second_;
         }

@@ -58,7 +58,8 @@ constexpr Selection makeSelection(unsigned keptOfChosen, unsigned keptOfOthers) 
     return selection;
 }
 
-/// Stores the bytes of a block that a selection keeps. \return how many
+/// Stores the bytes of a block that a selection keeps.
+/// \return how many
 ZB_SSSE3 inline unsigned storeSelected(void* to, __m128i block, unsigned choice, Selection const& selection) {
     store16(to, _mm_shuffle_epi8(block, load16(selection.places[choice].data())));
     return selection.sizes[choice];

@@ -8,7 +8,8 @@
 
 namespace ZOR_Basis {
 
-/// Raises an assertion of the platform layer, which may return. \param line  part of the message, as it is known
+/// Raises an assertion of the platform layer, which may return.
+/// \param line  part of the message, as it is known
 inline void complain(int line, char const* message) { xos_Assert(line, "zor_basis", message); }
 
 } // namespace ZOR_Basis

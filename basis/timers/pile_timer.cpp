@@ -15,7 +15,8 @@ constexpr int LINE_RESUME = 204;
 
 } // namespace
 
-// Here and not beside its class, which knows nothing of piles.
+// Stands here because it needs the pile, which is derived from this class: beside its class, the two sources would need
+// each other.
 void BaseTimer::stop(PileTimer* pile) {
     if (zbTimerDat::start == 0) return;
     Measurement::finish(*this);

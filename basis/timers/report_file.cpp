@@ -1,5 +1,6 @@
 #include "basis/timers/report_file.h"
 
+#include "basis/ground/choices.h"
 #include "basis/timers/complaint.h"
 #include "zor_basis/files/dir.h"
 #include "zor_basis/timers/pile_timer.h"
@@ -14,7 +15,6 @@ namespace {
 constexpr int MODE = File::FILE_WRITE | File::FILE_APPEND | File::FILE_SEQUENTIAL | File::FILE_PLATFORM_EXTRA;
 static_assert(MODE == 0x226);
 
-constexpr bool WITHOUT_PARENTS = false;
 constexpr int MICROSECONDS = 1'000'000;
 
 struct Title {
@@ -45,7 +45,7 @@ ReportFile::ReportFile(FPath const& folder, Str const& manager, std::int32_t rip
     path.add(line_);
     // The folder was made with the registry. A server that cleans up its root takes it away again.
     Dir::New(folder.c_str(), WITHOUT_PARENTS);
-    if (!file_.open(path.c_str(), MODE, true)) complainOf(path);
+    if (!file_.open(path.c_str(), MODE, WITHOUT_CREATE_FLAG)) complainOf(path);
     writeHead(seconds);
 }
 

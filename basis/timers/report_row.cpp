@@ -63,15 +63,15 @@ void format(BufStr<255>& line, Str const& name, Values const& values) {
     // kept timers-07: the name comes first and is not cut at its column.
     std::memcpy(row, name.c_str(), std::min(name.size(), SIZE));
     char const separator = thousandsSeparator();
-    placeNumber(row, values.count, COUNT, separator, false);
+    placeNumber(row, values.count, COUNT, separator, CONTINUING);
     if (values.count == 0) return;
-    placeNumber(row, values.total, TOTAL, separator, false);
-    placeNumber(row, values.average, AVERAGE, separator, false);
-    placeNumber(row, values.maximum, MAXIMUM, separator, false);
-    placeNumber(row, values.maximumCount, MAXIMUM_COUNT, separator, false);
-    placeNumber(row, values.minimum, MINIMUM, separator, false);
-    placeNumber(row, values.suspendTotal, SUSPEND_TOTAL, separator, false);
-    placeNumber(row, values.suspendMaximum, SUSPEND_MAXIMUM, separator, true);
+    placeNumber(row, values.total, TOTAL, separator, CONTINUING);
+    placeNumber(row, values.average, AVERAGE, separator, CONTINUING);
+    placeNumber(row, values.maximum, MAXIMUM, separator, CONTINUING);
+    placeNumber(row, values.maximumCount, MAXIMUM_COUNT, separator, CONTINUING);
+    placeNumber(row, values.minimum, MINIMUM, separator, CONTINUING);
+    placeNumber(row, values.suspendTotal, SUSPEND_TOTAL, separator, CONTINUING);
+    placeNumber(row, values.suspendMaximum, SUSPEND_MAXIMUM, separator, TERMINATING);
 }
 
 } // namespace ZOR_Basis::ReportRow

@@ -21,6 +21,10 @@ struct Values {
 /// Ticks in another unit, cut towards zero. Only a result beyond 64 bits overflows, and then it wraps.
 std::int64_t convert(std::int64_t ticks, int unitsPerSecond, std::int64_t frequency);
 
+/// Names for `terminating`.
+inline constexpr bool TERMINATING = true;
+inline constexpr bool CONTINUING = false;
+
 /// Writes a number from the right: its last digit two places before `end`. The first place of the line is never
 /// reached.
 /// \param separator  between groups of three digits; 0: none

@@ -1,5 +1,6 @@
 #include "zor_basis/timers/timer_mgr.h"
 
+#include "basis/ground/choices.h"
 #include "basis/timers/timer_mgr_impl.h"
 #include "basis/timers/timer_mgr_mgr.h"
 #include "zor_basis/timers/pile_timer.h"
@@ -45,7 +46,7 @@ PileTimer* TimerMgr::get(TimerMgr* manager, std::uint64_t id) {
 }
 
 void TimerMgr::startSlot(std::uint64_t id) {
-    if (PileTimer* const timer = activeSlot(id)) timer->start(false);
+    if (PileTimer* const timer = activeSlot(id)) timer->start(NOT_SUSPENDED);
 }
 void TimerMgr::stopSlot(std::uint64_t id) {
     if (PileTimer* const timer = activeSlot(id)) timer->stop();
@@ -58,7 +59,7 @@ void TimerMgr::resumeSlot(std::uint64_t id) {
 }
 
 void TimerMgr::start(PileTimer* timer) {
-    if (active()) PileTimer::start(timer, false);
+    if (active()) PileTimer::start(timer, NOT_SUSPENDED);
 }
 void TimerMgr::stop(PileTimer* timer) {
     if (active()) PileTimer::stop(timer);

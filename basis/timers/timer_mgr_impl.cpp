@@ -1,5 +1,6 @@
 #include "basis/timers/timer_mgr_impl.h"
 
+#include "basis/ground/choices.h"
 #include "basis/sync/held_semaphore.h"
 #include "basis/timers/complaint.h"
 #include "basis/timers/report_file.h"
@@ -12,8 +13,8 @@ namespace {
 
 /// Memory that runs short ends the program.
 PileTimer* makeTimer(char const* name, bool forThreads) noexcept {
-    if (forThreads) return new PileTimerMT(name, true);
-    return new PileTimer(name, true);
+    if (forThreads) return new PileTimerMT(name, WITH_CHECKS);
+    return new PileTimer(name, WITH_CHECKS);
 }
 
 } // namespace

@@ -1,5 +1,6 @@
 #include "basis/timers/timer_mgr_mgr.h"
 
+#include "basis/ground/choices.h"
 #include "basis/system/beneath_root.h"
 #include "zor_basis/files/dir.h"
 
@@ -8,7 +9,7 @@ namespace ZOR_Basis {
 TimerMgrMgr::TimerMgrMgr() : lock_(xos_SemMCreate()) {
     HeldSemaphore const held(lock_);
     dir_ = beneathRoot("timer");
-    Dir::New(dir_.c_str(), false);
+    Dir::New(dir_.c_str(), WITHOUT_PARENTS);
 }
 
 void TimerMgrMgr::add(TimerMgrImpl* manager) {

@@ -1,5 +1,6 @@
 #include "zor_basis/walk/file_count_visitor.h"
 
+#include "basis/ground/choices.h"
 #include "zor_basis/walk/file_iterator.h"
 
 namespace ZOR_Basis {
@@ -16,7 +17,8 @@ bool FileCountVisitor::stop() {
 
 int FileCountVisitor::Get(Str const& path, LookForType type, std::uint64_t limit) {
     FileCountVisitor counter(limit);
-    return FileIterator(path, type, nullptr, nullptr).doIt(&counter, false, false) ? counter.total() : -1;
+    return FileIterator(path, type, nullptr, nullptr).doIt(&counter, ONE_LEVEL, IGNORING_FAILURES) ? counter.total()
+                                                                                                   : -1;
 }
 
 } // namespace ZOR_Basis

@@ -1,17 +1,14 @@
 #include "zor_basis/walk/file_delete_visitor.h"
 
-#include "basis/files/last_error.h"
-#include "zor_basis/files/dir.h"
-#include "zor_basis/files/f_stat.h"
-#include "zor_basis/files/file.h"
+#include "basis/files/whole_entry.h"
+#include "basis/ground/choices.h"
 
-using namespace ZOR_Basis;
+namespace ZOR_Basis {
 
-bool FileDeleteVisitor::perform(FileEntry* entry) { return zbCheckRemoveFileDir(entry->getFullPath(), true); }
+bool FileDeleteVisitor::perform(FileEntry* entry) { return freeDestination(entry->getFullPath(), OVERWRITING); }
 
-bool zbCheckRemoveFileDir(FPath const& path, bool remove) {
-    FStat const entry(path);
-    if (!entry.exist()) return true;
-    if (!remove) return refuse(Reason::ALREADY_THERE);
-    return entry.isDir() ? Dir::Rem(path, true, false) : File::Rem(path, true, false);
+} // namespace ZOR_Basis
+
+bool zbCheckRemoveFileDir(ZOR_Basis::FPath const& path, bool remove) {
+    return ZOR_Basis::freeDestination(path, remove);
 }

@@ -1,14 +1,13 @@
 #include "zor_basis/walk/file_iterator.h"
 
 #include "basis/files/last_error.h"
+#include "basis/files/platform_flags.h"
+#include "basis/ground/choices.h"
 #include "basis/platform/xos_basics.h"
 #include "zor_basis/files/f_stat.h"
 
 namespace ZOR_Basis {
 namespace {
-
-constexpr std::uint32_t ENCRYPTED_STORE = 0x4000000;
-constexpr std::uint32_t NAMES_AS_STORED = 0x4000;
 
 /// What a listing of the platform layer is asked for.
 enum Kind : int { EVERYTHING = 0, DIRECTORIES = 1, FILES = 2 };
@@ -84,7 +83,7 @@ FileIterator::~FileIterator() { finish(); }
 bool FileIterator::open(bool useWildcard, bool anyCase) {
     finish();
     bool const restricted = useWildcard && !wildcard_.empty();
-    handle_ = xos_DirOpenEx(path_, restricted ? wildcard_.c_str() : nullptr, crypted_ ? ENCRYPTED_STORE : 0);
+    handle_ = xos_DirOpenEx(path_, restricted ? wildcard_.c_str() : nullptr, flagIf(crypted_, ENCRYPTED_STORE));
     if (handle_ == 0) return false;
     if (anyCase && (type_ & LOOK_ANYCASE) != 0) xos_DirForceCaseAny(handle_, 1);
     return true;
@@ -110,7 +109,7 @@ bool FileIterator::doIt(Str const& path, LookForType type, FileVisitor* visitor,
 
 bool FileIterator::shallowIteration(FileVisitor* visitor, bool stopOnFalse) {
     // kept walk-06: folders come and go under a walk, and one that has gone has nothing to offer.
-    if (!open(true, true)) return true;
+    if (!open(WITH_WILDCARD, IN_ANY_CASE)) return true;
     bool const result = shallowRide(visitor, stopOnFalse);
     finish();
     return result;
@@ -118,7 +117,7 @@ bool FileIterator::shallowIteration(FileVisitor* visitor, bool stopOnFalse) {
 
 bool FileIterator::deepIteration(FileVisitor* visitor, bool stopOnFalse) {
     // kept walk-04: a wildcard is for the files that are wanted, which lie in folders of any name.
-    if (!open(false, false)) return true;
+    if (!open(WITHOUT_WILDCARD, IN_EXACT_CASE)) return true;
     bool const result = deepRide(visitor, stopOnFalse);
     finish();
     return result;
@@ -146,7 +145,7 @@ bool FileIterator::deepRide(FileVisitor* visitor, bool stopOnFalse) {
         if (isPassedOver(name)) continue;
         FileIterator child(*this);
         child.path_.add(name);
-        result = child.doIt(visitor, true, stopOnFalse);
+        result = child.doIt(visitor, DEEP, stopOnFalse);
     }
     return result.told();
 }
@@ -154,7 +153,7 @@ bool FileIterator::deepRide(FileVisitor* visitor, bool stopOnFalse) {
 bool FileIterator::start(bool useWildcard) { return open(useWildcard, useWildcard); }
 
 char const* FileIterator::next() {
-    if (handle_ == 0 && !start(true)) return nullptr;
+    if (handle_ == 0 && !start(WITH_WILDCARD)) return nullptr;
     while (char const* const name = nextName(kindOf(LISTED, type_))) {
         if (condition_ == nullptr || condition_->acceptName(this, name)) return name;
     }

@@ -1,5 +1,6 @@
 #include "zor_basis/walk/file_size_visitor.h"
 
+#include "basis/ground/choices.h"
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/files/f_stat.h"
 #include "zor_basis/walk/file_iterator.h"
@@ -12,7 +13,7 @@ class DirectorySum : public FileVisitor {
 public:
     bool perform(FileEntry* entry) override {
         total_ += entry->isFile() ? static_cast<std::int64_t>(entry->getSize())
-                                  : FileSizeVisitor::Get(entry->getFullPath(), true);
+                                  : FileSizeVisitor::Get(entry->getFullPath(), DEEP);
         return true;
     }
     std::int64_t total() const { return total_; }
@@ -36,7 +37,7 @@ std::int64_t FileSizeVisitor::Get(Str const& path, bool recursive) {
     if (entry.isFile()) return static_cast<std::int64_t>(entry.size());
     DirectorySum sum;
     FileIterator walk(whole, recursive ? LOOK_BOTH : LOOK_FILES, nullptr, nullptr);
-    return walk.doIt(&sum, false, false) ? sum.total() : 0;
+    return walk.doIt(&sum, ONE_LEVEL, IGNORING_FAILURES) ? sum.total() : 0;
 }
 
 } // namespace ZOR_Basis

@@ -1,5 +1,6 @@
 #include "zor_basis/walk/find_file_visit.h"
 
+#include "basis/ground/choices.h"
 #include "zor_basis/walk/file_iterator.h"
 
 #include <cstring>
@@ -46,12 +47,11 @@ bool FindFileVisit::stop() { return maxCount_ >= 1 && count_ >= maxCount_; }
 
 } // namespace ZOR_Basis
 
-using namespace ZOR_Basis;
-
-int zbFindFile(Str const& dir, char const* wildcard, LookForType type, FPath& found, bool firstOnly, bool deep) {
-    FileIterator walk(dir, type, wildcard, nullptr);
-    FindFileVisit search(!firstOnly, firstOnly ? 1 : 0);
-    walk.doIt(&search, deep, false);
+int zbFindFile(ZOR_Basis::Str const& dir, char const* wildcard, ZOR_Basis::LookForType type, ZOR_Basis::FPath& found,
+               bool firstOnly, bool deep) {
+    ZOR_Basis::FileIterator walk(dir, type, wildcard, nullptr);
+    ZOR_Basis::FindFileVisit search(!firstOnly, firstOnly ? 1 : 0);
+    walk.doIt(&search, deep, ZOR_Basis::IGNORING_FAILURES);
     found = search.getPath();
     return search.getNum();
 }

@@ -1,7 +1,7 @@
 #include "zor_basis/walk/link_or_copy.h"
 
+#include "basis/files/whole_entry.h"
 #include "zor_basis/files/dir.h"
-#include "zor_basis/files/file.h"
 
 namespace ZOR_Basis {
 
@@ -9,9 +9,10 @@ bool zbLinkOrCopy(char const* src, char const* dst, bool overwrite) {
     if (Dir::Exist(dst)) {
         // kept walk-10: jobs that share a resource all ask for it, and the first has brought it.
         if (!overwrite) return true;
-        File::Rem(dst, true, false);
+        // A directory stays, and then neither a link nor a copy can be made.
+        removeFile(dst);
     }
-    return Dir::Link(dst, src) || File::Copy(dst, src, true, false);
+    return linkOrCopy(dst, src);
 }
 
 } // namespace ZOR_Basis

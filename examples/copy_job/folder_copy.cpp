@@ -1,5 +1,6 @@
 #include "examples/copy_job/folder_copy.h"
 
+#include "examples/copy_job/choices.h"
 #include "examples/copy_job/each_entry.h"
 
 #include <zor_basis/walk.h>
@@ -13,13 +14,13 @@ bool FolderCopy::run(FPath const& source, FPath const& target) {
 }
 
 bool FolderCopy::copyFolder(FPath const& source, FPath const& target) {
-    if (Dir::New(target, false)) return copyFiles(source, target) && copyFolders(source, target);
+    if (Dir::New(target, WITHOUT_PARENTS)) return copyFiles(source, target) && copyFolders(source, target);
     failedAt_ = target;
     return false;
 }
 
 bool FolderCopy::copyFiles(FPath const& source, FPath const& target) {
-    FileCopyVisitor copier(target, true, true);
+    FileCopyVisitor copier(target, OVERWRITING, DEEP);
     return forEachEntry(source, LOOK_FILES, [&](FileEntry& entry) {
         if (!copier.perform(&entry)) {
             failedAt_ = entry.getFullPath();

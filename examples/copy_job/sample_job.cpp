@@ -1,5 +1,7 @@
 #include "examples/copy_job/sample_job.h"
 
+#include "examples/copy_job/choices.h"
+
 #include <cstdio>
 #include <random>
 
@@ -46,7 +48,7 @@ bool writeResources(FPath const& folder) {
     std::mt19937 source(7);
     for (char const* kind : {"fonts", "images"}) {
         FPath const place(folder, kind);
-        if (!Dir::New(place, false)) return false;
+        if (!Dir::New(place, WITHOUT_PARENTS)) return false;
         for (int i = 1; i <= 8; ++i) {
             BufStr<15> name(kind, 4);
             name << "-" << i << ".bin";
@@ -61,6 +63,6 @@ bool writeResources(FPath const& folder) {
 bool makeSampleJob(FPath const& folder) {
     FPath const pages(folder, "pages");
     FPath const resources(folder, "resources");
-    return Dir::New(pages, true) && Dir::New(resources, true) && writeTicket(folder) && writePages(pages) &&
-           writeResources(resources);
+    return Dir::New(pages, WITH_PARENTS) && Dir::New(resources, WITH_PARENTS) && writeTicket(folder) &&
+           writePages(pages) && writeResources(resources);
 }

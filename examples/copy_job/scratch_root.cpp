@@ -1,5 +1,7 @@
 #include "examples/copy_job/scratch_root.h"
 
+#include "examples/copy_job/choices.h"
+
 #include <xos_host.h>
 
 #include <filesystem>
@@ -16,8 +18,10 @@ FPath freshPath() {
 
 } // namespace
 
-ScratchRoot::ScratchRoot() : path_(freshPath()), made_(Dir::New(path_, false)) { xos_HostSetRoot(path_.c_str()); }
+ScratchRoot::ScratchRoot() : path_(freshPath()), made_(Dir::New(path_, WITHOUT_PARENTS)) {
+    xos_HostSetRoot(path_.c_str());
+}
 
 ScratchRoot::~ScratchRoot() {
-    if (made_) Dir::Rem(path_, true, false);
+    if (made_) Dir::Rem(path_, WITH_CONTENTS, WITHOUT_SECOND_FLAG);
 }

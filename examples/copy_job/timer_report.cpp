@@ -1,5 +1,7 @@
 #include "examples/copy_job/timer_report.h"
 
+#include "examples/copy_job/choices.h"
+
 #include <zor_basis/walk.h>
 
 #include <cstdio>
@@ -8,7 +10,7 @@ using namespace ZOR_Basis;
 
 bool printTimerReport(FPath const& root) {
     FPath report;
-    if (zbFindFile(FPath(root, "timer"), "*.timer", LOOK_FILES, report, false, false) == 0) return false;
+    if (zbFindFile(FPath(root, "timer"), "*.timer", LOOK_FILES, report, LAST_OF_ALL, ONE_LEVEL) == 0) return false;
     File file(report, File::FILE_READ | File::FILE_BINARY);
     if (!file.isOpen()) return false;
     std::putchar('\n');

@@ -6,7 +6,8 @@
 
 #include <zor_basis/files.h>
 
-/// Prints the report that lies beneath a root folder. \return whether there is one
+/// Prints the report that lies beneath a root folder.
+/// \return whether there is one
 bool printTimerReport(ZOR_Basis::FPath const& root);
 
 #endif

@@ -2,7 +2,7 @@
 
 #include "tests/support/child.h"
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <map>
 

@@ -1,6 +1,6 @@
 // Code pages, which only Windows has; charset_posix_test.cpp is its counterpart.
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include "tests/support/table.h"
 #include "tests/text/convert_check.h"

@@ -5,7 +5,7 @@
 //     cmake --build --preset windows --target crypto_vectors
 //     cmake/windows/wine-run build/windows/bin/crypto_vectors.exe > tests/crypto/service_vectors.inc
 
-#include "basis/platform/windows_api.h"
+#include "basis/platform/windows_api_win.h"
 
 #include <wincrypt.h>
 

@@ -1,5 +1,5 @@
 /// \file
-/// An open file of the system, without any buffer. Twins: raw_file_posix.cpp, raw_file_win.cpp.
+/// An open file of the system, without any buffer. Twins of raw_file.cpp: raw_file_posix.cpp, raw_file_win.cpp.
 ///
 /// Transfers complete what the system interrupts or does in pieces. What fails leaves the system's last error.
 

@@ -22,10 +22,12 @@ ZB_API std::uint64_t hashDjb2(char const* text, std::uint64_t length) noexcept;
 /// The floor of the binary logarithm; 0 for 0.
 ZB_API std::uint64_t Log2(std::uint64_t n) noexcept;
 
-/// 2^i. \pre i is at most 30
+/// 2^i.
+/// \pre i is at most 30
 ZB_API std::uint64_t Pow2(std::uint64_t i) noexcept;
 
-/// The largest prime that is not above 2^i; 1 for i = 0. \pre i is at most 30
+/// The largest prime that is not above 2^i; 1 for i = 0.
+/// \pre i is at most 30
 ZB_API std::uint64_t PrimeClsPo2(std::uint64_t i) noexcept;
 
 /// The floor of the square root.

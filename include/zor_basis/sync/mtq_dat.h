@@ -58,12 +58,16 @@ public:
 private:
     friend class JobEntry;
 
-    MTQ_Dat(MultiTaskQueue* queue, Function function, void* argument, bool ownsArgument, bool removeWhenDone)
+    /// What the task of a job does; the argument is the job.
+    using Task = void (*)(void* job);
+
+    MTQ_Dat(MultiTaskQueue* queue, Task run, Function function, void* argument, bool ownsArgument, bool removeWhenDone)
         : queue_(queue),
           function_(function),
           argument_(argument),
           ownsArgument_(ownsArgument),
-          removeWhenDone_(removeWhenDone) {}
+          removeWhenDone_(removeWhenDone),
+          run_(run) {}
     ~MTQ_Dat();
 
     MultiTaskQueue* queue() const { return queue_; }
@@ -82,6 +86,7 @@ private:
     std::atomic<std::uint64_t> task_{0};
     /// `start` is running; the task may end before `start` does.
     std::atomic<bool> starting_{false};
+    Task const run_;
 };
 
 } // namespace ZOR_Basis

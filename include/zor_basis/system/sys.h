@@ -56,7 +56,8 @@ public:
     /// \cost one query of the system for the process; while the root is empty one for each call, by one thread at a
     ///     time
     static FPath const& root();
-    /// Copies the root. \return whether it is not empty
+    /// Copies the root.
+    /// \return whether it is not empty
     static bool root(FPath& out);
 
     /// Returns the folder "tmp" in the root folder. The folder need not exist.

@@ -155,7 +155,7 @@ public:
         return i < size_ ? text_[i] : '\0';
     }
 
-    /// The text for direct writing, capacity + 1 bytes; must be followed by `resize`.
+    /// The text for direct writing, capacity + 1 bytes; must be followed by `resize` or `setSize`.
     char* getBuf() noexcept { return Text::text(*this); }
     /// The capacity: N inside the object, otherwise the block's; the terminator is not counted.
     std::uint64_t sizeBuf() const noexcept { return Text::capacity(*this); }
@@ -169,6 +169,12 @@ public:
     ///     last byte but is terminated
     BufStr& resize(std::uint64_t n = 0) noexcept {
         Text::resize(*this, n);
+        return *this;
+    }
+    /// Sets the size to n and stores a terminator there.
+    /// \pre n is at most the capacity, and no zero is among the first n bytes; nothing is checked
+    BufStr& setSize(std::uint64_t n) noexcept {
+        Text::setSize(*this, n);
         return *this;
     }
     /// Empties the text; a block is kept.

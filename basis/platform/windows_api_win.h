@@ -1,8 +1,8 @@
 /// \file
 /// The one place from which the library includes the Windows interface.
 
-#ifndef BASIS_PLATFORM_WINDOWS_API_H
-#define BASIS_PLATFORM_WINDOWS_API_H
+#ifndef BASIS_PLATFORM_WINDOWS_API_WIN_H
+#define BASIS_PLATFORM_WINDOWS_API_WIN_H
 
 #ifndef WIN32_LEAN_AND_MEAN
 #define WIN32_LEAN_AND_MEAN

@@ -1,0 +1,7 @@
+#include "zor_basis/log/logger.h"
+
+namespace ZOR_Basis {
+
+Logger::~Logger() = default;
+
+} // namespace ZOR_Basis
