@@ -2,10 +2,10 @@
 
 #include "host/xos_basics/directories/copy_tree_posix.h"
 
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/directories/directory_chain_posix.h"
 #include "host/xos_basics/directories/dirents_posix.h"
 #include "host/xos_basics/directories/name_queue.h"
+#include "host/xos_basics/result.h"
 
 #include <climits>
 #include <sys/sysmacros.h>

@@ -3,9 +3,9 @@
 #include "basis/ground/wildcard.h"
 #include "basis/platform/xos_basics.h"
 #include "host/xos_basics/control/control.h"
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/directories/raw_listing.h"
 #include "host/xos_basics/directories/tree.h"
+#include "host/xos_basics/result.h"
 
 #include <cstring>
 #include <string>

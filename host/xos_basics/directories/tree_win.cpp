@@ -2,8 +2,8 @@
 
 #include "host/xos_basics/directories/tree.h"
 
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/files/entry_win.h"
+#include "host/xos_basics/result.h"
 
 #include <cstring>
 #include <vector>

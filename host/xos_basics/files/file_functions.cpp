@@ -2,9 +2,9 @@
 
 #include "basis/platform/xos_basics.h"
 #include "host/xos_basics/control/control.h"
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/files/open_file.h"
 #include "host/xos_basics/files/whole_file.h"
+#include "host/xos_basics/result.h"
 
 using host::FAILED;
 using host::failsNow;

@@ -32,8 +32,6 @@ struct alignas(64) Semaphore {
     std::atomic<std::uint64_t> owner;
     /// How often the owner has taken it. The owner's alone.
     std::uint64_t depth;
-    /// The last giver's time; see call_order.h.
-    std::atomic<std::uint64_t> time;
     NamedMutex* named;
     Semaphore* nextFree;
 };

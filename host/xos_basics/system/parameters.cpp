@@ -1,6 +1,7 @@
 #include "host/include/xos_host.h"
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/result.h"
 
 #include "basis/platform/xos_basics.h"
 

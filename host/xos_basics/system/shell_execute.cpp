@@ -1,5 +1,6 @@
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/result.h"
 #include "host/xos_basics/system/shell.h"
 
 #include "basis/platform/xos_basics.h"

@@ -39,6 +39,6 @@ extern "C" xos_Task xos_TaskCreate(xos_TaskParams const* params) {
         return NO_TASK;
     }
     // What the creator called so far comes before what the task calls.
-    host::publishTime(host::threadCalls());
+    host::beginEra();
     return host::runTask(host::jobOf(*params)) ? lastTask.fetch_add(1, std::memory_order_relaxed) + 1 : NO_TASK;
 }

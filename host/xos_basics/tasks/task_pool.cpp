@@ -1,6 +1,6 @@
 #include "host/xos_basics/tasks/task_pool.h"
 
-#include "host/xos_basics/control/call_order.h"
+#include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/tasks/deferred_threads.h"
 #include "host/xos_basics/tasks/job_queue.h"
@@ -207,7 +207,7 @@ void runJob(Worker& worker, std::unique_ptr<QueuedJob> owned) {
     takeName(worker, job.name);
     job.entry(job.argument);
     // What the task called comes before whatever is called after its end.
-    publishTime(threadCalls());
+    beginEra();
 }
 
 /// Runs a first job, if there is one, and then whatever comes, until there is nothing to do for long and for many.

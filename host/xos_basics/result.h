@@ -1,15 +1,17 @@
 /// \file
 /// How a platform function turns what its body found out into its result.
 
-#ifndef HOST_XOS_BASICS_CONTROL_RESULT_H
-#define HOST_XOS_BASICS_CONTROL_RESULT_H
+#ifndef HOST_XOS_BASICS_RESULT_H
+#define HOST_XOS_BASICS_RESULT_H
 
-#include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 
 #include <new>
 
 namespace host {
+
+/// The result of an `int` function that fails without a more telling value.
+constexpr int FAILED = -1;
 
 /// Runs `body`; lack of memory, which never leaves a platform function as an exception, gives `failure`.
 template <class Result, class Body>
