@@ -19,7 +19,7 @@ Result unlessMemoryLacks(Result failure, Body body) {
     try {
         return body();
     } catch (std::bad_alloc const&) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return failure;
     }
 }
@@ -34,7 +34,7 @@ int resultOf(Body body) {
 template <class... Texts>
 bool given(Texts const*... texts) {
     if ((... && (texts != nullptr))) return true;
-    setLastError(Error::badArgument);
+    setLastError(Error::BAD_ARGUMENT);
     return false;
 }
 

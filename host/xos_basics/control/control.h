@@ -82,7 +82,8 @@ inline ThreadCalls* threadCalls() { return thisThread.calls != nullptr ? thisThr
 /// The failures asked for: the calls to skip in the upper half, the failures in the lower; 0: none.
 extern constinit std::array<std::atomic<std::uint64_t>, FUNCTION_COUNT> faults;
 
-/// Counts one call down. \return whether it fails; the last error is then set
+/// Counts one call down.
+/// \return whether it fails; the last error is then set
 bool takesInjectedFailure(Function function);
 
 inline bool failsOnDemand(Function function) {

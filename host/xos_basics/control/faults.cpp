@@ -58,7 +58,7 @@ bool takesInjectedFailure(Function function) {
         bool const fails = seen < ONE_SKIPPED;
         std::uint64_t const next = seen - (fails ? 1 : ONE_SKIPPED);
         if (!fault.compare_exchange_weak(seen, next, std::memory_order_relaxed)) continue;
-        if (fails) setLastError(Error::injected);
+        if (fails) setLastError(Error::INJECTED);
         return fails;
     }
     return false;

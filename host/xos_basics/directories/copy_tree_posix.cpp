@@ -16,7 +16,8 @@ namespace host {
 
 namespace {
 
-/// Whether a new entry may take this name. \param source  what it is made of
+/// Whether a new entry may take this name.
+/// \param source  what it is made of
 bool mayTakeName(int at, char const* name, struct stat const& source, bool overwrite) {
     struct stat present {};
     if (::fstatat(at, name, &present, AT_SYMLINK_NOFOLLOW) != 0) return errno == ENOENT;

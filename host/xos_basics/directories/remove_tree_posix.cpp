@@ -30,7 +30,8 @@ private:
     void enter(char const* name);
     /// Removes what no descent is needed for, and notes the directories.
     void sweep();
-    /// Removes the directory that has just been swept, from the one above. \return false: that one cannot be found
+    /// Removes the directory that has just been swept, from the one above.
+    /// \return false: that one cannot be found
     bool leave();
     bool removeUnentered(char const* name);
     void fail();

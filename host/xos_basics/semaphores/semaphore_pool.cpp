@@ -104,7 +104,7 @@ Semaphore* takeBlock() {
 Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state) {
     Semaphore* const semaphore = takeBlock();
     if (semaphore == nullptr) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return nullptr;
     }
     semaphore->kind = kind;

@@ -47,7 +47,7 @@ int takeMutex(host::Semaphore& mutex) {
 }
 
 int giveMutex(host::Semaphore& mutex) {
-    if (mutex.owner.load(std::memory_order_relaxed) != ownSerial()) return failWith(host::Error::notOwner);
+    if (mutex.owner.load(std::memory_order_relaxed) != ownSerial()) return failWith(host::Error::NOT_OWNER);
     if (--mutex.depth == 0) {
         mutex.owner.store(0, std::memory_order_relaxed);
         host::giveWord(mutex.lock);
@@ -79,23 +79,23 @@ extern "C" {
 
 xos_Sem xos_SemMCreate(void) {
     if (failsNow(Function::xos_SemMCreate)) return 0;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::mutex, host::WORD_FREE));
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::MUTEX, host::WORD_FREE));
 }
 
 xos_Sem xos_SemBCreate(int available) {
     if (failsNow(Function::xos_SemBCreate, available)) return 0;
     std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::binary, state));
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::BINARY, state));
 }
 
 int xos_SemTake(xos_Sem sem) {
     if (failsNow(Function::xos_SemTake, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
-    case host::SemaphoreKind::mutex:
+    case host::SemaphoreKind::MUTEX:
         return takeMutex(*semaphore);
-    case host::SemaphoreKind::binary:
+    case host::SemaphoreKind::BINARY:
         return takeBinary(*semaphore);
     default:
         return host::takeNamed(*semaphore->named);
@@ -105,11 +105,11 @@ int xos_SemTake(xos_Sem sem) {
 int xos_SemGive(xos_Sem sem) {
     if (failsNow(Function::xos_SemGive, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
-    case host::SemaphoreKind::mutex:
+    case host::SemaphoreKind::MUTEX:
         return giveMutex(*semaphore);
-    case host::SemaphoreKind::binary:
+    case host::SemaphoreKind::BINARY:
         return giveBinary(*semaphore);
     default:
         return host::giveNamed(*semaphore->named);
@@ -119,10 +119,10 @@ int xos_SemGive(xos_Sem sem) {
 int xos_SemDestroy(xos_Sem sem) {
     if (failsNow(Function::xos_SemDestroy, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
-    if (semaphore->kind == host::SemaphoreKind::mutex) leaveMutex(*semaphore);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
+    if (semaphore->kind == host::SemaphoreKind::MUTEX) leaveMutex(*semaphore);
     // A named mutex is the process's, not the caller's: others hold the same handle.
-    if (semaphore->kind != host::SemaphoreKind::named) host::freeSemaphore(semaphore);
+    if (semaphore->kind != host::SemaphoreKind::NAMED) host::freeSemaphore(semaphore);
     return 0;
 }
 

@@ -24,7 +24,7 @@ int xos_BasicsParamLookup(uint32_t id, void* out, uint64_t size) {
     if (host::failsNow(host::Function::xos_BasicsParamLookup, id, out, size)) return host::FAILED;
     xos_HostResolver const answer = resolver.load();
     if (id != FUNCTION_RESOLVER || answer == nullptr || out == nullptr || size < sizeof answer) {
-        host::setLastError(host::Error::notFound);
+        host::setLastError(host::Error::NOT_FOUND);
         return 0;
     }
     std::memcpy(out, &answer, sizeof answer);

@@ -156,7 +156,8 @@ TEST_F(HostControl, counts_skipped_calls_over_all_threads) {
     EXPECT_EQ(failed, 700);
 }
 
-/// Each call made in full, good where nothing is injected. \return whether it gave its failure value
+/// Each call made in full, good where nothing is injected.
+/// \return whether it gave its failure value
 struct Failure {
     char const* name;
     std::function<bool()> fails;
