@@ -7,7 +7,9 @@
 #include <sys/stat.h>
 #include <time.h>
 
+#include <algorithm>
 #include <cerrno>
+#include <limits>
 
 namespace ZOR_Basis {
 namespace {
@@ -15,13 +17,19 @@ namespace {
 constexpr std::uint64_t MS_PER_SECOND = 1000;
 constexpr std::uint64_t NS_PER_MS = 1'000'000;
 
+/// A link count or id that does not fit is the largest one that does, rather than another file's or user's.
+template <class From>
+std::int16_t clamped(From value) {
+    return static_cast<std::int16_t>(std::min<From>(value, std::numeric_limits<std::int16_t>::max()));
+}
+
 void copyRecord(struct stat const& from, xos_Stat& record) {
     record.st_dev_ = static_cast<std::uint32_t>(from.st_dev);
     record.st_ino_ = static_cast<std::uint16_t>(from.st_ino);
     record.st_mode_ = static_cast<std::uint16_t>(from.st_mode);
-    record.st_nlink_ = static_cast<std::int16_t>(from.st_nlink);
-    record.st_uid_ = static_cast<std::int16_t>(from.st_uid);
-    record.st_gid_ = static_cast<std::int16_t>(from.st_gid);
+    record.st_nlink_ = clamped(from.st_nlink);
+    record.st_uid_ = clamped(from.st_uid);
+    record.st_gid_ = clamped(from.st_gid);
     record.st_rdev_ = static_cast<std::uint32_t>(from.st_rdev);
     record.st_size_ = from.st_size;
     record.st_atime_ = from.st_atim.tv_sec;

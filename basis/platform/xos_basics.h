@@ -146,8 +146,9 @@ XOS_API int xos_FileMove(char const* dst, char const* src, int overwrite);
 /// Gives the file `src` a second name `dst`, which must not exist.
 XOS_API int xos_FileHardLink(char const* src, char const* dst);
 
-/// The 64-bit status record of Windows, the same 56 bytes on every target. Times are seconds since 1970 UTC. The names
-/// end in "_" because the plain names are macros in some systems' headers.
+/// The 64-bit status record of Windows, the same 56 bytes on every target. Times are seconds since 1970 UTC. A
+/// number of links or id that does not fit is the largest one that does. The names end in "_" because the plain names
+/// are macros in some systems' headers.
 struct xos_Stat {
     uint32_t st_dev_;
     uint16_t st_ino_;

@@ -139,6 +139,8 @@ BENCHMARK(takeAndGive<HostMutex>)->Name("mutex_uncontended/ours");
 BENCHMARK(takeAndGive<PthreadMutex>)->Name("mutex_uncontended/pthread");
 BENCHMARK(takeAndGiveShared<HostMutex>)->Name("mutex_contended/ours")->Threads(2)->UseRealTime();
 BENCHMARK(takeAndGiveShared<PthreadMutex>)->Name("mutex_contended/pthread")->Threads(2)->UseRealTime();
+BENCHMARK(takeAndGive<HostMutex>)->Name("mutex_each_its_own/ours")->Threads(2)->UseRealTime();
+BENCHMARK(takeAndGive<PthreadMutex>)->Name("mutex_each_its_own/pthread")->Threads(2)->UseRealTime();
 BENCHMARK(makeAndDestroy<HostMutex>)->Name("mutex_make_destroy/ours");
 BENCHMARK(makeAndDestroy<PthreadMutex>)->Name("mutex_make_destroy/pthread");
 BENCHMARK(runJobs<HostTask>)->Name("tasks_10000/ours")->UseRealTime()->Unit(benchmark::kMillisecond);

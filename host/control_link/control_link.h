@@ -14,8 +14,9 @@ namespace host {
 /// The address of a function of the loaded xos_basics; null when it has none of that name.
 void* findControl(char const* name);
 
-/// Counts a call and remembers its arguments, texts by their address. \return whether the call is to fail; the last
-/// error is then set
+/// Counts a call and remembers its arguments, texts by their address.
+/// \return whether the call is to fail; the last
+///     error is then set
 bool failsNow(char const* function, std::initializer_list<std::uint64_t> arguments);
 
 /// Says how `xos_HostAlertFire` runs an alert.

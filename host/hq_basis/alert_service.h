@@ -33,7 +33,8 @@ public:
     /// Waits for a callback that runs on another thread, at most `LONGEST_WAIT`.
     void remove(std::uint32_t id);
 
-    /// Runs an alert on the calling thread. \return false: there is none, or it is the one that calls this
+    /// Runs an alert on the calling thread.
+    /// \return false: there is none, or it is the one that calls this
     bool fire(std::uint32_t id);
 
     static constexpr std::chrono::milliseconds LONGEST_WAIT{1000};

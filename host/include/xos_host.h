@@ -103,10 +103,11 @@ XOS_HOST_API void xos_HostCallsReset(void);
 ///
 /// \return null if there is no such function, or if it has not been called since the start or the last reset; otherwise
 ///     a text that is valid until the calling thread's next `xos_HostLastCall`
-/// \thread the last call is the one made last of those that ended before this one began. `xos_SemTake` and
-///     `xos_SemGive`, which cost less than reading a clock, are an exception: calls by two threads are ordered only if
-///     a semaphore, a start or end of a thread or task, an `xos_HostLastCall`, or another function that both call came
-///     between them
+/// \thread of calls by different threads, one that happened after another, however the threads synchronised, is the
+///     later one. `xos_SemBCreate`, `xos_SemTake`, `xos_SemGive`, `xos_SemDestroy`, `xos_FileReadEx`, `xos_FileGetsEx`,
+///     `xos_DirNextEx`, `xos_StrCmp` and `cfg_KeyGetOpt_Bool`, which usually need no system call, are an exception:
+///     their calls are ordered only if, between them, a thread or task began or ended, or a last call was queried.
+///     Otherwise a call by the querying thread itself counts as the later one
 XOS_HOST_API char const* xos_HostLastCall(char const* function);
 
 /* Functions by name */

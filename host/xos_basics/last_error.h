@@ -8,12 +8,12 @@
 namespace host {
 
 enum class Error {
-    injected,    ///< EIO; 31, a device that does not work
-    badHandle,   ///< EBADF; 6
-    badArgument, ///< EINVAL; 87
-    notOwner,    ///< EPERM; 288
-    notFound,    ///< ENOENT; 2
-    noMemory     ///< ENOMEM; 8
+    INJECTED,     ///< EIO; 31, a device that does not work
+    BAD_HANDLE,   ///< EBADF; 6
+    BAD_ARGUMENT, ///< EINVAL; 87
+    NOT_OWNER,    ///< EPERM; 288
+    NOT_FOUND,    ///< ENOENT; 2
+    NO_MEMORY     ///< ENOMEM; 8
 };
 
 void setLastError(Error error);

@@ -8,22 +8,22 @@ namespace host {
 
 void setLastError(Error error) {
     switch (error) {
-    case Error::injected:
+    case Error::INJECTED:
         errno = EIO;
         break;
-    case Error::badHandle:
+    case Error::BAD_HANDLE:
         errno = EBADF;
         break;
-    case Error::badArgument:
+    case Error::BAD_ARGUMENT:
         errno = EINVAL;
         break;
-    case Error::notOwner:
+    case Error::NOT_OWNER:
         errno = EPERM;
         break;
-    case Error::notFound:
+    case Error::NOT_FOUND:
         errno = ENOENT;
         break;
-    case Error::noMemory:
+    case Error::NO_MEMORY:
         errno = ENOMEM;
         break;
     }

@@ -7,22 +7,22 @@ namespace host {
 
 void setLastError(Error error) {
     switch (error) {
-    case Error::injected:
+    case Error::INJECTED:
         SetLastError(ERROR_GEN_FAILURE);
         break;
-    case Error::badHandle:
+    case Error::BAD_HANDLE:
         SetLastError(ERROR_INVALID_HANDLE);
         break;
-    case Error::badArgument:
+    case Error::BAD_ARGUMENT:
         SetLastError(ERROR_INVALID_PARAMETER);
         break;
-    case Error::notOwner:
+    case Error::NOT_OWNER:
         SetLastError(ERROR_NOT_OWNER);
         break;
-    case Error::notFound:
+    case Error::NOT_FOUND:
         SetLastError(ERROR_FILE_NOT_FOUND);
         break;
-    case Error::noMemory:
+    case Error::NO_MEMORY:
         SetLastError(ERROR_NOT_ENOUGH_MEMORY);
         break;
     }

@@ -128,10 +128,10 @@ bool isGoodAnswer(long status) { return status >= 200 && status < 300; }
 
 bool perform(Handle const& handle, FetchRequest const& request, Body& body) {
     bool hasHead = false;
-    if (!prepare(handle, request, body, hasHead)) return failFor(Reason::badArgument);
+    if (!prepare(handle, request, body, hasHead)) return failFor(Reason::BAD_ARGUMENT);
     CURLcode const code = curl_easy_perform(handle.get());
     if (code != CURLE_OK) return failForCode(code, handle, body);
-    if (!hasHead) return failFor(Reason::badAnswer);
+    if (!hasHead) return failFor(Reason::BAD_ANSWER);
     return isGoodAnswer(statusOf(handle)) || failForStatus(statusOf(handle));
 }
 

@@ -167,7 +167,7 @@ bool readBody(HINTERNET request, BodySink& sink) {
     for (;;) {
         DWORD count = 0;
         if (WinHttpReadData(request, piece.data(), static_cast<DWORD>(piece.size()), &count) == FALSE) return false;
-        if (count == 0) return !announced.has_value() || *announced == received || failFor(Reason::badAnswer);
+        if (count == 0) return !announced.has_value() || *announced == received || failFor(Reason::BAD_ANSWER);
         received += count;
         if (!sink.take(piece.data(), count)) return false;
     }
@@ -186,25 +186,25 @@ std::wstring combined(std::wstring const& base, std::wstring const& relative) {
     return SUCCEEDED(UrlCombineW(base.c_str(), relative.c_str(), url, &size, 0)) ? url : std::wstring{};
 }
 
-enum class Outcome { good, failed, leadsOn };
+enum class Outcome { GOOD, FAILED, LEADS_ON };
 
 /// \param url  where to ask; then, where the answer leads
 Outcome fetchOnce(HINTERNET session, FetchRequest const& wanted, std::wstring& url, BodySink& sink) {
     std::optional<Address> const address = addressOf(url, wanted);
-    if (!address.has_value()) return Outcome::failed;
+    if (!address.has_value()) return Outcome::FAILED;
     Handle const connection{WinHttpConnect(session, address->host.c_str(), address->port, 0)};
     Handle const request = connection == nullptr ? Handle{} : openRequest(connection.get(), *address);
-    if (request == nullptr) return Outcome::failed;
+    if (request == nullptr) return Outcome::FAILED;
     DWORD const status = exchangeWithCredentials(request.get(), *address);
     if (leadsOn(status)) {
         std::wstring const location = header(request.get(), WINHTTP_QUERY_LOCATION);
         url = combined(url, location);
-        if (!location.empty()) return Outcome::leadsOn;
+        if (!location.empty()) return Outcome::LEADS_ON;
     }
     // Without any status the system has said why.
     bool const isGood = status >= 200 && status < 300;
     if (!isGood && status != 0) failForStatus(static_cast<long>(status));
-    return isGood && readBody(request.get(), sink) ? Outcome::good : Outcome::failed;
+    return isGood && readBody(request.get(), sink) ? Outcome::GOOD : Outcome::FAILED;
 }
 
 bool isSameServer(std::wstring const& a, std::wstring const& b, FetchRequest const& request) {
@@ -219,16 +219,16 @@ bool fetch(FetchRequest const& wanted, BodySink& sink) {
     Handle const session = openSession(wanted);
     FetchRequest request = wanted;
     std::wstring url = wide(wanted.url, CP_UTF8);
-    Outcome outcome = session == nullptr ? Outcome::failed : Outcome::leadsOn;
-    for (std::uint32_t i = 0; i <= MOST_REDIRECTS && outcome == Outcome::leadsOn; ++i) {
+    Outcome outcome = session == nullptr ? Outcome::FAILED : Outcome::LEADS_ON;
+    for (std::uint32_t i = 0; i <= MOST_REDIRECTS && outcome == Outcome::LEADS_ON; ++i) {
         std::wstring const asked = url;
         outcome = fetchOnce(session.get(), request, url, sink);
-        if (outcome == Outcome::leadsOn && !isSameServer(asked, url, request)) {
+        if (outcome == Outcome::LEADS_ON && !isSameServer(asked, url, request)) {
             // Name and password are for the server that was named, not for one to which it leads on.
             request.user = nullptr;
         }
     }
-    return outcome == Outcome::good || (outcome == Outcome::leadsOn && failFor(Reason::tooManySteps));
+    return outcome == Outcome::GOOD || (outcome == Outcome::LEADS_ON && failFor(Reason::TOO_MANY_STEPS));
 }
 
 } // namespace host

@@ -7,12 +7,12 @@ bool failForStatus(long status) {
     case 401:
     case 403:
     case 407:
-        return failFor(Reason::forbidden);
+        return failFor(Reason::FORBIDDEN);
     case 404:
     case 410:
-        return failFor(Reason::notFound);
+        return failFor(Reason::NOT_FOUND);
     default:
-        return failFor(Reason::badAnswer);
+        return failFor(Reason::BAD_ANSWER);
     }
 }
 

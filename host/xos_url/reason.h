@@ -8,18 +8,20 @@ namespace host {
 
 /// What no call of the system says.
 enum class Reason {
-    badArgument,   ///< EINVAL; 87
-    unknownScheme, ///< EPROTONOSUPPORT; 12006
-    notFound,      ///< ENOENT; 2
-    forbidden,     ///< EACCES; 5
-    directory,     ///< EISDIR; 5
-    tooManySteps,  ///< ELOOP; 12156
-    badAnswer      ///< EPROTO; 12152
+    BAD_ARGUMENT,   ///< EINVAL; 87
+    UNKNOWN_SCHEME, ///< EPROTONOSUPPORT; 12006
+    NOT_FOUND,      ///< ENOENT; 2
+    FORBIDDEN,      ///< EACCES; 5
+    DIRECTORY,      ///< EISDIR; 5
+    TOO_MANY_STEPS, ///< ELOOP; 12156
+    BAD_ANSWER      ///< EPROTO; 12152
 };
 
-/// Sets the last error. \return false
+/// Sets the last error.
+/// \return false
 bool failFor(Reason reason);
-/// Sets the last error by the status of an answer that is no good one. \return false
+/// Sets the last error by the status of an answer that is no good one.
+/// \return false
 bool failForStatus(long status);
 
 /// The last error while something is cleared away.

@@ -10,19 +10,19 @@ namespace {
 
 int codeOf(Reason reason) {
     switch (reason) {
-    case Reason::badArgument:
+    case Reason::BAD_ARGUMENT:
         return EINVAL;
-    case Reason::unknownScheme:
+    case Reason::UNKNOWN_SCHEME:
         return EPROTONOSUPPORT;
-    case Reason::notFound:
+    case Reason::NOT_FOUND:
         return ENOENT;
-    case Reason::forbidden:
+    case Reason::FORBIDDEN:
         return EACCES;
-    case Reason::directory:
+    case Reason::DIRECTORY:
         return EISDIR;
-    case Reason::tooManySteps:
+    case Reason::TOO_MANY_STEPS:
         return ELOOP;
-    case Reason::badAnswer:
+    case Reason::BAD_ANSWER:
         return EPROTO;
     }
     return EIO;

@@ -12,19 +12,19 @@ namespace {
 
 DWORD codeOf(Reason reason) {
     switch (reason) {
-    case Reason::badArgument:
+    case Reason::BAD_ARGUMENT:
         return ERROR_INVALID_PARAMETER;
-    case Reason::unknownScheme:
+    case Reason::UNKNOWN_SCHEME:
         return ERROR_WINHTTP_UNRECOGNIZED_SCHEME;
-    case Reason::notFound:
+    case Reason::NOT_FOUND:
         return ERROR_FILE_NOT_FOUND;
-    case Reason::forbidden:
+    case Reason::FORBIDDEN:
         return ERROR_ACCESS_DENIED;
-    case Reason::directory:
+    case Reason::DIRECTORY:
         return ERROR_ACCESS_DENIED;
-    case Reason::tooManySteps:
+    case Reason::TOO_MANY_STEPS:
         return ERROR_WINHTTP_REDIRECT_FAILED;
-    case Reason::badAnswer:
+    case Reason::BAD_ANSWER:
         return ERROR_WINHTTP_INVALID_SERVER_RESPONSE;
     }
     return ERROR_GEN_FAILURE;

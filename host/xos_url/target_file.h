@@ -22,7 +22,8 @@ public:
     bool open();
     /// \return false: not everything could be written
     bool write(void const* data, std::size_t size);
-    /// Puts what was written in the place of the target. \return false: it could not all be stored, or not be put there
+    /// Puts what was written in the place of the target.
+    /// \return false: it could not all be stored, or not be put there
     bool commit();
 
 private:

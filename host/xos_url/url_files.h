@@ -17,10 +17,12 @@ std::string systemPath(std::string path);
 /// The system's path of a `file:` URL; empty when it cannot be reached from here.
 std::string pathOfFileUrl(FileUrl const& url);
 
-/// Makes a file that was not there. \return null when there is one, or it cannot be made
+/// Makes a file that was not there.
+/// \return null when there is one, or it cannot be made
 std::FILE* createNewFile(std::string const& path);
 
-/// Opens a regular file for reading. \return null for anything else
+/// Opens a regular file for reading.
+/// \return null for anything else
 std::FILE* openRegularFile(std::string const& path);
 
 /// Puts a file in the place of another in one step. A directory is not replaced.

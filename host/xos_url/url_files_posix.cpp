@@ -15,8 +15,8 @@ namespace {
 bool isRegular(int file) {
     struct stat status {};
     if (fstat(file, &status) != 0) return false;
-    if (S_ISDIR(status.st_mode)) return failFor(Reason::directory);
-    return S_ISREG(status.st_mode) || failFor(Reason::badArgument);
+    if (S_ISDIR(status.st_mode)) return failFor(Reason::DIRECTORY);
+    return S_ISREG(status.st_mode) || failFor(Reason::BAD_ARGUMENT);
 }
 
 } // namespace

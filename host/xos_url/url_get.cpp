@@ -49,7 +49,7 @@ bool readFile(FileUrl const& url, TargetFile& target) {
 
 bool getFile(char const* url, TargetFile& target) {
     std::optional<FileUrl> const parsed = parseFileUrl(url);
-    if (!parsed.has_value()) return failFor(Reason::badArgument);
+    if (!parsed.has_value()) return failFor(Reason::BAD_ARGUMENT);
     return readFile(*parsed, target) && target.commit();
 }
 
@@ -61,13 +61,13 @@ bool getOverHttp(FetchRequest const& request, TargetFile& target) {
 bool get(char const* url, char const* targetPath, char const* user, char const* password) {
     TargetFile target{systemPath(targetPath)};
     switch (schemeOf(url)) {
-    case Scheme::file:
+    case Scheme::FILE:
         return getFile(url, target);
-    case Scheme::http:
-    case Scheme::https:
+    case Scheme::HTTP:
+    case Scheme::HTTPS:
         return getOverHttp({escapedUrl(url), user, password, CONNECT_SECONDS, STALL_SECONDS}, target);
     default:
-        return failFor(Reason::unknownScheme);
+        return failFor(Reason::UNKNOWN_SCHEME);
     }
 }
 
@@ -83,7 +83,7 @@ extern "C" int xos_URLGet(char const* url, char const* target, char const* first
         return FAILED;
     }
     if (url == nullptr || target == nullptr || *target == '\0') {
-        host::failFor(host::Reason::badArgument);
+        host::failFor(host::Reason::BAD_ARGUMENT);
         return FAILED;
     }
     return host::get(url, target, first, second) ? 0 : FAILED;

@@ -37,9 +37,9 @@ constexpr std::string_view FILE_SCHEME = "file:";
 } // namespace
 
 Scheme schemeOf(std::string_view url) {
-    if (startsWith(url, "http://")) return Scheme::http;
-    if (startsWith(url, "https://")) return Scheme::https;
-    return startsWith(url, FILE_SCHEME) ? Scheme::file : Scheme::other;
+    if (startsWith(url, "http://")) return Scheme::HTTP;
+    if (startsWith(url, "https://")) return Scheme::HTTPS;
+    return startsWith(url, FILE_SCHEME) ? Scheme::FILE : Scheme::OTHER;
 }
 
 std::string escapedUrl(std::string_view url) {

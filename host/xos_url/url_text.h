@@ -10,7 +10,7 @@
 
 namespace host {
 
-enum class Scheme { http, https, file, other };
+enum class Scheme { HTTP, HTTPS, FILE, OTHER };
 
 /// Letters of either case.
 Scheme schemeOf(std::string_view url);

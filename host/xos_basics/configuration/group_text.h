@@ -28,7 +28,8 @@ struct GroupText {
 /// count, nor do a carriage return at the line's end and a byte-order mark at the text's start.
 GroupText parseGroup(std::string_view text);
 
-/// `true`, `yes`, `on`, `1` and `false`, `no`, `off`, `0`, in any case. \return nothing for any other text
+/// `true`, `yes`, `on`, `1` and `false`, `no`, `off`, `0`, in any case.
+/// \return nothing for any other text
 std::optional<bool> switchValue(std::string_view value);
 
 } // namespace host

@@ -86,14 +86,14 @@ cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2,
         return nullptr;
     }
     if (!isName(name)) {
-        host::setLastError(host::Error::badArgument);
+        host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
     }
     auto group = std::make_unique<cfg_Group>();
     group->path = configurationDirectory() + "/" + name + ".cfg";
     std::string text;
     if (!readFile(group->path, text)) {
-        host::setLastError(host::Error::notFound);
+        host::setLastError(host::Error::NOT_FOUND);
         return nullptr;
     }
     group->text = host::parseGroup(text);

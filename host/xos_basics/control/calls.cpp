@@ -1,106 +1,118 @@
-#include "host/xos_basics/control/calls.h"
+// The record of calls as others read it, and calls on behalf of other modules.
 
-#include "host/xos_basics/control/call_text.h"
-#include "host/xos_basics/control/registry.h"
-#include "host/xos_basics/wait/pause.h"
+#include "host/include/xos_host.h"
+#include "host/xos_basics/control/control.h"
 
 #include <algorithm>
-#include <cstring>
+#include <array>
+#include <cinttypes>
+#include <cstdio>
 #include <mutex>
+#include <string>
+#include <string_view>
+#include <thread>
 
 namespace host {
 
 namespace {
 
-struct Reading {
-    std::uint64_t stamp;
-    CallSnapshot call;
-};
+std::uint64_t callsSinceReset(CallRecord const& record) {
+    return record.sequence.load(std::memory_order_acquire) / 2 - record.callsAtReset;
+}
 
-/// Text offsets from a record that is being written are not to be trusted.
-bool textsAreWhole(char const* kinds, CallSnapshot const& call) {
-    for (std::size_t i = 0; kinds[i] != '\0'; ++i) {
-        std::uint64_t const word = call.words[i];
-        if (kinds[i] != 't' || word == NULL_TEXT) continue;
-        if (word >= call.texts.size()) return false;
-        auto const* const begin = reinterpret_cast<char const*>(call.texts.data() + word);
-        if (std::memchr(begin, '\0', (call.texts.size() - word) * sizeof(std::uint64_t)) == nullptr) return false;
+using Words = std::array<std::uint64_t, MAX_ARGUMENTS>;
+
+bool tryCopy(CallRecord const& record, Words& words) {
+    std::uint64_t const before = record.sequence.load(std::memory_order_acquire);
+    for (std::size_t i = 0; i < MAX_ARGUMENTS; ++i) { words[i] = record.words[i].load(std::memory_order_acquire); }
+    return before % 2 == 0 && record.sequence.load(std::memory_order_relaxed) == before;
+}
+
+std::string argumentText(char kind, std::uint64_t word, std::string const& texts) {
+    if (kind == 't') return word == NULL_TEXT ? "null" : '"' + std::string(texts.c_str() + word) + '"';
+    if (kind == 'd') return std::to_string(static_cast<std::int64_t>(word));
+    if (kind == 'u') return std::to_string(word);
+    if (kind == 'p' && word == 0) return "null";
+    char digits[24];
+    std::snprintf(digits, sizeof digits, "0x%" PRIx64, word);
+    return digits;
+}
+
+std::string callText(std::string_view kinds, CallRecord& record) {
+    std::lock_guard const lock{record.textMutex};
+    Words words{};
+    while (!tryCopy(record, words)) { std::this_thread::yield(); }
+    std::string text;
+    for (std::size_t i = 0; i < kinds.size(); ++i) {
+        text += (i == 0 ? "" : ", ") + argumentText(kinds[i], words[i], record.texts);
     }
-    return true;
+    return text;
 }
 
-void copyTexts(CallSlot const& slot, std::vector<std::uint64_t>& texts) {
-    TextBuffer const* const buffer = slot.texts.load(std::memory_order_acquire);
-    std::uint64_t const used = slot.textWords.load(std::memory_order_acquire);
-    texts.clear();
-    for (std::size_t i = 0; buffer != nullptr && i < std::min<std::uint64_t>(used, buffer->words); ++i) {
-        texts.push_back(buffer->data[i].load(std::memory_order_acquire));
+/// A quick function's call by the asking thread itself comes last in the present era.
+CallRecord* lastRecordOf(Function function, ThreadCalls& mine) {
+    CallRecord& own = mine.records[indexOf(function)];
+    if (own.era == registry.era.load(std::memory_order_relaxed)) return &own;
+    ThreadCalls* const last = registry.lastCaller[indexOf(function)].load(std::memory_order_acquire);
+    return last == nullptr ? nullptr : &last->records[indexOf(function)];
+}
+
+/// \param arguments  are words, for a text its address
+void noteCall(Function function, ThreadCalls& mine, std::uint64_t const* arguments, std::size_t count) {
+    std::string_view const kinds = factsOf(function).kinds;
+    CallRecord& record = mine.records[indexOf(function)];
+    beginCall(function, record);
+    for (std::size_t i = 0; i < std::min(count, kinds.size()); ++i) {
+        if (kinds[i] == 't') {
+            record.addText(i, reinterpret_cast<char const*>(arguments[i]));
+        } else {
+            record.addWord(i, arguments[i]);
+        }
     }
-}
-
-/// \return false: another call has been completed meanwhile, and one more may be written where this one stands
-bool tryRead(CallRecord const& record, char const* kinds, Reading& reading) {
-    std::uint64_t const number = record.completed.load(std::memory_order_acquire);
-    CallSlot const& slot = record.slots[number % 2];
-    reading.stamp = slot.stamp.load(std::memory_order_acquire);
-    for (std::size_t i = 0; i < MAX_ARGUMENTS; ++i) {
-        reading.call.words[i] = slot.words[i].load(std::memory_order_acquire);
-    }
-    if (std::strchr(kinds, 't') != nullptr) copyTexts(slot, reading.call.texts);
-    return record.completed.load(std::memory_order_relaxed) == number && textsAreWhole(kinds, reading.call);
-}
-
-Reading readRecord(CallRecord const& record, char const* kinds) {
-    Reading reading{};
-    while (!tryRead(record, kinds, reading)) { pauseBriefly(); }
-    return reading;
-}
-
-std::uint64_t callsSinceReset(ThreadCalls const& calls, std::size_t index) {
-    return calls.records[index].completed.load(std::memory_order_acquire) - calls.completedAtReset[index];
+    endCall(function, record, mine);
 }
 
 } // namespace
 
-std::uint64_t callsOf(Function function) {
-    std::size_t const index = indexOf(function);
-    std::lock_guard const lock{registryMutex};
+} // namespace host
+
+uint64_t xos_HostCalls(char const* name) {
+    host::Function const function = host::functionNamed(name);
+    if (function == host::Function::NONE) return 0;
+    std::lock_guard const lock{host::registry.mutex};
     std::uint64_t sum = 0;
-    for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) {
-        sum += callsSinceReset(*calls, index);
+    for (host::ThreadCalls const* calls = host::registry.first; calls != nullptr; calls = calls->next) {
+        sum += host::callsSinceReset(calls->records[host::indexOf(function)]);
     }
     return sum;
 }
 
-void resetCalls() {
-    std::lock_guard const lock{registryMutex};
-    for (ThreadCalls* calls = registryHead; calls != nullptr; calls = calls->next) {
-        for (std::size_t i = 0; i < FUNCTION_COUNT; ++i) {
-            calls->completedAtReset[i] = calls->records[i].completed.load(std::memory_order_acquire);
-        }
+void xos_HostCallsReset(void) {
+    std::lock_guard const lock{host::registry.mutex};
+    for (host::ThreadCalls* calls = host::registry.first; calls != nullptr; calls = calls->next) {
+        for (host::CallRecord& record : calls->records) { record.callsAtReset += host::callsSinceReset(record); }
     }
+    for (auto& last : host::registry.lastCaller) { last.store(nullptr, std::memory_order_relaxed); }
+    // Last, as a quick call in the old era would not be noted as the last one.
+    host::beginEra();
 }
 
-bool lastCallOf(Function function, std::string& text) {
-    std::size_t const index = indexOf(function);
-    char const* const kinds = factsOf(function).kinds;
-    gatherTime();
-    std::lock_guard const lock{registryMutex};
-    ThreadCalls const* const sole = soleCaller[index].load(std::memory_order_relaxed);
-    bool found = false;
-    Reading last{};
-    for (ThreadCalls const* calls = registryHead; calls != nullptr; calls = calls->next) {
-        // Threads without memory for records of their own may write the spare ones together.
-        if (calls == &spareThreadCalls || callsSinceReset(*calls, index) == 0) continue;
-        Reading reading = readRecord(calls->records[index], kinds);
-        // Without stamps it was the sole caller's.
-        if (!found || reading.stamp > last.stamp || (reading.stamp == last.stamp && calls == sole)) {
-            last = std::move(reading);
-            found = true;
-        }
-    }
-    if (found) text = callText(kinds, last.call);
-    return found;
+char const* xos_HostLastCall(char const* name) {
+    host::Function const function = host::functionNamed(name);
+    host::ThreadCalls* const mine = host::threadCalls();
+    if (function == host::Function::NONE || mine == nullptr) return nullptr;
+    std::lock_guard const lock{host::registry.mutex};
+    host::CallRecord* const last = host::lastRecordOf(function, *mine);
+    host::beginEra();
+    if (last == nullptr) return nullptr;
+    mine->lastCallText = host::callText(host::factsOf(function).kinds, *last);
+    return mine->lastCallText.c_str();
 }
 
-} // namespace host
+int xos_HostEnter(char const* name, uint64_t const* arguments, uint32_t count) {
+    host::Function const function = host::functionNamed(name);
+    if (function == host::Function::NONE) return 0;
+    host::ThreadCalls* const mine = host::threadCalls();
+    if (mine != nullptr) host::noteCall(function, *mine, arguments, count);
+    return host::failsOnDemand(function) ? 1 : 0;
+}

@@ -1,91 +1,138 @@
 /// \file
-/// What every platform function does first: count the call, remember its arguments, and ask whether it is to fail.
+/// What every platform function does first: count the call, remember its arguments, and ask whether it must fail.
 ///
-///     if (failsNow(Function::xos_FileMove, dst, src, overwrite)) {
-///         return FAILED;
-///     }
+///     if (failsNow(Function::xos_FileMove, dst, src, overwrite)) return FAILED;
 ///
 /// Always on, correct from any thread, about a nanosecond. The arguments are given in the order and number of the
 /// function's kinds in functions.h. A `char const*` is a text, which is copied; any other pointer is an address.
+///
+/// A thread stores its calls in its own records. The sequence number of a record is odd while its words are written; a
+/// reader that finds it odd or changed starts again. Every store of a word releases and every load of it acquires, so a
+/// reader that sees anything of a later call also sees its sequence number. Only functions with texts lock the record.
+///
+/// Which thread called a function last is a word that all threads share, written only when another thread calls. For
+/// quick functions even that would cost too much: each thread writes it once in each era. An era ends when a thread or
+/// task begins or ends, when a last call is queried and when the calls are reset.
 
 #ifndef HOST_XOS_BASICS_CONTROL_CONTROL_H
 #define HOST_XOS_BASICS_CONTROL_CONTROL_H
 
-#include "host/xos_basics/control/call_order.h"
-#include "host/xos_basics/control/call_record.h"
+#include "host/compiler.h"
 #include "host/xos_basics/control/functions.h"
+#include "host/xos_basics/this_thread.h"
+#include "host/xos_basics/wait/quick_mutex.h"
 
+#include <array>
 #include <atomic>
 #include <cstddef>
 #include <cstdint>
+#include <string>
 #include <type_traits>
 
 namespace host {
 
-/// The result of an `int` function that fails without a more telling value.
-constexpr int FAILED = -1;
+constexpr std::uint64_t NULL_TEXT = ~std::uint64_t{0};
 
-/// How many functions are to fail now or later.
-extern constinit std::atomic<std::uint32_t> armedFaults;
+struct CallRecord {
+    void addWord(std::size_t argument, std::uint64_t word) { words[argument].store(word, std::memory_order_release); }
+    /// Copies the text. Without memory for it, it is noted as null.
+    void addText(std::size_t argument, char const* text);
 
-/// Whether this call of the function is to fail; the last error is then set.
-bool takesInjectedFailure(Function function);
-
-/// Notes one call in the calling thread's record, from construction to destruction.
-class CallNote {
-public:
-    /// \param isAlike  says that all calls of the function have the same record, so the last one need not be known
-    [[gnu::always_inline]] explicit CallNote(Function function, bool isAlike = false)
-        : CallNote(function, isAlike, threadCalls()) {}
-    CallNote(CallNote const&) = delete;
-    CallNote& operator=(CallNote const&) = delete;
-    ~CallNote() { record_.completed.store(number_, std::memory_order_release); }
-
-    void addWord(std::uint64_t word) { slot_.words[arguments_++].store(word, std::memory_order_release); }
-
-    void addText(char const* text) { addWord(keepText(slot_, text, textWords_)); }
-
-    template <class Argument>
-    void add(Argument const& argument) {
-        if constexpr (std::is_same_v<Argument, char const*>) {
-            addText(argument);
-        } else if constexpr (std::is_pointer_v<Argument>) {
-            addWord(reinterpret_cast<std::uintptr_t>(argument));
-        } else {
-            static_assert(std::is_integral_v<Argument>);
-            // Signed numbers keep their sign in 64 bits.
-            addWord(static_cast<std::uint64_t>(static_cast<std::int64_t>(argument)));
-        }
-    }
-
-private:
-    [[gnu::always_inline]] CallNote(Function function, bool isAlike, ThreadCalls& mine)
-        : record_(mine.records[indexOf(function)]),
-          number_(record_.completed.load(std::memory_order_relaxed) + 1),
-          slot_(record_.slots[number_ % 2]) {
-        slot_.stamp.store(isAlike ? 0 : stampOfCall(function, mine), std::memory_order_release);
-    }
-
-    CallRecord& record_;
-    std::uint64_t const number_;
-    CallSlot& slot_;
-    std::size_t arguments_{0};
-    std::size_t textWords_{0};
+    /// Twice the number of calls, plus one while a call is being written.
+    std::atomic<std::uint64_t> sequence;
+    /// The arguments; for a text its place in `texts`, or `NULL_TEXT`.
+    std::array<std::atomic<std::uint64_t>, MAX_ARGUMENTS> words;
+    /// The era of a quick function's last call. Its thread's alone.
+    std::uint64_t era;
+    /// How many calls there were at the last reset. Guarded by the registry's mutex.
+    std::uint64_t callsAtReset;
+    QuickMutex textMutex;
+    /// Each text with its zero.
+    std::string texts;
 };
 
-inline bool failsAfterNote(Function function) {
-    return armedFaults.load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
+/// Outlives its thread: the next new thread takes it over and counts on.
+struct ThreadCalls {
+    std::array<CallRecord, FUNCTION_COUNT> records;
+    /// What `xos_HostLastCall` returned to this thread.
+    std::string lastCallText;
+    /// These two are guarded by the registry's mutex.
+    ThreadCalls* next;
+    bool inUse;
+};
+
+struct CallRegistry {
+    QuickMutex mutex;
+    /// Of all threads, living and dead.
+    ThreadCalls* first{nullptr};
+    std::array<std::atomic<ThreadCalls*>, FUNCTION_COUNT> lastCaller{};
+    /// Read at every quick call and rarely written, so it has a cache line of its own.
+    alignas(64) std::atomic<std::uint64_t> era{1};
+};
+
+extern constinit CallRegistry registry;
+
+inline void beginEra() { registry.era.fetch_add(1, std::memory_order_relaxed); }
+
+/// \return null without memory: such a thread's calls are not recorded
+ThreadCalls* adoptThreadCalls();
+
+inline ThreadCalls* threadCalls() { return thisThread.calls != nullptr ? thisThread.calls : adoptThreadCalls(); }
+
+/// The failures asked for: the calls to skip in the upper half, the failures in the lower; 0: none.
+extern constinit std::array<std::atomic<std::uint64_t>, FUNCTION_COUNT> faults;
+
+/// Counts one call down.
+/// \return whether it fails; the last error is then set
+bool takesInjectedFailure(Function function);
+
+inline bool failsOnDemand(Function function) {
+    return faults[indexOf(function)].load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
 }
 
-/// Inlined everywhere: with the function known, half of it folds away.
-template <class... Arguments>
-[[gnu::always_inline]] inline bool failsNow(Function function, Arguments const&... arguments) {
-    static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
-    {
-        CallNote note{function, sizeof...(Arguments) == 0};
-        (note.add(arguments), ...);
+HOST_INLINE void beginCall(Function function, CallRecord& record) {
+    if (factsOf(function).hasTexts) {
+        record.textMutex.lock();
+        record.texts.clear();
     }
-    return failsAfterNote(function);
+    record.sequence.store(record.sequence.load(std::memory_order_relaxed) + 1, std::memory_order_relaxed);
+}
+
+template <class Argument>
+HOST_INLINE void noteArgument(CallRecord& record, std::size_t index, Argument const& argument) {
+    if constexpr (std::is_same_v<Argument, char const*>) {
+        record.addText(index, argument);
+    } else if constexpr (std::is_pointer_v<Argument>) {
+        record.addWord(index, reinterpret_cast<std::uintptr_t>(argument));
+    } else {
+        static_assert(std::is_integral_v<Argument>);
+        // Signed numbers keep their sign in 64 bits.
+        record.addWord(index, static_cast<std::uint64_t>(static_cast<std::int64_t>(argument)));
+    }
+}
+
+HOST_INLINE void endCall(Function function, CallRecord& record, ThreadCalls& mine) {
+    record.sequence.store(record.sequence.load(std::memory_order_relaxed) + 1, std::memory_order_release);
+    if (factsOf(function).hasTexts) record.textMutex.unlock();
+    std::atomic<ThreadCalls*>& last = registry.lastCaller[indexOf(function)];
+    bool const isQuick = (factsOf(function).traits & IS_QUICK) != 0;
+    std::uint64_t const era = isQuick ? registry.era.load(std::memory_order_relaxed) : 0;
+    if (isQuick ? record.era == era : last.load(std::memory_order_relaxed) == &mine) return;
+    record.era = era;
+    last.store(&mine, std::memory_order_release);
+}
+
+template <class... Arguments>
+HOST_INLINE bool failsNow(Function function, Arguments const&... arguments) {
+    static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
+    if (ThreadCalls* const mine = threadCalls()) {
+        CallRecord& record = mine->records[indexOf(function)];
+        beginCall(function, record);
+        std::size_t index = 0;
+        (noteArgument(record, index++, arguments), ...);
+        endCall(function, record, *mine);
+    }
+    return failsOnDemand(function);
 }
 
 } // namespace host

@@ -1,64 +1,79 @@
-#include "host/xos_basics/control/faults.h"
+// Failures on demand: which function fails after how many successful calls, and how often.
 
+#include "host/include/xos_host.h"
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
-#include "host/xos_basics/wait/quick_mutex.h"
 
-#include <array>
-#include <mutex>
+#include <charconv>
+#include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <string_view>
 
 namespace host {
 
-constinit std::atomic<std::uint32_t> armedFaults{0};
+constinit std::array<std::atomic<std::uint64_t>, FUNCTION_COUNT> faults{};
 
 namespace {
 
-struct Rule {
-    std::uint32_t skip;
-    std::uint32_t times;
-};
+constexpr int SKIP_SHIFT = 32;
+constexpr std::uint64_t ONE_SKIPPED = std::uint64_t{1} << SKIP_SHIFT;
 
-constinit QuickMutex mutex;
-constinit std::array<Rule, FUNCTION_COUNT> rules{};
-
-void setRule(Rule& rule, Rule wanted) {
-    bool const was = rule.times != 0;
-    bool const is = wanted.times != 0;
-    rule = wanted;
-    if (was != is) armedFaults.fetch_add(is ? 1 : std::uint32_t(-1), std::memory_order_relaxed);
+/// Takes the number behind the last ":" off the end of `text`.
+bool takeNumber(std::string_view& text, std::uint32_t& number) {
+    std::size_t const colon = text.rfind(':');
+    if (colon == std::string_view::npos) return false;
+    char const* const end = text.data() + text.size();
+    auto const parsed = std::from_chars(text.data() + colon + 1, end, number);
+    text = text.substr(0, colon);
+    return parsed.ec == std::errc{} && parsed.ptr == end;
 }
 
-bool countsDown(Function function) {
-    std::lock_guard const lock{mutex};
-    Rule& rule = rules[indexOf(function)];
-    if (rule.times == 0) return false;
-    if (rule.skip != 0) {
-        --rule.skip;
-        return false;
+bool injectEntry(std::string_view entry) {
+    std::uint32_t skip = 0;
+    std::uint32_t times = 0;
+    // From the end, as two of the names contain colons.
+    bool const hasNumbers = takeNumber(entry, times) && takeNumber(entry, skip);
+    return hasNumbers && xos_HostFail(std::string(entry).c_str(), skip, times) == 0;
+}
+
+bool injectAll(std::string_view list) {
+    while (!list.empty()) {
+        std::string const entry{list.substr(0, list.find(','))};
+        list.remove_prefix(std::min(list.size(), entry.size() + 1));
+        if (injectEntry(entry)) continue;
+        std::fprintf(stderr, "XOS_FAULTS: \"%s\" is not NAME:SKIP:TIMES of a function that can fail\n", entry.c_str());
     }
-    setRule(rule, {0, rule.times - 1});
     return true;
 }
+
+char const* const listAtLoad = std::getenv("XOS_FAULTS");
+[[maybe_unused]] bool const isReadAtLoad = listAtLoad != nullptr && injectAll(listAtLoad);
 
 } // namespace
 
 bool takesInjectedFailure(Function function) {
-    bool const fails = countsDown(function);
-    if (fails) setLastError(Error::injected);
-    return fails;
-}
-
-bool injectFailure(char const* name, std::uint32_t skip, std::uint32_t times) {
-    Function const function = functionNamed(name);
-    if (function == Function::none || !factsOf(function).canFail) return false;
-    std::lock_guard const lock{mutex};
-    setRule(rules[indexOf(function)], {skip, times});
-    return true;
-}
-
-void clearFailures() {
-    std::lock_guard const lock{mutex};
-    for (Rule& rule : rules) { setRule(rule, {0, 0}); }
+    std::atomic<std::uint64_t>& fault = faults[indexOf(function)];
+    for (std::uint64_t seen = fault.load(std::memory_order_relaxed); seen != 0;) {
+        bool const fails = seen < ONE_SKIPPED;
+        std::uint64_t const next = seen - (fails ? 1 : ONE_SKIPPED);
+        if (!fault.compare_exchange_weak(seen, next, std::memory_order_relaxed)) continue;
+        if (fails) setLastError(Error::INJECTED);
+        return fails;
+    }
+    return false;
 }
 
 } // namespace host
+
+int xos_HostFail(char const* name, uint32_t skip, uint32_t times) {
+    host::Function const function = host::functionNamed(name);
+    if (function == host::Function::NONE || (host::factsOf(function).traits & host::CAN_FAIL) == 0) return -1;
+    std::uint64_t const fault = times == 0 ? 0 : std::uint64_t{skip} << host::SKIP_SHIFT | times;
+    host::faults[host::indexOf(function)].store(fault, std::memory_order_relaxed);
+    return 0;
+}
+
+void xos_HostFailClear(void) {
+    for (std::atomic<std::uint64_t>& fault : host::faults) { fault.store(0, std::memory_order_relaxed); }
+}

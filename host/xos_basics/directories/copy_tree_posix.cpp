@@ -2,10 +2,10 @@
 
 #include "host/xos_basics/directories/copy_tree_posix.h"
 
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/directories/directory_chain_posix.h"
 #include "host/xos_basics/directories/dirents_posix.h"
 #include "host/xos_basics/directories/name_queue.h"
+#include "host/xos_basics/result.h"
 
 #include <climits>
 #include <sys/sysmacros.h>
@@ -16,7 +16,8 @@ namespace host {
 
 namespace {
 
-/// Whether a new entry may take this name. \param source  what it is made of
+/// Whether a new entry may take this name.
+/// \param source  what it is made of
 bool mayTakeName(int at, char const* name, struct stat const& source, bool overwrite) {
     struct stat present {};
     if (::fstatat(at, name, &present, AT_SYMLINK_NOFOLLOW) != 0) return errno == ENOENT;

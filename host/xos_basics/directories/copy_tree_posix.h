@@ -5,6 +5,7 @@
 #define HOST_XOS_BASICS_DIRECTORIES_COPY_TREE_POSIX_H
 
 #include "host/xos_basics/files/entry_posix.h"
+#include "host/xos_basics/files/file_copy_posix.h"
 
 namespace host {
 

@@ -7,7 +7,7 @@
 #ifndef HOST_XOS_BASICS_DIRECTORIES_DIRECTORY_CHAIN_POSIX_H
 #define HOST_XOS_BASICS_DIRECTORIES_DIRECTORY_CHAIN_POSIX_H
 
-#include "host/xos_basics/files/descriptor.h"
+#include "host/xos_basics/files/descriptor_posix.h"
 
 #include <cstddef>
 #include <sys/types.h>
@@ -17,10 +17,12 @@ namespace host {
 
 class DirectoryChain {
 public:
-    /// Adds a directory that lies in the lowest one. \return false, with errno: the chain is as it was
+    /// Adds a directory that lies in the lowest one.
+    /// \return false, with errno: the chain is as it was
     bool push(Descriptor directory);
-    /// Makes sure that the directory above the lowest is open. \return false, with errno ESTALE or another: it cannot
-    /// be found again
+    /// Makes sure that the directory above the lowest is open.
+    /// \return false, with errno ESTALE or another: it cannot
+    ///     be found again
     bool findAbove();
     /// Leaves the lowest directory, once the one above has been found.
     void pop() { levels_.pop_back(); }

@@ -3,9 +3,9 @@
 #include "basis/ground/wildcard.h"
 #include "basis/platform/xos_basics.h"
 #include "host/xos_basics/control/control.h"
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/directories/raw_listing.h"
 #include "host/xos_basics/directories/tree.h"
+#include "host/xos_basics/result.h"
 
 #include <cstring>
 #include <string>
@@ -40,7 +40,7 @@ enum Kind { ALL, DIRECTORIES, FILES };
 
 /// Null, with the last error set, for the handle 0.
 Listing* listingOf(xos_Dir handle) {
-    if (handle == 0) host::setLastError(host::Error::badHandle);
+    if (handle == 0) host::setLastError(host::Error::BAD_HANDLE);
     return reinterpret_cast<Listing*>(static_cast<std::uintptr_t>(handle));
 }
 
@@ -87,7 +87,7 @@ char const* xos_DirNextEx(xos_Dir handle, int kind, int reserved, uint32_t flags
     Listing* const listing = listingOf(handle);
     if (listing == nullptr) return nullptr;
     if (kind < ALL || kind > FILES) {
-        host::setLastError(host::Error::badArgument);
+        host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
     }
     while (char const* const name = listing->entries->next()) {

@@ -18,7 +18,8 @@ namespace host {
 /// Reads the entries of one directory after the other through one buffer; each from the start, to its end.
 class Dirents {
 public:
-    /// Goes on to the next entry but "." and "..". \return false at the end, and when reading failed
+    /// Goes on to the next entry but "." and "..".
+    /// \return false at the end, and when reading failed
     bool next(int directory) {
         for (;;) {
             if (next_ == end_ && !fill(directory)) return false;

@@ -18,7 +18,8 @@ public:
     RawListing& operator=(RawListing const&) = delete;
     virtual ~RawListing() = default;
 
-    /// Goes on to the next entry but "." and "..". \return its name, valid until the next call; null: there is none
+    /// Goes on to the next entry but "." and "..".
+    /// \return its name, valid until the next call; null: there is none
     virtual char const* next() = 0;
     /// Whether the entry is a directory; a link is none, wherever it leads.
     virtual bool isDirectory() = 0;

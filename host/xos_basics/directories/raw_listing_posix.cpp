@@ -3,7 +3,7 @@
 #include "host/xos_basics/directories/raw_listing.h"
 
 #include "host/xos_basics/directories/dirents_posix.h"
-#include "host/xos_basics/files/descriptor.h"
+#include "host/xos_basics/files/descriptor_posix.h"
 
 namespace host {
 

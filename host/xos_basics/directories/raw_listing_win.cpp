@@ -2,7 +2,8 @@
 
 #include "host/xos_basics/directories/raw_listing.h"
 
-#include "host/xos_basics/files/windows_path.h"
+#include "host/xos_basics/files/path_win.h"
+#include "host/xos_basics/files/search_win.h"
 
 namespace host {
 

@@ -2,10 +2,10 @@
 
 #include "host/xos_basics/directories/remove_tree_posix.h"
 
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/directories/directory_chain_posix.h"
 #include "host/xos_basics/directories/dirents_posix.h"
 #include "host/xos_basics/directories/name_queue.h"
+#include "host/xos_basics/result.h"
 
 #include <memory>
 #include <unistd.h>
@@ -30,7 +30,8 @@ private:
     void enter(char const* name);
     /// Removes what no descent is needed for, and notes the directories.
     void sweep();
-    /// Removes the directory that has just been swept, from the one above. \return false: that one cannot be found
+    /// Removes the directory that has just been swept, from the one above.
+    /// \return false: that one cannot be found
     bool leave();
     bool removeUnentered(char const* name);
     void fail();

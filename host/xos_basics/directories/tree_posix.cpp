@@ -23,7 +23,8 @@ bool findEntry(char const* path, Place& place, struct stat& status) {
     return isDots(place.name.c_str()) ? failWith(EINVAL) : statusAt(place, status);
 }
 
-/// Whether a directory is `other` or lies below it. \return -1, with errno, when that cannot be found out
+/// Whether a directory is `other` or lies below it.
+/// \return -1, with errno, when that cannot be found out
 int isWithin(int directory, struct stat const& other) {
     Descriptor here{::openat(directory, ".", O_PATH | O_DIRECTORY | O_CLOEXEC)};
     struct stat status {};

@@ -2,8 +2,10 @@
 
 #include "host/xos_basics/directories/tree.h"
 
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/files/entry_win.h"
+#include "host/xos_basics/files/file_copy_win.h"
+#include "host/xos_basics/files/search_win.h"
+#include "host/xos_basics/result.h"
 
 #include <cstring>
 #include <vector>
@@ -31,7 +33,8 @@ public:
     std::wstring const& path() const { return path_; }
     void add(wchar_t const* name) { levels_.back().waiting.emplace_back(name); }
 
-    /// Goes down to the next directory that waits here. \return false: none is left
+    /// Goes down to the next directory that waits here.
+    /// \return false: none is left
     bool enter() {
         std::vector<std::wstring>& waiting = levels_.back().waiting;
         if (waiting.empty()) return false;
@@ -41,7 +44,8 @@ public:
         return true;
     }
 
-    /// Goes up. \return false: this was the top
+    /// Goes up.
+    /// \return false: this was the top
     bool leave() {
         levels_.pop_back();
         if (levels_.empty()) return false;

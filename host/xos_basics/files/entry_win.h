@@ -4,7 +4,7 @@
 #ifndef HOST_XOS_BASICS_FILES_ENTRY_WIN_H
 #define HOST_XOS_BASICS_FILES_ENTRY_WIN_H
 
-#include "host/xos_basics/files/windows_path.h"
+#include "host/xos_basics/files/path_win.h"
 
 namespace host {
 
@@ -23,7 +23,8 @@ struct EntryFacts {
 
 bool factsOf(std::wstring const& path, EntryFacts& facts);
 
-/// The facts of an open entry. \return false when the system does not give them
+/// The facts of an open entry.
+/// \return false when the system does not give them
 bool factsOf(HANDLE entry, EntryFacts& facts);
 
 /// Whether the last error says that there is no such entry.
@@ -38,18 +39,9 @@ bool removeFileEntry(std::wstring const& path);
 /// Removes an empty directory, write-protected or not.
 bool removeEmptyDirectory(std::wstring const& path);
 
-/// Renames within one volume. \param overwrite  also in place of a file, write-protected or not
+/// Renames within one volume.
+/// \param overwrite  also in place of a file, write-protected or not
 bool renameEntry(std::wstring const& from, std::wstring const& to, bool overwrite);
-
-/// Makes `to`, which nothing may bear yet, a complete copy of a file or of a link to one. On failure there is no `to`.
-bool copyToNewFile(std::wstring const& from, std::wstring const& to);
-
-/// Copies through a temporary name.
-/// \param overwrite  allows a file to be replaced
-bool copyFileEntry(std::wstring const& from, std::wstring const& to, bool overwrite);
-
-/// Gives a directory the modification time and the attributes of another.
-void keepDirectoryFacts(std::wstring const& directory, WIN32_FILE_ATTRIBUTE_DATA const& source);
 
 } // namespace host
 

@@ -2,9 +2,9 @@
 
 #include "basis/platform/xos_basics.h"
 #include "host/xos_basics/control/control.h"
-#include "host/xos_basics/control/result.h"
 #include "host/xos_basics/files/open_file.h"
 #include "host/xos_basics/files/whole_file.h"
+#include "host/xos_basics/result.h"
 
 using host::FAILED;
 using host::failsNow;
@@ -17,7 +17,7 @@ namespace {
 
 /// Null, with the last error set, for the handle 0.
 OpenFile* fileOf(xos_File handle) {
-    if (handle == 0) host::setLastError(host::Error::badHandle);
+    if (handle == 0) host::setLastError(host::Error::BAD_HANDLE);
     return reinterpret_cast<OpenFile*>(static_cast<std::uintptr_t>(handle));
 }
 
@@ -35,7 +35,7 @@ int xos_FileCloseEx(xos_File handle, int reserved) {
     bool const fails = failsNow(Function::xos_FileCloseEx, handle, reserved);
     std::unique_ptr<OpenFile> const file{fileOf(handle)};
     bool const closed = file != nullptr && file->close();
-    if (fails) host::setLastError(host::Error::injected);
+    if (fails) host::setLastError(host::Error::INJECTED);
     return closed && !fails ? 0 : FAILED;
 }
 

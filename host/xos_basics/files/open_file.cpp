@@ -33,7 +33,7 @@ bool OpenFile::open(char const* path, std::uint32_t flags) {
     mode.truncate = (flags & TRUNCATE) != 0;
     // Nothing is emptied or made by a handle that cannot write.
     if (!mode.write && (!mode.read || mode.truncate || mode.create)) {
-        setLastError(Error::badArgument);
+        setLastError(Error::BAD_ARGUMENT);
         return false;
     }
     text_ = TEXT_LINES_END_IN_CR_LF && (flags & TEXT) != 0;
@@ -44,7 +44,7 @@ bool OpenFile::fill() {
     if (buffer_ == nullptr) {
         buffer_.reset(new (std::nothrow) char[BUFFER_SIZE]);
         if (buffer_ == nullptr) {
-            setLastError(Error::noMemory);
+            setLastError(Error::NO_MEMORY);
             return false;
         }
     }
@@ -107,7 +107,7 @@ bool OpenFile::seek(std::int64_t offset, int origin) {
     bool const relative = origin == 1;
     auto const ahead = static_cast<std::int64_t>(unread());
     if (origin < 0 || origin > 2 || (relative && offset < std::numeric_limits<std::int64_t>::min() + ahead)) {
-        setLastError(Error::badArgument);
+        setLastError(Error::BAD_ARGUMENT);
         return false;
     }
     if (file_.seek(relative ? offset - ahead : offset, origin) < 0) return false;

@@ -21,7 +21,8 @@ public:
 
     std::size_t read(char* to, std::size_t size);
     std::size_t write(char const* from, std::size_t size);
-    /// Reads one line, its end included, into `size` bytes. \return false: nothing was left
+    /// Reads one line, its end included, into `size` bytes.
+    /// \return false: nothing was left
     bool gets(char* to, std::size_t size);
     bool flush() { return file_.flush(); }
     bool seek(std::int64_t offset, int origin);
@@ -30,7 +31,8 @@ public:
 
 private:
     std::size_t unread() const { return end_ - next_; }
-    /// Reads ahead when nothing is unread. \return false at the end of the file, or on failure
+    /// Reads ahead when nothing is unread.
+    /// \return false at the end of the file, or on failure
     bool fill();
     std::size_t take(char* to, std::size_t size);
     /// Puts the system's position back to the caller's.

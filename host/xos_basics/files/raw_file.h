@@ -33,7 +33,8 @@ public:
 
     /// \return the bytes read, fewer only at the end of the file or when reading failed
     std::size_t read(char* to, std::size_t size);
-    /// One transfer: what is there, at least one byte. \return 0 at the end of the file; -1: failed
+    /// One transfer: what is there, at least one byte.
+    /// \return 0 at the end of the file; -1: failed
     std::ptrdiff_t readSome(char* to, std::size_t size);
     /// \return the bytes written, fewer only when writing failed
     std::size_t write(char const* from, std::size_t size);

@@ -2,8 +2,8 @@
 
 #include "host/xos_basics/files/raw_file.h"
 
-#include "host/xos_basics/files/descriptor.h"
-#include "host/xos_basics/files/posix_path.h"
+#include "host/xos_basics/files/descriptor_posix.h"
+#include "host/xos_basics/files/path_posix.h"
 
 #include <algorithm>
 #include <fcntl.h>

@@ -2,7 +2,7 @@
 
 #include "host/xos_basics/files/raw_file.h"
 
-#include "host/xos_basics/files/windows_path.h"
+#include "host/xos_basics/files/path_win.h"
 
 #include <algorithm>
 

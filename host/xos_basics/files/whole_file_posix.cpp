@@ -3,6 +3,7 @@
 #include "host/xos_basics/files/whole_file.h"
 
 #include "host/xos_basics/files/entry_posix.h"
+#include "host/xos_basics/files/file_copy_posix.h"
 
 #include <algorithm>
 #include <cstdio>

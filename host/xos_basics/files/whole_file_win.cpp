@@ -3,6 +3,7 @@
 #include "host/xos_basics/files/whole_file.h"
 
 #include "host/xos_basics/files/entry_win.h"
+#include "host/xos_basics/files/file_copy_win.h"
 
 #include <algorithm>
 #include <iterator>

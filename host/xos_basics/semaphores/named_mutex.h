@@ -13,7 +13,8 @@ class NamedMutex;
 /// \return null on failure, with the system's last error
 NamedMutex* openNamed(int id);
 
-/// Recursive. \return 0 for success, else the last error is set
+/// Recursive.
+/// \return 0 for success, else the last error is set
 int takeNamed(NamedMutex& mutex);
 int giveNamed(NamedMutex& mutex);
 

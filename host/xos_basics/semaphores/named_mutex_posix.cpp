@@ -115,7 +115,7 @@ NamedMutex* openNamed(int id) {
     auto* const mutex = new (std::nothrow) NamedMutex(file);
     if (mutex == nullptr) {
         close(file);
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
     }
     return mutex;
 }

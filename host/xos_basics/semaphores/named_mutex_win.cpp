@@ -46,7 +46,7 @@ NamedMutex* openNamed(int id) {
     auto* const mutex = new (std::nothrow) NamedMutex(handle);
     if (mutex == nullptr) {
         CloseHandle(handle);
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
     }
     return mutex;
 }

@@ -34,7 +34,7 @@ std::uint32_t indexById(int id) {
 bool addEntry(int id) {
     NamedMutex* const named = openNamed(id);
     if (named == nullptr) return false;
-    Semaphore* const semaphore = makeSemaphore(SemaphoreKind::named, 0);
+    Semaphore* const semaphore = makeSemaphore(SemaphoreKind::NAMED, 0);
     if (semaphore == nullptr) return false;
     semaphore->named = named;
     entries().push_back({id, semaphore->handle.load()});

@@ -19,7 +19,7 @@ namespace host {
 
 class NamedMutex;
 
-enum class SemaphoreKind : std::uint32_t { mutex, binary, named };
+enum class SemaphoreKind : std::uint32_t { MUTEX, BINARY, NAMED };
 
 /// As long as a cache line, so that neighbours do not slow each other down.
 struct alignas(64) Semaphore {
@@ -32,8 +32,6 @@ struct alignas(64) Semaphore {
     std::atomic<std::uint64_t> owner;
     /// How often the owner has taken it. The owner's alone.
     std::uint64_t depth;
-    /// The last giver's time; see call_order.h.
-    std::atomic<std::uint64_t> time;
     NamedMutex* named;
     Semaphore* nextFree;
 };
@@ -50,7 +48,8 @@ inline Semaphore* semaphoreOf(xos_Sem handle) {
     return isCurrent ? semaphore : nullptr;
 }
 
-/// A block of the pool with a new handle. \param state  of a binary semaphore or mutex: WORD_FREE or WORD_HELD
+/// A block of the pool with a new handle.
+/// \param state  of a binary semaphore or mutex: WORD_FREE or WORD_HELD
 /// \return null without memory; the last error is then set
 Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state);
 

@@ -1,9 +1,11 @@
-#include "host/xos_basics/control/call_record.h"
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/semaphores/semaphore.h"
+#include "host/xos_basics/this_thread.h"
+#include "host/xos_basics/thread_end.h"
 #include "host/xos_basics/wait/quick_mutex.h"
 
 #include <array>
+#include <memory>
 #include <mutex>
 #include <new>
 
@@ -47,34 +49,53 @@ bool fillPool() {
     return true;
 }
 
-void refill(ThreadCalls& mine) {
+} // namespace
+
+/// Blocks that one thread has at hand. On the heap, because it is used when the thread's own memory may be gone.
+struct ThreadStore {
+    Semaphore* free;
+    std::uint32_t count;
+};
+
+namespace {
+
+void giveBlocksBack(ThreadStore& mine, std::uint32_t count) {
     std::lock_guard const lock{poolMutex};
-    while (mine.freeSemaphoreCount < BATCH && fillPool()) {
-        push(mine.freeSemaphores, pop(pool));
-        ++mine.freeSemaphoreCount;
-    }
+    for (; count != 0; --count, --mine.count) { push(pool, pop(mine.free)); }
 }
 
-void giveBatchBack(ThreadCalls& mine) {
-    std::lock_guard const lock{poolMutex};
-    for (std::uint32_t i = 0; i < BATCH; ++i) {
-        push(pool, pop(mine.freeSemaphores));
-        --mine.freeSemaphoreCount;
-    }
+void endStore(void* store) {
+    thisThread.store = nullptr;
+    std::unique_ptr<ThreadStore> const mine{static_cast<ThreadStore*>(store)};
+    giveBlocksBack(*mine, mine->count);
 }
 
-/// A thread without records of its own has no store either.
-bool hasOwnStore(ThreadCalls const& mine) { return mine.threadSerial != 0; }
+/// \return null without memory
+ThreadStore* ownStore() {
+    if (thisThread.store != nullptr) return thisThread.store;
+    static ThreadEnd const end{endStore};
+    thisThread.store = new (std::nothrow) ThreadStore{};
+    if (thisThread.store != nullptr) end.set(thisThread.store);
+    return thisThread.store;
+}
+
+void refill(ThreadStore& mine) {
+    std::lock_guard const lock{poolMutex};
+    while (mine.count < BATCH && fillPool()) {
+        push(mine.free, pop(pool));
+        ++mine.count;
+    }
+}
 
 Semaphore* takeBlock() {
-    ThreadCalls& mine = threadCalls();
-    if (!hasOwnStore(mine)) {
+    ThreadStore* const mine = ownStore();
+    if (mine == nullptr) {
         std::lock_guard const lock{poolMutex};
         return fillPool() ? pop(pool) : nullptr;
     }
-    if (mine.freeSemaphores == nullptr) refill(mine);
-    Semaphore* const block = pop(mine.freeSemaphores);
-    if (block != nullptr) --mine.freeSemaphoreCount;
+    if (mine->free == nullptr) refill(*mine);
+    Semaphore* const block = pop(mine->free);
+    if (block != nullptr) --mine->count;
     return block;
 }
 
@@ -83,7 +104,7 @@ Semaphore* takeBlock() {
 Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state) {
     Semaphore* const semaphore = takeBlock();
     if (semaphore == nullptr) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return nullptr;
     }
     semaphore->kind = kind;
@@ -91,7 +112,6 @@ Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state) {
     semaphore->lock.awaited.store(0, std::memory_order_relaxed);
     semaphore->owner.store(0, std::memory_order_relaxed);
     semaphore->depth = 0;
-    semaphore->time.store(0, std::memory_order_relaxed);
     semaphore->named = nullptr;
     ++semaphore->generation;
     std::uint64_t const address = reinterpret_cast<std::uintptr_t>(semaphore);
@@ -102,14 +122,14 @@ Semaphore* makeSemaphore(SemaphoreKind kind, std::uint32_t state) {
 
 void freeSemaphore(Semaphore* semaphore) {
     semaphore->handle.store(0, std::memory_order_relaxed);
-    ThreadCalls& mine = threadCalls();
-    if (!hasOwnStore(mine)) {
+    ThreadStore* const mine = ownStore();
+    if (mine == nullptr) {
         std::lock_guard const lock{poolMutex};
         push(pool, semaphore);
         return;
     }
-    push(mine.freeSemaphores, semaphore);
-    if (++mine.freeSemaphoreCount > 2 * BATCH) giveBatchBack(mine);
+    push(mine->free, semaphore);
+    if (++mine->count > 2 * BATCH) giveBlocksBack(*mine, BATCH);
 }
 
 } // namespace host

@@ -1,9 +1,13 @@
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/result.h"
 #include "host/xos_basics/semaphores/named_mutex.h"
 #include "host/xos_basics/semaphores/semaphore.h"
 #include "host/xos_basics/tasks/deferred_threads.h"
 #include "host/xos_basics/wait/lock_word.h"
+
+#include <atomic>
+#include <cstdint>
 
 using host::failsNow;
 using host::Function;
@@ -15,62 +19,55 @@ int failWith(host::Error error) {
     return host::FAILED;
 }
 
-inline void takeState(host::Semaphore& semaphore, host::ThreadCalls& mine) {
-    if (!host::isTakenAtOnce(semaphore.lock)) {
-        host::provideDeferredThreads(mine);
-        host::takeContended(semaphore.lock);
-    }
-    host::learnTime(mine, semaphore.time);
+/// Identifies the calling thread as the owner of a mutex.
+inline std::uint64_t ownSerial() {
+    static constinit std::atomic<std::uint64_t> lastSerial{0};
+    std::uint64_t& serial = host::thisThread.serial;
+    if (serial == 0) serial = lastSerial.fetch_add(1, std::memory_order_relaxed) + 1;
+    return serial;
 }
 
-inline void giveState(host::Semaphore& semaphore, host::ThreadCalls const& mine) {
-    host::leaveTime(mine, semaphore.time);
-    host::giveWord(semaphore.lock);
+inline void takeState(host::Semaphore& semaphore) {
+    if (host::isTakenAtOnce(semaphore.lock)) return;
+    host::provideDeferredThreads();
+    host::takeContended(semaphore.lock);
 }
 
 int takeMutex(host::Semaphore& mutex) {
-    host::ThreadCalls& mine = host::threadCalls();
-    std::uint64_t const self = mine.threadSerial;
+    std::uint64_t const self = ownSerial();
     if (mutex.owner.load(std::memory_order_relaxed) == self) {
-        if (self == 0) {
-            return failWith(host::Error::noMemory); // a thread that could get no identity
-        }
         ++mutex.depth;
         return 0;
     }
-    takeState(mutex, mine);
+    takeState(mutex);
     mutex.owner.store(self, std::memory_order_relaxed);
     mutex.depth = 1;
-    ++mine.heldMutexes;
+    ++host::thisThread.heldMutexes;
     return 0;
 }
 
 int giveMutex(host::Semaphore& mutex) {
-    host::ThreadCalls& mine = host::threadCalls();
-    std::uint64_t const self = mine.threadSerial;
-    if (self == 0 || mutex.owner.load(std::memory_order_relaxed) != self) return failWith(host::Error::notOwner);
+    if (mutex.owner.load(std::memory_order_relaxed) != ownSerial()) return failWith(host::Error::NOT_OWNER);
     if (--mutex.depth == 0) {
         mutex.owner.store(0, std::memory_order_relaxed);
-        giveState(mutex, mine);
-        if (--mine.heldMutexes == 0) host::provideDeferredThreads(mine);
+        host::giveWord(mutex.lock);
+        if (--host::thisThread.heldMutexes == 0) host::provideDeferredThreads();
     }
     return 0;
 }
 
 /// A mutex that ends while its owner holds it is held no longer.
 void leaveMutex(host::Semaphore const& mutex) {
-    host::ThreadCalls& mine = host::threadCalls();
-    std::uint64_t const self = mine.threadSerial;
-    if (self != 0 && mutex.owner.load(std::memory_order_relaxed) == self) --mine.heldMutexes;
+    if (mutex.owner.load(std::memory_order_relaxed) == ownSerial()) --host::thisThread.heldMutexes;
 }
 
 int takeBinary(host::Semaphore& semaphore) {
-    takeState(semaphore, host::threadCalls());
+    takeState(semaphore);
     return 0;
 }
 
 int giveBinary(host::Semaphore& semaphore) {
-    giveState(semaphore, host::threadCalls());
+    host::giveWord(semaphore.lock);
     return 0;
 }
 
@@ -82,23 +79,23 @@ extern "C" {
 
 xos_Sem xos_SemMCreate(void) {
     if (failsNow(Function::xos_SemMCreate)) return 0;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::mutex, host::WORD_FREE));
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::MUTEX, host::WORD_FREE));
 }
 
 xos_Sem xos_SemBCreate(int available) {
     if (failsNow(Function::xos_SemBCreate, available)) return 0;
     std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::binary, state));
+    return handleOf(host::makeSemaphore(host::SemaphoreKind::BINARY, state));
 }
 
 int xos_SemTake(xos_Sem sem) {
     if (failsNow(Function::xos_SemTake, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
-    case host::SemaphoreKind::mutex:
+    case host::SemaphoreKind::MUTEX:
         return takeMutex(*semaphore);
-    case host::SemaphoreKind::binary:
+    case host::SemaphoreKind::BINARY:
         return takeBinary(*semaphore);
     default:
         return host::takeNamed(*semaphore->named);
@@ -108,11 +105,11 @@ int xos_SemTake(xos_Sem sem) {
 int xos_SemGive(xos_Sem sem) {
     if (failsNow(Function::xos_SemGive, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
-    case host::SemaphoreKind::mutex:
+    case host::SemaphoreKind::MUTEX:
         return giveMutex(*semaphore);
-    case host::SemaphoreKind::binary:
+    case host::SemaphoreKind::BINARY:
         return giveBinary(*semaphore);
     default:
         return host::giveNamed(*semaphore->named);
@@ -122,10 +119,10 @@ int xos_SemGive(xos_Sem sem) {
 int xos_SemDestroy(xos_Sem sem) {
     if (failsNow(Function::xos_SemDestroy, sem)) return host::FAILED;
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
-    if (semaphore == nullptr) return failWith(host::Error::badHandle);
-    if (semaphore->kind == host::SemaphoreKind::mutex) leaveMutex(*semaphore);
+    if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
+    if (semaphore->kind == host::SemaphoreKind::MUTEX) leaveMutex(*semaphore);
     // A named mutex is the process's, not the caller's: others hold the same handle.
-    if (semaphore->kind != host::SemaphoreKind::named) host::freeSemaphore(semaphore);
+    if (semaphore->kind != host::SemaphoreKind::NAMED) host::freeSemaphore(semaphore);
     return 0;
 }
 

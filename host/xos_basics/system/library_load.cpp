@@ -7,7 +7,7 @@
 extern "C" void* xos_LibraryLoad(char const* name) {
     if (host::failsNow(host::Function::xos_LibraryLoad, name)) return nullptr;
     if (name == nullptr || *name == '\0') {
-        host::setLastError(host::Error::badArgument);
+        host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
     }
     return host::loadLibrary(name);

@@ -13,7 +13,7 @@ void* loadLibrary(char const* name) {
     std::string path{name};
     std::replace(path.begin(), path.end(), '\\', '/');
     void* const library = dlopen(path.c_str(), RTLD_NOW);
-    if (library == nullptr) setLastError(Error::notFound);
+    if (library == nullptr) setLastError(Error::NOT_FOUND);
     return library;
 }
 

@@ -1,6 +1,7 @@
 #include "host/include/xos_host.h"
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
+#include "host/xos_basics/result.h"
 
 #include "basis/platform/xos_basics.h"
 
@@ -23,7 +24,7 @@ int xos_BasicsParamLookup(uint32_t id, void* out, uint64_t size) {
     if (host::failsNow(host::Function::xos_BasicsParamLookup, id, out, size)) return host::FAILED;
     xos_HostResolver const answer = resolver.load();
     if (id != FUNCTION_RESOLVER || answer == nullptr || out == nullptr || size < sizeof answer) {
-        host::setLastError(host::Error::notFound);
+        host::setLastError(host::Error::NOT_FOUND);
         return 0;
     }
     std::memcpy(out, &answer, sizeof answer);

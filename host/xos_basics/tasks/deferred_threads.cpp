@@ -45,15 +45,14 @@ bool startWatch() {
 } // namespace
 
 bool deferThreads(ThreadProvider provider) {
-    ThreadCalls& mine = threadCalls();
-    if (mine.heldMutexes == 0) return false;
+    if (thisThread.heldMutexes == 0) return false;
     threadProvider.store(provider, std::memory_order_relaxed);
-    mine.hasDeferredThreads = startWatch();
-    return mine.hasDeferredThreads;
+    thisThread.hasDeferredThreads = startWatch();
+    return thisThread.hasDeferredThreads;
 }
 
-void provideThreadsNow(ThreadCalls& mine) {
-    mine.hasDeferredThreads = false;
+void provideThreadsNow() {
+    thisThread.hasDeferredThreads = false;
     askProvider();
 }
 

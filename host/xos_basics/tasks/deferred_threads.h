@@ -8,7 +8,7 @@
 #ifndef HOST_XOS_BASICS_TASKS_DEFERRED_THREADS_H
 #define HOST_XOS_BASICS_TASKS_DEFERRED_THREADS_H
 
-#include "host/xos_basics/control/call_record.h"
+#include "host/xos_basics/this_thread.h"
 
 namespace host {
 
@@ -18,11 +18,11 @@ using ThreadProvider = void (*)();
 /// \return whether the calling thread holds a mutex, so that threads for its tasks come later
 bool deferThreads(ThreadProvider provider);
 
-void provideThreadsNow(ThreadCalls& mine);
+void provideThreadsNow();
 
 /// Provides the threads that the calling thread deferred.
-inline void provideDeferredThreads(ThreadCalls& mine) {
-    if (mine.hasDeferredThreads) provideThreadsNow(mine);
+inline void provideDeferredThreads() {
+    if (thisThread.hasDeferredThreads) provideThreadsNow();
 }
 
 } // namespace host

@@ -35,10 +35,10 @@ extern "C" xos_Task xos_TaskCreate(xos_TaskParams const* params) {
     static constinit std::atomic<xos_Task> lastTask{0};
     if (host::createFails(params)) return NO_TASK;
     if (params == nullptr || params->entry == nullptr) {
-        host::setLastError(host::Error::badArgument);
+        host::setLastError(host::Error::BAD_ARGUMENT);
         return NO_TASK;
     }
     // What the creator called so far comes before what the task calls.
-    host::publishTime(host::threadCalls());
+    host::beginEra();
     return host::runTask(host::jobOf(*params)) ? lastTask.fetch_add(1, std::memory_order_relaxed) + 1 : NO_TASK;
 }

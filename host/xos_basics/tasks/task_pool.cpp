@@ -1,6 +1,6 @@
 #include "host/xos_basics/tasks/task_pool.h"
 
-#include "host/xos_basics/control/call_order.h"
+#include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/tasks/deferred_threads.h"
 #include "host/xos_basics/tasks/job_queue.h"
@@ -92,18 +92,19 @@ void giveBusyWorkersAMoment() {
     }
 }
 
-enum class Need { nothing, wakeUp, newThread };
+enum class Need { NOTHING, WAKE_UP, NEW_THREAD };
 
-/// Makes one more thread ready, on paper, if there are not enough. \param sleeper  the one to be woken, if any
+/// Makes one more thread ready, on paper, if there are not enough.
+/// \param sleeper  the one to be woken, if any
 Need countOnOneMore(Worker*& sleeper) {
     std::lock_guard const lock{mutex};
-    if (areEnoughReady()) return Need::nothing;
+    if (areEnoughReady()) return Need::NOTHING;
     change(readyWorkers, 1);
     sleeper = asleep;
-    if (sleeper == nullptr) return Need::newThread;
+    if (sleeper == nullptr) return Need::NEW_THREAD;
     asleep = sleeper->nextAsleep;
     --asleepCount;
-    return Need::wakeUp;
+    return Need::WAKE_UP;
 }
 
 /// The thread that was counted on could not be had.
@@ -166,19 +167,19 @@ std::unique_ptr<QueuedJob> takeWhileAwake() {
     return job;
 }
 
-enum class Rest { thereIsWork, sleep, end };
+enum class Rest { THERE_IS_WORK, SLEEP, END };
 
 /// A ready thread may only rest while no job waits.
 Rest fallAsleep(Worker& worker) {
     std::lock_guard const lock{mutex};
-    if (waitingJobs.load(std::memory_order_relaxed) != 0) return Rest::thereIsWork;
+    if (waitingJobs.load(std::memory_order_relaxed) != 0) return Rest::THERE_IS_WORK;
     change(readyWorkers, -1);
-    if (asleepCount >= MOST_ASLEEP) return Rest::end;
+    if (asleepCount >= MOST_ASLEEP) return Rest::END;
     worker.isWoken.store(0, std::memory_order_relaxed);
     worker.nextAsleep = asleep;
     asleep = &worker;
     ++asleepCount;
-    return Rest::sleep;
+    return Rest::SLEEP;
 }
 
 /// \return null: the thread is to end
@@ -187,8 +188,8 @@ std::unique_ptr<QueuedJob> awaitJob(Worker& worker) {
         std::unique_ptr<QueuedJob> job = takeWhileAwake();
         if (job != nullptr) return job;
         Rest const rest = fallAsleep(worker);
-        if (rest == Rest::end) return nullptr;
-        while (rest == Rest::sleep && worker.isWoken.load(std::memory_order_acquire) == 0) {
+        if (rest == Rest::END) return nullptr;
+        while (rest == Rest::SLEEP && worker.isWoken.load(std::memory_order_acquire) == 0) {
             waitWhile(worker.isWoken, 0);
         }
     }
@@ -207,7 +208,7 @@ void runJob(Worker& worker, std::unique_ptr<QueuedJob> owned) {
     takeName(worker, job.name);
     job.entry(job.argument);
     // What the task called comes before whatever is called after its end.
-    publishTime(threadCalls());
+    beginEra();
 }
 
 /// Runs a first job, if there is one, and then whatever comes, until there is nothing to do for long and for many.
@@ -238,14 +239,15 @@ bool runOnOwnThread(std::unique_ptr<QueuedJob> job) {
     return true;
 }
 
-/// Makes one more thread ready if there are not enough. \return false: the system gives no new one
+/// Makes one more thread ready if there are not enough.
+/// \return false: the system gives no new one
 bool makeOneMoreReady() {
     Worker* sleeper = nullptr;
     Need const need = countOnOneMore(sleeper);
-    if (need == Need::wakeUp) {
+    if (need == Need::WAKE_UP) {
         sleeper->isWoken.store(1, std::memory_order_release);
         wakeOne(sleeper->isWoken);
-    } else if (need == Need::newThread && !startThread(runReadyWorker, nullptr, 0)) {
+    } else if (need == Need::NEW_THREAD && !startThread(runReadyWorker, nullptr, 0)) {
         countOnOneLess();
         return false;
     }
@@ -272,7 +274,7 @@ bool runOnAnyThread(std::unique_ptr<QueuedJob> owned) {
 bool runTask(TaskJob const& job) {
     std::unique_ptr<QueuedJob> queued{new (std::nothrow) QueuedJob{job, nullptr}};
     if (queued == nullptr) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return false;
     }
     return job.stackSize == 0 ? runOnAnyThread(std::move(queued)) : runOnOwnThread(std::move(queued));

@@ -36,12 +36,12 @@ SetDescription findSetDescription() {
 
 bool startThread(void (*run)(void*), void* argument, std::uint64_t stackSize) {
     if (stackSize > std::numeric_limits<unsigned>::max()) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return false;
     }
     std::unique_ptr<Start> start{new (std::nothrow) Start{run, argument}};
     if (start == nullptr) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return false;
     }
     std::uintptr_t const thread = _beginthreadex(nullptr, static_cast<unsigned>(stackSize), runStart, start.get(),

@@ -156,7 +156,8 @@ TEST_F(HostControl, counts_skipped_calls_over_all_threads) {
     EXPECT_EQ(failed, 700);
 }
 
-/// Each call made in full, good where nothing is injected. \return whether it gave its failure value
+/// Each call made in full, good where nothing is injected.
+/// \return whether it gave its failure value
 struct Failure {
     char const* name;
     std::function<bool()> fails;
@@ -372,31 +373,78 @@ TEST_F(HostControl, knows_the_last_take_of_whatever_thread) {
     xos_SemDestroy(second);
 }
 
-TEST_F(HostControl, orders_the_calls_of_threads_that_pass_a_semaphore_on) {
-    xos_Sem const pass = xos_SemBCreate(0);
-    xos_Sem const back = xos_SemBCreate(0);
-    std::vector<xos_Sem> sems;
-    for (int i = 0; i < 40; ++i) { sems.push_back(xos_SemMCreate()); }
-    auto const use = [](xos_Sem sem) {
-        xos_SemTake(sem);
-        xos_SemGive(sem);
-    };
+/// Two threads that run one after the other, by turns, without a function of the layer between them.
+class Alternation {
+public:
+    void await(int turn) const {
+        while (turn_.load() != turn) { std::this_thread::yield(); }
+    }
+    void pass() { ++turn_; }
+
+private:
+    std::atomic<int> turn_{0};
+};
+
+TEST_F(HostControl, orders_the_calls_of_threads_however_they_synchronise) {
+    constexpr int TURNS = 100;
+    Alternation turns;
     std::thread other([&] {
-        for (std::size_t i = 1; i < sems.size(); i += 2) {
-            xos_SemTake(pass);
-            // So many that this thread, by its own count, is far ahead.
-            for (int j = 0; j < 10; ++j) { use(sems[i]); }
-            xos_SemGive(back);
+        for (int turn = 1; turn < TURNS; turn += 2) {
+            turns.await(turn);
+            xos_FileTellEx(0, turn);
+            turns.pass();
         }
     });
-    for (std::size_t i = 0; i < sems.size(); i += 2) {
-        use(sems[i]);
-        xos_SemGive(pass);
-        xos_SemTake(back);
-        use(sems[i]);
+    for (int turn = 0; turn < TURNS; turn += 2) {
+        turns.await(turn);
+        // Now and then only: the order must hold where nothing is queried in between, too.
+        if (turn % 10 == 0 && turn != 0) { EXPECT_EQ(lastCall("xos_FileTellEx"), "0x0, " + std::to_string(turn - 1)); }
+        xos_FileTellEx(0, turn);
+        if (turn % 6 == 0) { EXPECT_EQ(lastCall("xos_FileTellEx"), "0x0, " + std::to_string(turn)); }
+        turns.pass();
     }
+    turns.await(TURNS);
+    EXPECT_EQ(lastCall("xos_FileTellEx"), "0x0, " + std::to_string(TURNS - 1));
     other.join();
-    EXPECT_EQ(lastCall("xos_SemTake"), hexadecimal(sems[sems.size() - 2]));
+}
+
+TEST_F(HostControl, counts_the_asking_threads_quick_call_as_the_later_one_until_an_era_ends) {
+    Alternation turns;
+    std::thread other([&] {
+        xos_MsCount();
+        turns.pass();
+        turns.await(2);
+        xos_StrCmp("other", "");
+        turns.pass();
+        turns.await(4);
+    });
+    turns.await(1);
+    xos_StrCmp("asking", "1");
+    turns.pass();
+    turns.await(3);
+    EXPECT_EQ(lastCall("xos_StrCmp"), "\"asking\", \"1\"") << "although the other called after it";
+    EXPECT_EQ(lastCall("xos_StrCmp"), "\"other\", \"\"") << "after a query";
+    xos_StrCmp("asking", "2");
+    turns.pass();
+    other.join();
+    EXPECT_EQ(lastCall("xos_StrCmp"), "\"asking\", \"2\"") << "the other called before the query";
+}
+
+TEST_F(HostControl, orders_quick_calls_by_the_begin_and_end_of_a_task) {
+    std::atomic<bool> isDone{false};
+    for (int i = 0; i < 20; ++i) {
+        xos_StrCmp("creator", "before");
+        xos_TaskParams params{};
+        params.entry = [](void* done) {
+            xos_StrCmp("task", "last");
+            static_cast<std::atomic<bool>*>(done)->store(true);
+        };
+        params.argument = &isDone;
+        isDone = false;
+        xos_TaskCreate(&params);
+        while (!isDone) { std::this_thread::yield(); }
+        EXPECT_EQ(lastCall("xos_StrCmp"), "\"task\", \"last\"") << i;
+    }
 }
 
 TEST_F(HostControl, counts_the_calls_of_all_threads_living_or_not) {
@@ -412,6 +460,22 @@ TEST_F(HostControl, counts_the_calls_of_all_threads_living_or_not) {
         for (std::thread& thread : threads) { thread.join(); }
         EXPECT_EQ(xos_HostCalls("xos_MsCount"), static_cast<std::uint64_t>(round) * THREADS * CALLS);
     }
+}
+
+TEST_F(HostControl, reads_whole_numbers_while_another_thread_calls) {
+    std::atomic<bool> stop{false};
+    std::thread other([&stop] {
+        for (int i = 0; !stop; i = (i + 1) % 1000) { xos_FileReadEx(0, nullptr, static_cast<std::uint64_t>(i), i, i); }
+    });
+    while (xos_HostCalls("xos_FileReadEx") == 0) { std::this_thread::yield(); }
+    for (int i = 0; i < 100'000; ++i) {
+        std::string const text = lastCall("xos_FileReadEx");
+        std::size_t const last = text.rfind(' ');
+        std::string const number = text.substr(last + 1);
+        ASSERT_EQ(text, "0x0, null, " + number + ", " + number + ", " + number);
+    }
+    stop = true;
+    other.join();
 }
 
 TEST_F(HostControl, reads_whole_calls_while_others_make_them) {

@@ -11,9 +11,9 @@ TEST(HostUrlText, tells_schemes_apart) {
         Scheme scheme;
     };
     for (Case const& c :
-         {Case{{}, "http://x", Scheme::http}, Case{{}, "HTTPS://x", Scheme::https}, Case{{}, "file:/x", Scheme::file},
-          Case{{}, "File:", Scheme::file}, Case{{}, "http:x", Scheme::other}, Case{{}, "http", Scheme::other},
-          Case{{}, "ftp://x", Scheme::other}, Case{{}, "", Scheme::other}, Case{{}, " http://x", Scheme::other}}) {
+         {Case{{}, "http://x", Scheme::HTTP}, Case{{}, "HTTPS://x", Scheme::HTTPS}, Case{{}, "file:/x", Scheme::FILE},
+          Case{{}, "File:", Scheme::FILE}, Case{{}, "http:x", Scheme::OTHER}, Case{{}, "http", Scheme::OTHER},
+          Case{{}, "ftp://x", Scheme::OTHER}, Case{{}, "", Scheme::OTHER}, Case{{}, " http://x", Scheme::OTHER}}) {
         SCOPED_TRACE(c.row);
         EXPECT_EQ(host::schemeOf(c.url), c.scheme);
     }

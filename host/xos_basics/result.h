@@ -1,15 +1,17 @@
 /// \file
 /// How a platform function turns what its body found out into its result.
 
-#ifndef HOST_XOS_BASICS_CONTROL_RESULT_H
-#define HOST_XOS_BASICS_CONTROL_RESULT_H
+#ifndef HOST_XOS_BASICS_RESULT_H
+#define HOST_XOS_BASICS_RESULT_H
 
-#include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 
 #include <new>
 
 namespace host {
+
+/// The result of an `int` function that fails without a more telling value.
+constexpr int FAILED = -1;
 
 /// Runs `body`; lack of memory, which never leaves a platform function as an exception, gives `failure`.
 template <class Result, class Body>
@@ -17,7 +19,7 @@ Result unlessMemoryLacks(Result failure, Body body) {
     try {
         return body();
     } catch (std::bad_alloc const&) {
-        setLastError(Error::noMemory);
+        setLastError(Error::NO_MEMORY);
         return failure;
     }
 }
@@ -32,7 +34,7 @@ int resultOf(Body body) {
 template <class... Texts>
 bool given(Texts const*... texts) {
     if ((... && (texts != nullptr))) return true;
-    setLastError(Error::badArgument);
+    setLastError(Error::BAD_ARGUMENT);
     return false;
 }
 

@@ -1,8 +1,8 @@
 /// \file
 /// Paths as Linux takes them, and the last error across a clean-up. For `_posix` sources only.
 
-#ifndef HOST_XOS_BASICS_FILES_POSIX_PATH_H
-#define HOST_XOS_BASICS_FILES_POSIX_PATH_H
+#ifndef HOST_XOS_BASICS_FILES_PATH_POSIX_H
+#define HOST_XOS_BASICS_FILES_PATH_POSIX_H
 
 #include "host/xos_basics/files/slashes.h"
 

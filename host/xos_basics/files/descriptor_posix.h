@@ -1,10 +1,10 @@
 /// \file
 /// Owner of a file descriptor. For `_posix` sources only.
 
-#ifndef HOST_XOS_BASICS_FILES_DESCRIPTOR_H
-#define HOST_XOS_BASICS_FILES_DESCRIPTOR_H
+#ifndef HOST_XOS_BASICS_FILES_DESCRIPTOR_POSIX_H
+#define HOST_XOS_BASICS_FILES_DESCRIPTOR_POSIX_H
 
-#include "host/xos_basics/files/posix_path.h"
+#include "host/xos_basics/files/path_posix.h"
 
 #include <unistd.h>
 #include <utility>

@@ -1,0 +1,55 @@
+#include "host/xos_basics/control/control.h"
+
+#include "host/xos_basics/thread_end.h"
+
+#include <cstring>
+#include <mutex>
+#include <new>
+
+namespace host {
+
+constinit CallRegistry registry;
+
+namespace {
+
+ThreadCalls* unusedOrNewCalls() {
+    std::lock_guard const lock{registry.mutex};
+    ThreadCalls* calls = registry.first;
+    while (calls != nullptr && calls->inUse) { calls = calls->next; }
+    if (calls == nullptr) {
+        calls = new (std::nothrow) ThreadCalls();
+        if (calls == nullptr) return nullptr;
+        calls->next = registry.first;
+        registry.first = calls;
+    }
+    calls->inUse = true;
+    return calls;
+}
+
+void releaseThreadCalls(void* calls) {
+    // Whatever still ends in this thread and calls us gets records anew, and gives them back in the next round.
+    thisThread.calls = nullptr;
+    beginEra();
+    std::lock_guard const lock{registry.mutex};
+    static_cast<ThreadCalls*>(calls)->inUse = false;
+}
+
+} // namespace
+
+ThreadCalls* adoptThreadCalls() {
+    static ThreadEnd const end{releaseThreadCalls};
+    thisThread.calls = unusedOrNewCalls();
+    if (thisThread.calls != nullptr) end.set(thisThread.calls);
+    beginEra();
+    return thisThread.calls;
+}
+
+void CallRecord::addText(std::size_t argument, char const* text) {
+    std::uint64_t const place = texts.size();
+    try {
+        if (text != nullptr) texts.append(text, std::strlen(text) + 1);
+        addWord(argument, text == nullptr ? NULL_TEXT : place);
+    } catch (std::bad_alloc const&) { addWord(argument, NULL_TEXT); }
+}
+
+} // namespace host
