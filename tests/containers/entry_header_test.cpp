@@ -1,4 +1,4 @@
-// Nothing but the entry header before anything else: what it declares is used with the texts and bytes that it holds.
+// The room's header is the only one included: it also declares the texts and bytes that containers hold.
 #include <zor_basis/containers.h>
 
 #include <gtest/gtest.h>

@@ -61,7 +61,7 @@ TEST(HashedStr, Kept_hash_03_is_ordered_by_hash_first) {
     Hashed const early("b");   // shorter texts have smaller hashes
     Hashed const later("aaa"); // alphabetically before it
     EXPECT_TRUE(early < later && !(later < early) && !(early < early));
-    // "bA" and "ab" have the same hash: 33 times one more is the first byte, 33 less the second.
+    // "bA" and "ab" have the same hash: the first byte is greater by 1 and counts 33 times, the second is less by 33.
     Hashed const x("bA");
     Hashed const y("ab");
     ASSERT_EQ(x.hash(), y.hash());

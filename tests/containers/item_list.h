@@ -1,5 +1,5 @@
 /// \file
-/// A list of values that sort by their keys alone, made, shown and gone through in one line.
+/// A list of values that sort by their keys alone, and helpers that make it, show it and find a place in it.
 
 #ifndef TESTS_CONTAINERS_ITEM_LIST_H
 #define TESTS_CONTAINERS_ITEM_LIST_H
@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-/// A value that sorts by its key alone and counts how many of it live.
+/// A value that sorts by its key alone and counts its living instances.
 struct Item {
     Item(int k, int t) : key(k), tag(t) { ++living; }
     Item(Item const& other) : key(other.key), tag(other.tag) { ++living; }

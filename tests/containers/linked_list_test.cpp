@@ -14,7 +14,7 @@ struct Node {
     Node* next = nullptr;
 };
 
-/// The numbers from the first to the last; empty where the way back is another.
+/// The numbers from the first to the last; empty if the links backwards do not agree.
 std::vector<int> numbers(LinkedList<Node> const& list) {
     std::vector<int> all;
     Node const* before = nullptr;

@@ -13,7 +13,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// Shows the capacity.
+/// Exposes the capacity.
 class Array : public PtrArray<int> {
 public:
     using PtrArray::PtrArray;
@@ -46,7 +46,7 @@ TEST(PtrArray, at_least_doubles_when_it_grows) {
     EXPECT_EQ(array.capacity(), 16u);
     for (int i = 0; i < 9; ++i) EXPECT_EQ(array[i], &values[i]);
     array.set(&values[9], 16);
-    EXPECT_EQ(array.capacity(), 32u) << "one more is asked for, twice as many come";
+    EXPECT_EQ(array.capacity(), 32u) << "the capacity at least doubles";
 }
 
 TEST(PtrArray, leaves_skipped_slots_null) {

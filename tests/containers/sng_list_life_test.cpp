@@ -13,7 +13,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// A value of which only so many copies can be made.
+/// A value that can be copied only a limited number of times.
 struct Scarce {
     Scarce() { ++living; }
     Scarce(Scarce const&) {
@@ -29,7 +29,7 @@ struct Scarce {
 int Scarce::left = 0;
 int Scarce::living = 0;
 
-/// A value that tells when it ends.
+/// A value that records its destruction.
 struct Teller {
     explicit Teller(int n) : number(n) {}
     Teller(Teller const&) = default;

@@ -1,4 +1,4 @@
-// Random operations on a list beside a plain vector.
+// Applies random operations to a list and to a plain vector.
 
 #include "tests/containers/item_list.h"
 
@@ -32,7 +32,7 @@ void sortLikeList(Items& items, bool ascending) {
 struct ListBesideVector {
     std::uint64_t below(std::uint64_t bound) { return random() % bound; }
     Item item() { return {static_cast<int>(below(10)), ++tag}; }
-    /// From the first place to the end.
+    /// An index from the first item to the end.
     std::ptrdiff_t index() { return static_cast<std::ptrdiff_t>(below(items.size() + 1)); }
     std::ptrdiff_t size() const { return static_cast<std::ptrdiff_t>(items.size()); }
 

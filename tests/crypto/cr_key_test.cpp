@@ -112,7 +112,7 @@ TEST_F(CrKeyOfUser, refuses_what_is_not_whole_blocks) {
         Blob out = blobOf("what there was");
         if (n % 8 != 0 || n == 0) {
             EXPECT_FALSE(key->decrypt(blobOf(truncated), out)) << n;
-            EXPECT_EQ(bytesOf(out), truncated) << "it was brought there";
+            EXPECT_EQ(bytesOf(out), truncated) << "the message was copied there";
         } else {
             EXPECT_FALSE(key->decrypt(blobOf(truncated), out) && bytesOf(out) == "a message of some blocks") << n;
         }
@@ -123,7 +123,7 @@ TEST_F(CrKeyOfUser, refuses_what_is_not_whole_blocks) {
 }
 
 TEST_F(CrKeyOfUser, refuses_a_padding_in_which_one_bit_has_changed) {
-    // A bit that changes in one block changes in the message of the next one, which here is padding only.
+    // A bit that changes in one encrypted block changes in the next block of the message, which here is only padding.
     std::string const message = encrypted(*key, "8 bytes!");
     ASSERT_EQ(message.size(), 16u);
     for (std::size_t bit = 0; bit < 64; ++bit) {
@@ -134,7 +134,7 @@ TEST_F(CrKeyOfUser, refuses_a_padding_in_which_one_bit_has_changed) {
         EXPECT_EQ(out.size(), 16u) << bit;
     }
     Blob out;
-    EXPECT_TRUE(key->decrypt(blobOf(message), out)) << "the key is as good as before";
+    EXPECT_TRUE(key->decrypt(blobOf(message), out)) << "the key still works";
 }
 
 namespace {
@@ -160,7 +160,7 @@ End const ENDS[] = {
 TEST_F(CrKeyOfUser, takes_only_1_to_8_equal_bytes_for_a_padding) {
     for (End const& c : ENDS) {
         SCOPED_TRACE(c.row);
-        // Without the block of its own padding, the message ends in what the row says.
+        // Without the block of padding that encrypting added, the message ends with the bytes of the row.
         std::string const plain = std::string(16 - c.bytes.size(), 'm') + c.bytes;
         Blob out;
         bool const done = key->decrypt(blobOf(encrypted(*key, plain).substr(0, 16)), out);

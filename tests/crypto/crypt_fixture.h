@@ -1,5 +1,5 @@
 /// \file
-/// What the tests of the classes share: a user with a key, and a hash that counts its ends.
+/// The fixture of the classes' tests: a user with a key; and a hash that counts destructions.
 
 #ifndef TESTS_CRYPTO_CRYPT_FIXTURE_H
 #define TESTS_CRYPTO_CRYPT_FIXTURE_H

@@ -1,5 +1,5 @@
-// What is in each block at the moment when it is released, and what becomes of calls for which there is no memory. The
-// linker leads every `malloc` and `free` of this program's objects here, the library's own ones included.
+// The content of each block when it is released, and calls for which there is no memory. The linker redirects every
+// `malloc` and `free` of this program's objects, the library's included, to this file.
 
 #include "tests/crypto/crypt_user.h"
 #include "tests/support/watched_blocks.h"
@@ -10,7 +10,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// While one lives, blocks are watched.
+/// Blocks are watched during its lifetime.
 struct Watched {
     explicit Watched(std::size_t lacking = Watch::MOST) {
         watch = {};

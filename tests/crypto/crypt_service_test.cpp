@@ -1,4 +1,4 @@
-// What the classes ask of the cryptographic service, and what becomes of it when a call fails.
+// How the classes call the cryptographic service, and what they do when a call fails.
 
 #include "tests/crypto/crypt_user.h"
 
@@ -20,23 +20,23 @@ namespace {
 
 using Handle = CryptService::Handle;
 
-/// Records what is asked, and lets chosen calls fail.
+/// Records calls and lets selected ones fail.
 struct Record {
     CryptService real;
-    /// Calls by name, and which of them fail: from the first, for so many times.
+    /// Calls by name, and which of them fail: the number of the first, and how many.
     std::map<std::string, int> calls;
     std::map<std::string, std::pair<int, int>> failures;
     std::vector<bool> newKeySets;
     std::vector<bool> exportables;
     std::vector<std::uint32_t> pieces;
-    /// Whether an export had a block, and the length that it was given.
+    /// Whether an export received a block, and the length that it received.
     std::vector<std::pair<bool, std::uint32_t>> exported;
     bool readsData = true;
     std::set<Handle> hashes, keys;
     std::size_t wronglyDestroyed = 0;
     int lastErrors = 0;
 
-    /// Counts a call. \return whether it shall go on
+    /// Counts a call. \return false if it is to fail
     bool goesOn(std::string const& name) {
         int const number = calls[name]++;
         auto const found = failures.find(name);
@@ -104,7 +104,7 @@ struct CryptServiceRecorded : testing::Test {
         cryptService = record_.real;
     }
 
-    /// The named call fails from now on, so many times.
+    /// Lets the next calls of this name fail.
     void fail(std::string const& name, int times = 1) { record_.failures[name] = {record_.calls[name], times}; }
 
     Record record_;
@@ -304,7 +304,7 @@ TEST_F(CryptServiceRecorded, may_refuse_to_decrypt) {
 }
 
 TEST_F(CryptServiceRecorded, never_leaves_anything_behind_whichever_call_fails) {
-    // The whole way from secret to message and back, with every call failing in turn, once or for good.
+    // From secret to message and back, with every call failing in turn, once or permanently.
     for (int times : {1, 1000}) {
         for (char const* name : {"acquire", "createHash", "hashData", "deriveKey", "exportLength", "exportKey",
                                  "paddedLength", "encrypt", "decrypt"}) {

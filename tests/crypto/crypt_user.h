@@ -1,5 +1,5 @@
 /// \file
-/// From secrets to keys, as a user goes, and blobs as strings of bytes.
+/// Derives keys from secrets as a user does, and converts blobs to strings of bytes.
 
 #ifndef TESTS_CRYPTO_CRYPT_USER_H
 #define TESTS_CRYPTO_CRYPT_USER_H
@@ -28,7 +28,7 @@ inline std::string bytesOf(ZOR_Basis::Blob const& blob) {
 
 inline ZOR_Basis::Blob blobOf(std::string const& bytes) { return {bytes.size(), bytes.data()}; }
 
-/// What the key makes of a message; nothing where it fails.
+/// The encrypted message; empty if the key fails.
 inline std::string encrypted(ZOR_Basis::CrKey& key, std::string const& plain) {
     ZOR_Basis::Blob out;
     return key.encrypt(blobOf(plain), out) ? bytesOf(out) : std::string();

@@ -1,4 +1,4 @@
-// What the system's cryptographic service made of secrets and messages; both targets have to give the same bytes.
+// Results of the system's cryptographic service for secrets and messages; both targets must give the same bytes.
 
 #include "tests/crypto/crypt_user.h"
 

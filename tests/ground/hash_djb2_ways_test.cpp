@@ -1,4 +1,4 @@
-// The way that processors without SSSE3 take, on whatever processor this is.
+// Runs the code for processors without SSSE3 on every processor.
 
 #include "basis/ground/hash_djb2.h"
 

@@ -19,7 +19,7 @@ namespace {
 
 bool isSlash(char c) { return c == '/' || c == '\\'; }
 
-/// The rule as it is said, with all its trying.
+/// The rule as documented, by trying all possibilities.
 template <class Case>
 bool literally(char const* pattern, char const* name) {
     while (*name != '\0') {
@@ -219,7 +219,7 @@ TEST(Wildcard, agrees_with_the_literal_recursion_on_random_pairs) {
             << pattern << " | " << name;
         if (exact) ++matches;
     }
-    // Both answers are common, so that the comparison says something.
+    // Both answers are frequent, so that the comparison means something.
     EXPECT_GT(matches, steps / 50);
     EXPECT_LT(matches, steps - steps / 50);
 }
@@ -245,7 +245,7 @@ TEST(Wildcard, is_quick_where_trying_everything_would_never_end) {
              Case{{}, repeated("*a", 40) + "*b*", repeated("a*", 2048), false},
          }) {
         SCOPED_TRACE(c.row);
-        // Generous, as it also holds under sanitizers on a busy machine.
+        // Generous, because the limit also applies under sanitizers on a busy machine.
         EXPECT_LT(milliseconds(c.pattern, c.name, c.expected), 200.0);
     }
 }

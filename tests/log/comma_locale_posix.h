@@ -1,5 +1,5 @@
 /// \file
-/// A locale whose decimal point is a comma, made for the test and current while this lives.
+/// A locale whose decimal point is a comma, compiled for the test and current during the object's lifetime.
 
 #ifndef TESTS_LOG_COMMA_LOCALE_POSIX_H
 #define TESTS_LOG_COMMA_LOCALE_POSIX_H

@@ -1,5 +1,5 @@
 /// \file
-/// Loggers whose alert, clock and files a test has in its hand.
+/// Loggers whose alert, clock and files the test controls.
 
 #ifndef TESTS_LOG_DRIVEN_LOGGER_H
 #define TESTS_LOG_DRIVEN_LOGGER_H
@@ -19,7 +19,7 @@
 #include <string>
 #include <vector>
 
-/// Each test has a log of its own name. Loggers are never closed here, as a closed one keeps its thread for ever.
+/// Each test has a log of its own name. Loggers are never closed here, because the thread of a closed one never ends.
 class DrivenLoggers : public testing::Test {
 protected:
     static constexpr std::uint32_t PERIOD = ZOR_Basis::LoggerImpl::PERIOD_MS;
@@ -43,7 +43,7 @@ protected:
     static std::string name() { return testing::UnitTest::GetInstance()->current_test_info()->name(); }
     static std::string folder() { return (scratchRoot() / "tmp/zb_log").generic_string(); }
     static std::string file(int session) { return folder() + "/" + name() + "/" + std::to_string(session) + ".log"; }
-    /// What a file holds, with "\n" as line end.
+    /// The content of a file, with "\n" as line end.
     static std::string content(int session) {
         std::string lines;
         for (char c : textOf(file(session))) {
@@ -58,21 +58,21 @@ protected:
     }
     ZOR_Basis::LoggerImpl& start() { return start(name()); }
 
-    /// A line of so many bytes, its end included.
+    /// \param sizeWithEnd  counts the line end, too
     static std::string lineOf(std::size_t sizeWithEnd, char c = 'x') { return std::string(sizeWithEnd - 1, c); }
 
     static void write(ZOR_Basis::Logger& logger, std::string line) {
         line.append(2, '\0');
         logger.out(line.data());
     }
-    /// One look of the alert at what there is to write.
+    /// Fires the logger's alert.
     static void tick(ZOR_Basis::LoggerImpl const& logger) { ASSERT_EQ(xos_HostAlertFire(logger.alertId()), 0); }
     static void tickAfter(std::uint32_t ms, ZOR_Basis::LoggerImpl const& logger) {
         handClock += ms;
         tick(logger);
     }
 
-    /// Opened since the start of the test, with their modes.
+    /// The files opened since the start of the test, with their modes.
     std::vector<std::string> opened;
     /// Called at each opening, while the logger is not locked.
     std::function<void()> whileOpening;

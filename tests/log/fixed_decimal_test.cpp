@@ -76,8 +76,7 @@ TEST(FixedDecimal, agrees_with_the_runtime_for_any_bits) {
     std::uint64_t const steps = randomSteps(500'000);
     for (std::uint64_t i = 0; i < steps; ++i) {
         std::uint64_t bits = random();
-        // Mostly of a size that has digits to print, and often with few bits set, as in the middle between two
-        // decimals.
+        // Mostly of a magnitude that has digits to print, and often with few bits set, as halfway between two decimals.
         if (i % 8 != 0) bits = (bits & ~(std::uint64_t{0x7FF} << 52)) | (1023 - 140 + random() % 203) << 52;
         if (i % 3 == 0) bits &= ~std::uint64_t{0} << (random() % 53);
         auto const number = std::bit_cast<double>(bits);

@@ -1,5 +1,5 @@
 /// \file
-/// The milliseconds of the platform layer, told by hand: this program's own `xos_MsCount` takes the place of the other.
+/// The platform layer's milliseconds, set by hand: this program defines its own `xos_MsCount`.
 
 #ifndef TESTS_LOG_HAND_CLOCK_H
 #define TESTS_LOG_HAND_CLOCK_H

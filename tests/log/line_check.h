@@ -1,5 +1,5 @@
 /// \file
-/// Holds the text of a line against the one of `snprintf`.
+/// Compares the text of a line with that of `snprintf`.
 
 #ifndef TESTS_LOG_LINE_CHECK_H
 #define TESTS_LOG_LINE_CHECK_H
@@ -47,12 +47,12 @@ template <class... Values>
 std::string printed(std::size_t room, char const* format, Values... values) {
     Line line;
     line.fill('Y');
-    // A last argument that no format asks for: without any, compilers take the format for a text.
+    // The last argument is never used; without arguments, compilers warn about the format.
     std::snprintf(line.data(), room, format, values..., nullptr);
     return line.data();
 }
 
-/// Compares with `snprintf`. \return whether the short way led there
+/// Compares with `snprintf`. \return whether the short way was taken
 template <class... Values>
 bool check(char const* format, Values... values) {
     Written const written = writtenWith(ROOM, format, values...);

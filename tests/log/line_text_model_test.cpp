@@ -1,4 +1,4 @@
-// Lines of random formats and values beside those of `snprintf`.
+// Compares lines of random formats and values with those of `snprintf`.
 
 #include "tests/log/line_check.h"
 #include "tests/support/operations.h"
@@ -66,7 +66,7 @@ std::string randomText(std::mt19937_64& random) {
     return text;
 }
 
-/// Checks lines of one conversion and counts those that went the short way.
+/// Checks lines of one conversion and counts those that took the short way.
 class RandomLines {
 public:
     template <class Value>

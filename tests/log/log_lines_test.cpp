@@ -11,7 +11,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// A log whose logger the test has in its hand, and which is not closed unless the test does.
+/// A log whose logger the test controls; only the test closes it.
 class LogLines : public DrivenLoggers {
 protected:
     Log& make() { return *new (memory_) Log(name().c_str()); }
@@ -120,7 +120,7 @@ TEST_F(LogLines, of_a_log_that_never_had_one_let_it_end) {
     xos_HostCallsReset();
     { Log const log(name().c_str()); }
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 0u);
-    // The newest alert: the ids go up.
+    // Ids of alerts ascend, so this one follows the log's.
     std::uint32_t const after = HQ_Basis::AlertTimer::New(
         PERIOD, [](auto const&) { return PERIOD; }, nullptr);
     EXPECT_EQ(xos_HostAlertFire(after - 1), 0);
@@ -146,7 +146,7 @@ TEST_F(LogLines, of_many_threads_come_whole) {
     end(log);
 }
 
-// What never ends is shown in a process of its own.
+// The thread of a closed log never ends, so this runs in a process of its own.
 
 TEST_F(LogLines, Kept_log_01_of_a_closed_log_are_written_and_its_file_is_then_opened_for_ever) {
     for (char const* how : {"line", "session", "destroyed"}) {

@@ -1,4 +1,4 @@
-// What a logger does when a call fails, and how it ends.
+// Failing calls, and the end of a logger.
 
 #include "tests/log/driven_logger.h"
 
@@ -96,7 +96,7 @@ TEST_F(LoggerImplFaults, deletes_an_alert_that_outlived_it_when_it_comes_again) 
     xos_HostFail("HQ_Basis::AlertTimer::Delete", 0, 1);
     EXPECT_EQ(xos_HostAlertFire(id), 0);
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 1u);
-    // May lie where the other one was, and is none of that alert's business.
+    // It may have the address of the previous logger; the old alert must not touch it.
     LoggerImpl& successor = start();
     successor.newSession();
     EXPECT_EQ(xos_HostAlertFire(id), 0);

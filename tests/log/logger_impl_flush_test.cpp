@@ -1,4 +1,4 @@
-// What is written on demand.
+// Writing on demand.
 
 #include "tests/host/support/system_error.h"
 #include "tests/log/driven_logger.h"
@@ -39,7 +39,7 @@ TEST_F(LoggerImplFlush, goes_on_as_ever_after_a_flush) {
     logger.flush();
     write(logger, "waits");
     tick(logger);
-    EXPECT_EQ(content(0), "flushed\n") << "is being filled still";
+    EXPECT_EQ(content(0), "flushed\n") << "the block is still being filled";
     tickAfter(PERIOD, logger);
     EXPECT_EQ(content(0), "flushed\nwaits\n");
 }

@@ -115,7 +115,7 @@ constexpr std::size_t FULL = LoggerImpl::BLOCK_SIZE;
 struct SecondLine {
     Row row;
     std::size_t before, line;
-    /// What of it is in the file at once, without silence: the full block alone.
+    /// Bytes in the file at the next tick, without a period of silence: only the full block.
     std::size_t writtenAtOnce;
 };
 
@@ -227,7 +227,7 @@ TEST_F(LoggerImplDriven, loses_no_line_that_comes_while_it_writes) {
     std::string all = "first\n";
     write(logger, "first");
     int left = 0;
-    // The block becomes full and then another is current, while it is being written.
+    // While the block is being written, it becomes full, and then another becomes the current one.
     whileOpening = [&] {
         for (; left > 0; --left) {
             std::string const line = "line " + std::to_string(left);

@@ -14,8 +14,8 @@ constexpr int WRITERS = 8;
 
 class LoggerImplThreads : public DrivenLoggers {
 protected:
-    /// Has eight threads write numbered lines while the alert writes them out as often as it can.
-    /// \param afterLine  is called behind each line, with its number
+    /// Lets eight threads write numbered lines while the alert writes them to the file as often as it can.
+    /// \param afterLine  is called after each line with its number
     template <class AfterLine>
     static void writeInThreads(LoggerImpl& logger, std::uint64_t lines, AfterLine afterLine) {
         std::atomic<int> writing{WRITERS};
@@ -35,7 +35,7 @@ protected:
     }
 };
 
-/// Every line of every writer once, whole, and each writer's in their order.
+/// Expects every line of every writer once and whole, and each writer's lines in order.
 void expectAllLines(std::string const& text, std::uint64_t lines) {
     std::map<int, std::uint64_t> next;
     std::istringstream all(text);

@@ -5,7 +5,7 @@
 
 #include <filesystem>
 
-// On Windows every end but `TerminateProcess` tells the library.
+// On Windows the library learns of every end except `TerminateProcess`.
 TEST(ProcessEndOfLogsPosix, is_lost_where_the_process_ends_at_once) {
     Scratch const root;
     EXPECT_EQ(run({"log_end_child", {"sudden"}, {{"XOS_ROOT", root.path()}}, root.path()}).exitCode, 0);

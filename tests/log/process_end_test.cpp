@@ -1,4 +1,4 @@
-// What becomes of the lines that a log holds when its process ends.
+// The lines that a log holds when its process ends.
 
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
@@ -32,7 +32,7 @@ protected:
     Scratch root;
 };
 
-/// How many numbered lines there are, from 1 on in their order; other writers' lines may stand between them.
+/// Counts the numbered lines, which ascend from 1; lines of other writers may stand between them.
 int numberedLines(std::string const& text) {
     std::istringstream lines(text);
     int count = 0;

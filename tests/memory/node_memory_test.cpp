@@ -12,7 +12,7 @@ struct Node {
     ~Node() { ++*ends; }
 };
 
-/// Has one place and counts what becomes of it.
+/// Has room for one node and counts calls.
 class OnePlace : public MemMgr {
 public:
     using MemMgr::alloc;

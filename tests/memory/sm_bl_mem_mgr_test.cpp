@@ -16,7 +16,7 @@ namespace {
 
 char* bytes(void* p) { return static_cast<char*>(p); }
 
-/// Allocates to the end of the current chunk, each element right below the one before.
+/// Allocates up to the end of the current chunk and expects each element directly below the previous one.
 void useUpChunk(SmBlMemMgr& manager, std::uint64_t alreadyUsed, std::uint64_t stride) {
     std::uint64_t const room = manager.chunkSize() / stride - alreadyUsed;
     std::uint64_t const chunk = manager.chunkCount();

@@ -1,4 +1,4 @@
-// The end of a block, again and again.
+// A manager that always returns the end of its block.
 
 #include "basis/memory/stack_mem_mgr.h"
 

@@ -1,5 +1,5 @@
 /// \file
-/// What a child that saves a dictionary is given to save. Both contents take several pieces of a file.
+/// The two contents that a child saves. Each takes several pieces of a file.
 
 #ifndef TESTS_ONCE_DICT_CONTENTS_H
 #define TESTS_ONCE_DICT_CONTENTS_H

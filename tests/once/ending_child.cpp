@@ -1,4 +1,4 @@
-// ending_child HOW: what holds before and after main.
+// ending_child HOW: uses the library before and after main.
 //   begin   prints which functions of the platform layer were called before main
 //   end     three threads use the library while main returns and a static object uses it in its destructor
 //   pause   the same, but the threads end before the static object does
@@ -23,7 +23,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// Used by threads that nobody waits for, so never destroyed.
+/// Never destroyed, because threads that are not joined use it.
 struct Tools {
     Log log{"ending"};
     TimerMgr* timers = TimerMgr::New("ending", 4);

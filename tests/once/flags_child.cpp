@@ -4,7 +4,7 @@
 //   config=FOLDER                       where the configuration is from now on
 //   calls                               the loads, readings and releases so far
 //   last                                the arguments of the last load, and the keys of the last reading
-//   race                                many threads at once ask for VIPP: prints their results in order
+//   race                                many threads ask for VIPP simultaneously: prints their results in order
 
 #include <zor_basis/flat.h>
 

@@ -1,5 +1,5 @@
 // locale_child HEX: converts a local text, given in hex digits, to UTF-8 and prints that in hex, or "invalid".
-// It chooses another locale for itself first, which must not matter.
+// It first selects another locale for itself, which must not matter.
 
 #include <zor_basis/text.h>
 

@@ -23,7 +23,7 @@ namespace {
 
 std::atomic<bool> hasReturned{false};
 
-/// The log's is the first alert of the process, or one soon after.
+/// The alert of the log is the first of the process, or one of the next.
 void fireAlert() {
     constexpr std::uint32_t LAST_TRIED = 16;
     std::uint32_t id = 1;
@@ -31,7 +31,7 @@ void fireAlert() {
     hasReturned = true;
 }
 
-/// Tries something again and again, at most some seconds.
+/// Repeats an attempt for a few seconds at most.
 template <class Try>
 bool succeeds(Try const& attempt) {
     for (int i = 0; i < 4000; ++i) {
@@ -52,7 +52,7 @@ bool holds(fs::path const& file, std::string const& line) {
     return std::getline(stream, read) && read == line;
 }
 
-/// Fails where the file is open at the moment.
+/// Fails while the file is open.
 bool isRemoved(fs::path const& file) {
     std::error_code ignored;
     return fs::remove(file, ignored);

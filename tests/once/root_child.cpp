@@ -8,8 +8,8 @@
 //   pathroot        WcPath::pathRoot
 //   set PATH        makes it WcPath::pathRoot
 //   clear           empties that
-//   ask             what many threads at once get for Sys::root(), and how often the platform layer was asked
-//   race EXPECTED   translates "/scsi0", wide, in many threads at once, and prints how often the result was another
+//   ask             what many threads get for Sys::root() simultaneously, and how often the platform layer was asked
+//   race EXPECTED   translates "/scsi0", wide, in many threads, and prints how many results differ
 //   refill EXPECTED the same again and again, each time with WcPath::pathRoot emptied before
 
 #include <zor_basis/files/f_path.h>
@@ -61,7 +61,7 @@ void wide(char const* text) {
     print(static_cast<WStr const&>(inPlace));
 }
 
-/// Runs a function in threads that begin together.
+/// Runs a function in threads that start simultaneously.
 template <class Function>
 void inThreads(unsigned n, Function function) {
     std::atomic<unsigned> waiting{n};
@@ -86,7 +86,7 @@ void ask() {
     print(static_cast<Str const&>(*answers.front()));
 }
 
-/// The translations that are not the expected one.
+/// Counts the translations that differ from the expected one.
 int wrongTranslations(char const* expected, unsigned times) {
     WBStr units;
     Convert::Utf8ToWide(expected, units);

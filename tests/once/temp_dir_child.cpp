@@ -11,17 +11,17 @@
 //   status           prints the status of the last one
 //   put=NAME         puts a file into the last one's folder
 //   replace          puts a file in place of the last one's folder
-//   calls=FUNCTION   prints how often the platform layer was called, last=FUNCTION the arguments of the last call
+//   calls=FUNCTION   prints how often this function of the platform layer was called
+//   last=FUNCTION    prints the arguments of its last call
 //   fail=FUNCTION    lets its next call fail
 //   touch=FILE       makes an empty file
 //   wait=FILE        waits until there is such a file, a minute at most
-//   background       another thread makes one with Create; tried=COUNT waits until it has tried so many
-//                    more names
+//   background       another thread makes one with Create
+//   tried=COUNT      waits until that thread has tried so many more names
 //   join             waits for that thread: prints its path
 //   remove=FILE      removes a file
 //   unblock=FILE     removes that file as soon as a hundred names have been tried in vain
-//   threads=COUNT    so many threads make 25 folders each, put a file into each and keep half of them until all threads
-//   are
+//   threads=COUNT    each thread makes 25 folders, puts a file into each and keeps half of them until all threads are
 //                    done: prints the paths
 
 #include <zor_basis/system/vdp_temp_dir.h>

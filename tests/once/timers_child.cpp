@@ -5,7 +5,7 @@
 //   rip=N     TimerMgr::setRip(N)
 //   report    a report of the manager "child", if there is one: prints "report"
 //   folder    where the last file was opened or the last directory made, as the platform layer recorded it
-//   race      many threads at once use the registry for the first time: prints "one" if they all got the same
+//   race      many threads use the registry for the first time: prints "one" if all got the same
 
 #include <zor_basis/timers.h>
 

@@ -1,5 +1,5 @@
 /// \file
-/// What `unload_module` offers to those who load it.
+/// The functions of `unload_module`.
 
 #ifndef TESTS_ONCE_UNLOAD_MODULE_H
 #define TESTS_ONCE_UNLOAD_MODULE_H

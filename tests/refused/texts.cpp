@@ -73,7 +73,7 @@ void losesNoDigits(BufStr<15>& name, FPath& path) {
     path << 2.0;  // refused
 }
 
-// What stands beside all that and compiles.
+// What compiles all the same.
 bool isStillAPointer(Str view, BufStr<15> const& name, WBStr const& wide) {
     char const* const text = name;
     void const* const address = name;

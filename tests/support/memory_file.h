@@ -1,5 +1,5 @@
 /// \file
-/// A file in memory that counts its calls and can fall short.
+/// A file in memory that counts its calls and has limited room.
 
 #ifndef TESTS_SUPPORT_MEMORY_FILE_H
 #define TESTS_SUPPORT_MEMORY_FILE_H

@@ -1,5 +1,5 @@
 /// \file
-/// Operations of model tests by name: each acts on the object under test and on the model beside it.
+/// Named operations of model tests: each acts on the object under test and on its model.
 
 #ifndef TESTS_SUPPORT_OPERATIONS_H
 #define TESTS_SUPPORT_OPERATIONS_H
@@ -11,7 +11,7 @@
 template <class Subject>
 struct Operation {
     char const* name;
-    /// How often it is drawn, compared with the others.
+    /// How often it is drawn in proportion to the others.
     std::uint64_t weight;
     void (*act)(Subject& subject);
 };

@@ -1,3 +1,3 @@
-// Only its precompiled headers are of use.
+// Only its precompiled headers are used.
 
 int main() { return 0; }

@@ -1,5 +1,5 @@
 /// \file
-/// A folder of its own for one test, and plain ways to make and to look at what lies in it.
+/// A folder for one test, and plain functions that create and examine its content.
 
 #ifndef TESTS_SUPPORT_SCRATCH_H
 #define TESTS_SUPPORT_SCRATCH_H

@@ -1,5 +1,5 @@
 /// \file
-/// A root folder for the whole test program, empty at its start and gone at its end.
+/// A root folder for the whole test program, empty at its start and removed at its end.
 
 #ifndef TESTS_SUPPORT_SCRATCH_ROOT_H
 #define TESTS_SUPPORT_SCRATCH_ROOT_H

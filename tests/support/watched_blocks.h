@@ -1,7 +1,7 @@
 /// \file
-/// What is in each block at the moment when it is released. For one source of a program that is linked with
-/// `-Wl,--wrap=malloc,--wrap=free`, which leads every `malloc` and `free` of its objects here, the library's own ones
-/// included.
+/// The content of each block when it is released. For one source of a program that is linked with
+/// `-Wl,--wrap=malloc,--wrap=free`. The linker then redirects every `malloc` and `free` of the program's objects, the
+/// library's included, to this file.
 
 #ifndef TESTS_SUPPORT_WATCHED_BLOCKS_H
 #define TESTS_SUPPORT_WATCHED_BLOCKS_H

@@ -1,4 +1,4 @@
-// The library as a DLL has a runtime and a new-handler of its own, so this is tested with its objects in the program.
+// The DLL has its own runtime and so its own new-handler, so this is tested with the library's objects in the program.
 
 #include "zor_basis/text/auto_ptr_cstr.h"
 

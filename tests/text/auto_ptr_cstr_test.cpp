@@ -7,7 +7,7 @@
 #include <new>
 #include <type_traits>
 
-// Memory that cannot be had is what is tested here; the address sanitizer asks for this, where it is in the program.
+// These tests request more memory than exists, which the address sanitizer permits only with this option.
 extern "C" [[gnu::visibility("default")]] char const* __asan_default_options() { return "allocator_may_return_null=1"; }
 
 static_assert(!std::is_copy_constructible_v<Auto_ptr_CStr> && !std::is_copy_assignable_v<Auto_ptr_CStr>);

@@ -1,5 +1,5 @@
 /// \file
-/// What a call made of a text.
+/// The content of a text after a call.
 
 #ifndef TESTS_TEXT_CALL_CONTENT_H
 #define TESTS_TEXT_CALL_CONTENT_H

@@ -1,5 +1,5 @@
-// Linux only, as the page behind a text is taken away here: nothing behind a terminator is read, whatever length is
-// given. The Windows build has the same code.
+// Nothing behind a terminator is read, whatever length is given. The page behind the text is made unreadable, for Linux
+// only; the Windows build has the same code.
 
 #include "tests/text/last_page_posix.h"
 #include "zor_basis/text.h"

@@ -14,7 +14,7 @@ using Wide = std::basic_string<WChar>;
 
 Wide widened(std::string const& ascii) { return {ascii.begin(), ascii.end()}; }
 
-/// Where the wanted text was found in the other; -1: nowhere.
+/// The index at which `wanted` was found; -1: nowhere.
 template <class Char>
 std::int64_t placeOfFound(std::basic_string<Char> const& text, std::basic_string<Char> const& wanted) {
     Char const* const found = detail::findText(text.c_str(), wanted.c_str());

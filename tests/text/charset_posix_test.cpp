@@ -1,4 +1,4 @@
-// The locale's character set, which Windows has not; convert_code_pages_win_test.cpp is its counterpart.
+// The locale's character set. Its counterpart on Windows is in convert_code_pages_win_test.cpp.
 
 #include "basis/text/charset_posix.h"
 
@@ -20,7 +20,7 @@ using reference::WideText;
 
 namespace {
 
-/// Another set for the length of a test.
+/// Selects a character set for its own lifetime.
 class LocalCharset {
 public:
     explicit LocalCharset(char const* name) { Charset::setLocal(name); }
@@ -178,10 +178,10 @@ namespace {
 
 using Environment = std::vector<std::pair<std::string, std::string>>;
 
-/// What `locale_child` prints under an environment: the UTF-8 form of its local text, or "invalid".
+/// Runs `locale_child` in an environment. \return its local text in UTF-8, or "invalid"
 std::string childUnder(Environment const& environment, std::string const& hexText) {
     Child child{"locale_child", {hexText}, {{"LC_ALL", ""}, {"LC_CTYPE", ""}, {"LANG", ""}}, ""};
-    // The C library never releases what it makes of LOCPATH.
+    // The C library leaks what it allocates for LOCPATH.
     child.environment.emplace_back("ASAN_OPTIONS", "detect_leaks=0");
     child.environment.insert(child.environment.end(), environment.begin(), environment.end());
     ChildResult const result = run(child);
@@ -205,7 +205,7 @@ TEST(CharsetPosix, takes_the_character_set_from_the_environment) {
              Case{{}, {}, "41", "41"},
              Case{{}, {{"LANG", "C.UTF-8"}}, "c3a4", "c3a4"},
              Case{{}, {{"LC_ALL", "C"}, {"LANG", "C.UTF-8"}}, "c3a4", "invalid"},
-             // Locales that are not installed tell their set by their name.
+             // The name of a locale that is not installed states its character set.
              Case{{}, {{"LC_ALL", "xx_XX.ISO-8859-15"}}, "a4", "e282ac"},
              Case{{}, {{"LC_CTYPE", "xx_XX.KOI8-R@modifier"}, {"LANG", "C"}}, "c1", "d0b0"},
              Case{{}, {{"LANG", "xx_XX"}}, "e4", "invalid"},

@@ -1,5 +1,5 @@
-// Comparing narrow text at every length, at every place of a difference or a zero, and across pages: the short
-// cuts have seams at 4, 8, 16, 32, 64, 128 and 256 bytes and where a page ends.
+// Compares narrow texts of every length, with a difference or a zero at every place, and across pages: the code paths
+// change at 4, 8, 16, 32, 64, 128 and 256 bytes and at the end of a page.
 
 #include "tests/text/naive_order.h"
 #include "tests/text/pages.h"
@@ -15,7 +15,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// Compares two strings of one kind in every way, beside plain loops.
+/// Compares two strings of one kind in every way and checks the results against plain loops.
 template <std::uint64_t N>
 void expectLikeRuntime(BufStr<N> const& a, BufStr<N> const& b) {
     int const order = naiveOrder(a, b);

@@ -1,4 +1,4 @@
-// Linux only, as the page behind a text is taken away here.
+// The page behind a text is made unreadable here.
 
 #include "basis/text/text_pair.h"
 #include "tests/text/last_page_posix.h"

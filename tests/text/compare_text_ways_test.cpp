@@ -1,4 +1,4 @@
-// The ways in which processors without long vectors compare texts, on whatever processor this is.
+// Runs the code for processors without long vectors on every processor.
 
 #include "basis/text/text_pair.h"
 #include "tests/text/naive_order.h"

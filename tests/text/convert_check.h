@@ -1,5 +1,5 @@
 /// \file
-/// What the tests of conversions share.
+/// Helpers of the tests of conversions.
 
 #ifndef TESTS_TEXT_CONVERT_CHECK_H
 #define TESTS_TEXT_CONVERT_CHECK_H
@@ -17,7 +17,7 @@ inline ZOR_Basis::Convert::Encoding encoding(std::uint32_t value) {
     return static_cast<ZOR_Basis::Convert::Encoding>(value);
 }
 
-/// A result that was there before, on the heap, so that a function that forgets to empty its output is seen.
+/// An output with a previous content on the heap, which shows whether a function empties its output.
 template <class Text>
 Text filled() {
     Text text;

@@ -1,4 +1,4 @@
-// Code pages, which only Windows has; charset_posix_test.cpp is its counterpart.
+// Code pages of Windows. Their counterpart is in charset_posix_test.cpp.
 
 #include "basis/platform/windows_api_win.h"
 
@@ -68,7 +68,7 @@ TEST(ConvertCodePagesWin, put_a_default_for_what_they_lack) {
 
 TEST(ConvertCodePagesWin, refuse_a_byte_without_a_character) {
     WBStr wide;
-    // 1252 as the system has it maps every byte; so only the multi-byte path can fail, through UTF-8.
+    // The system's code page 1252 maps every byte, so only the multi-byte path can fail, through UTF-8.
     EXPECT_TRUE(Convert::LocalToWide("\x81", wide));
     EXPECT_EQ(wide.size(), 1u);
     EXPECT_FALSE(Convert::ToWide(Convert::ENC_UTF8, "\x81", wide));

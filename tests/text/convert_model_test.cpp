@@ -1,4 +1,4 @@
-// Conversions of random texts beside a second reading.
+// Compares conversions of random texts with those of a second, plain implementation.
 
 #include "tests/text/convert_check.h"
 
@@ -22,7 +22,7 @@ std::uint32_t randomCharacter(std::mt19937_64& random) {
     }
 }
 
-/// Runs of the same kind of character, as the conversions treat those apart.
+/// Runs of one kind of character, because the conversions have a path for each kind.
 std::vector<std::uint32_t> randomCharacters(std::mt19937_64& random) {
     std::vector<std::uint32_t> found;
     for (std::uint64_t run = random() % 5; run > 0; --run) {

@@ -20,7 +20,7 @@ TEST(Convert, breathes) {
 
 namespace {
 
-/// Whether a conversion succeeds and empties the text that was there before.
+/// \return whether a conversion succeeds and empties its output
 template <class Text, class Conversion>
 bool empties(Conversion convert) {
     Text text = filled<Text>();

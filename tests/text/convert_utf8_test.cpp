@@ -122,7 +122,7 @@ TEST(ConvertUtf8ToWide, refuses_every_kind_of_invalid_text_and_leaves_nothing) {
 }
 
 TEST(ConvertUtf8ToWide, never_reads_past_the_given_length) {
-    // Cut right behind the first, second and third byte of four, with the rest of the character lying behind.
+    // The length ends after the first, second and third byte of four; the rest of the character follows in memory.
     char const text[] = "ab\xF0\x9F\x98\x80";
     WBStr wide;
     for (std::uint64_t length : {3u, 4u, 5u}) EXPECT_FALSE(Convert::Utf8ToWide(text, wide, length)) << length;

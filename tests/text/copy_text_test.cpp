@@ -1,5 +1,5 @@
-// Copying narrow text at every length, at every place of a zero, and across pages: the short
-// cuts have seams at 4, 8, 16, 32, 64, 128 and 256 bytes and where a page ends.
+// Copies narrow texts of every length, with a zero at every place, and across pages: the code paths change at 4, 8, 16,
+// 32, 64, 128 and 256 bytes and at the end of a page.
 
 #include "tests/text/pages.h"
 #include "tests/text/string_kinds.h"

@@ -1,4 +1,4 @@
-// Random operations on HeapStr beside a standard string and a capacity.
+// Applies random operations to a HeapStr and to its model, a standard string with a capacity.
 
 #include "tests/support/operations.h"
 #include "tests/support/random_steps.h"
@@ -48,11 +48,11 @@ public:
         for (char& c : result) c = oneIn(30) ? '\0' : static_cast<char>('A' + below(60));
         return result;
     }
-    /// A length that is given with a text, sometimes beyond its end.
+    /// A length for a text, sometimes beyond its end.
     std::uint64_t lengthFor(std::string const& units) {
         return oneIn(3) ? units.size() + below(4) : below(units.size() + 1);
     }
-    /// Where a part of its own text begins.
+    /// An index into the string's own text.
     std::uint64_t place() { return below(model.content.size() + 1); }
 
     template <class... Arguments>

@@ -69,7 +69,7 @@ TEST(HeapStr, Kept_text_13_a_length_of_zero_is_empty_and_never_measured) {
     s = "old";
     s = Str("abc", 0);
     EXPECT_TRUE(s.empty());
-    EXPECT_EQ(contentOfAny(HeapStr("\0ab", 3)), std::string(3, '\0')) << "and an empty text keeps its length";
+    EXPECT_EQ(contentOfAny(HeapStr("\0ab", 3)), std::string(3, '\0')) << "an empty text keeps its length";
 }
 
 TEST(HeapStr, assigns_every_kind_of_source) {

@@ -1,4 +1,4 @@
-// How BufStr<15>, BufStr<255> and WBStr are made and assigned.
+// Construction and assignment of BufStr<15>, BufStr<255> and WBStr.
 
 #include "tests/support/table.h"
 #include "tests/text/inline_text_suite.h"
@@ -187,7 +187,7 @@ TYPED_TEST(InlineTextAssign, assigning_itself_or_its_own_text_changes_nothing) {
     s = static_cast<View const&>(same);
     s = static_cast<Char const*>(same);
     EXPECT_EQ(contentOf(s), before);
-    EXPECT_TRUE(isInside(s)) << "although assigning as many units of another text would move it";
+    EXPECT_TRUE(isInside(s)) << "assigning another text of this size would move it to the heap";
 }
 
 TYPED_TEST(InlineTextAssign, assigns_parts_of_its_own_text) {

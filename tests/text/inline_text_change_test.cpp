@@ -1,4 +1,4 @@
-// How BufStr<15>, BufStr<255> and WBStr append, insert, replace and cut.
+// Appending, inserting, replacing and cutting in BufStr<15>, BufStr<255> and WBStr.
 
 #include "tests/support/table.h"
 #include "tests/text/inline_text_suite.h"
@@ -79,7 +79,7 @@ TYPED_TEST(InlineTextChange, appends_parts_of_its_own_text) {
     behindZero[2] = Char();
     Text const tail = TestFixture::letters(N).substr(3);
     behindZero += static_cast<Char const*>(behindZero) + 3;
-    EXPECT_EQ(contentOf(behindZero).substr(N), tail) << "what the growing drops has been read before";
+    EXPECT_EQ(contentOf(behindZero).substr(N), tail) << "the source is read before growing drops it";
 }
 
 namespace {

@@ -1,4 +1,4 @@
-// Random operations on BufStr<15>, BufStr<255> and WBStr, each beside its model.
+// Applies random operations to BufStr<15>, BufStr<255> and WBStr and to their model.
 
 #include "tests/support/operations.h"
 #include "tests/support/random_steps.h"
@@ -39,7 +39,7 @@ struct InlineTextBesideModel {
         if (oneIn(20)) return static_cast<Char>(0x80 + below(0x80));
         return static_cast<Char>('a' + below(26));
     }
-    /// Mostly short, often around the size of the area.
+    /// Mostly short, often close to the size of the inside area.
     std::uint64_t length() {
         switch (below(8)) {
         case 0:
@@ -59,8 +59,8 @@ struct InlineTextBesideModel {
         return result;
     }
 
-    /// A source as the string gets it and as the model sees it: text of its own block, null, or part of the string's
-    /// text.
+    /// A source as the string and as the model receives it: text in a block of its own, null, or part of the string's
+    /// own text.
     struct Given {
         Char const* pointer;
         Source model;
@@ -74,7 +74,7 @@ struct InlineTextBesideModel {
             return {static_cast<Char const*>(*string) + from, {model->content.substr(from), given}, nullptr};
         }
         Text const units = text();
-        // Exactly as long as it must be, so that a sanitizer sees every read too far.
+        // Exactly large enough, so that a sanitizer sees every read beyond the end.
         std::uint64_t const size = std::min<std::uint64_t>(units.find(Char()), units.size()) + 1;
         auto block = std::make_unique<Char[]>(size);
         std::copy_n(units.c_str(), size, block.get());
@@ -82,7 +82,7 @@ struct InlineTextBesideModel {
         return {pointer, {units, given}, std::move(block)};
     }
 
-    /// Mostly a place within the text, sometimes behind it.
+    /// An index, mostly within the text, sometimes behind its end.
     std::uint64_t place() {
         std::uint64_t const size = model->content.size();
         return oneIn(8) ? size + below(3) : below(size + 1);
@@ -105,7 +105,7 @@ struct InlineTextBesideModel {
         model.emplace(N);
         model->assign({units, given});
     }
-    /// The copy of a copy has zeros behind the first one, as the first copy has.
+    /// Replaces the string by its copy, in which only zeros follow the first zero.
     void makeOfItself() {
         String const copy(*string);
         Source const s{model->content, model->content.size()};

@@ -1,5 +1,5 @@
 /// \file
-/// What the suites of all strings with an inside area share.
+/// The fixture of the suites for strings with an inside area.
 
 #ifndef TESTS_TEXT_INLINE_TEXT_SUITE_H
 #define TESTS_TEXT_INLINE_TEXT_SUITE_H

@@ -1,4 +1,4 @@
-// The area and the block of BufStr<15>, BufStr<255> and WBStr, one suite over all three.
+// The inside area and the heap block of BufStr<15>, BufStr<255> and WBStr; one suite for all three.
 
 #include "tests/support/table.h"
 #include "tests/text/inline_text_suite.h"
@@ -92,7 +92,7 @@ TYPED_TEST(InlineTextArea, a_growing_string_keeps_its_text_up_to_an_inner_zero) 
     fits[1] = Char();
     fits.add(make<String>("e").c_str());
     EXPECT_EQ(contentOf(fits), make<String>(std::string_view("a\0cde", 5)))
-        << "nothing is copied while the capacity lasts";
+        << "nothing is copied while the capacity suffices";
 }
 
 TYPED_TEST(InlineTextArea, Kept_text_07_a_string_never_leaves_the_heap) {

@@ -1,4 +1,4 @@
-// The units of BufStr<15>, BufStr<255> and WBStr: by index, counted on, and hashed.
+// Single units of BufStr<15>, BufStr<255> and WBStr by index and in NextLatin, and their hashes.
 
 #include "tests/support/table.h"
 #include "tests/text/inline_text_suite.h"

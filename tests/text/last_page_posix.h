@@ -1,5 +1,5 @@
 /// \file
-/// Texts at the end of what can be read.
+/// Texts at the end of readable memory.
 
 #ifndef TESTS_TEXT_LAST_PAGE_POSIX_H
 #define TESTS_TEXT_LAST_PAGE_POSIX_H
@@ -9,7 +9,7 @@
 #include <cstring>
 #include <string>
 
-/// Two pages, of which the second cannot be read.
+/// Two pages; the second is unreadable.
 class LastPage {
 public:
     LastPage() {

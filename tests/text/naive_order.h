@@ -4,7 +4,7 @@
 #ifndef TESTS_TEXT_NAIVE_ORDER_H
 #define TESTS_TEXT_NAIVE_ORDER_H
 
-/// -1, 0 or 1.
+/// \return -1, 0 or 1
 inline int signOf(int order) { return (order > 0) - (order < 0); }
 
 /// The order of two terminated texts.

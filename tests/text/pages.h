@@ -10,7 +10,7 @@
 
 inline constexpr std::size_t PAGE_SIZE = 4096;
 
-/// Room whose byte 0 begins a page. No byte is zero but the terminators of its texts.
+/// Memory that begins at a page boundary. Only the terminators of its texts are zero.
 class Pages {
 public:
     Pages() { std::memset(room_.get(), '~', 4 * PAGE_SIZE); }

@@ -1,5 +1,5 @@
 /// \file
-/// Mixtures of all kinds of characters, and rooms for what they are converted to.
+/// Random mixtures of all kinds of characters, and outputs for their conversion.
 
 #ifndef TESTS_TEXT_RANDOM_UTF_H
 #define TESTS_TEXT_RANDOM_UTF_H
@@ -40,7 +40,7 @@ inline std::vector<std::uint32_t> randomText(Source& source) {
     return text;
 }
 
-/// An output whose room is followed by units that must stay as they are.
+/// An output that is followed by units that must not change.
 template <class Char>
 struct Output {
     static constexpr std::size_t BEHIND = 32;
@@ -58,7 +58,7 @@ inline std::uint64_t someRoom(Source& source, std::uint64_t needed) {
     return needed + around > 20 ? needed + around - 20 : 0;
 }
 
-/// A character anywhere among others: the others, the one.
+/// The character of which a text consists, and the one that differs.
 inline constexpr std::array<std::pair<std::uint32_t, std::uint32_t>, 10> PAIRS = {{{0x41, 0},
                                                                                    {0x41, 0xE9},
                                                                                    {0x41, 0x20AC},
@@ -70,7 +70,7 @@ inline constexpr std::array<std::pair<std::uint32_t, std::uint32_t>, 10> PAIRS =
                                                                                    {0x1F600, 0x20AC},
                                                                                    {0x1F600, 0}}};
 
-/// Calls with each text of up to 80 characters in which one is another than the rest.
+/// Calls `check` with each text of up to 80 equal characters of which one is replaced.
 template <class Check>
 void forOneAmongOthers(Check check) {
     for (auto const& [others, one] : PAIRS) {
@@ -84,7 +84,7 @@ void forOneAmongOthers(Check check) {
     }
 }
 
-/// Calls with texts that are longer than one round of sums holds.
+/// Calls `check` with texts that are longer than one round of the length's sums.
 template <class Check>
 void forLongTexts(Check check) {
     for (std::uint32_t character : {0x41u, 0xE9u, 0x20ACu, 0x1F600u})

@@ -1,6 +1,6 @@
 /// \file
-/// A second, slow and plain reading of UTF-8 and UTF-16, by tables of ranges (RFC 3629, section 4). The conversions are
-/// compared with it.
+/// A second, slow and plain decoder of UTF-8 and UTF-16, by tables of ranges (RFC 3629, section 4), with which the
+/// conversions are compared.
 
 #ifndef TESTS_TEXT_REFERENCE_UTF_H
 #define TESTS_TEXT_REFERENCE_UTF_H
@@ -45,7 +45,7 @@ inline bool fits(std::string const& text, std::size_t at, std::vector<Range> con
     return true;
 }
 
-/// The characters of a UTF-8 text; nothing if it is not well formed.
+/// The characters of a UTF-8 text; no value if it is not well formed.
 inline std::optional<std::vector<std::uint32_t>> characters(std::string const& text) {
     std::vector<std::uint32_t> found;
     for (std::size_t at = 0; at < text.size();) {

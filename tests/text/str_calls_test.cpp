@@ -1,5 +1,5 @@
-// Every stated way to make, assign, extend and stream a narrow text keeps its meaning, whatever other overloads there
-// are. Where two overloads could be taken their effects differ, so that the row tells which one was.
+// Every documented way to construct, assign, extend and stream a narrow text keeps its meaning, whatever overloads are
+// added. Where two overloads are viable, their effects differ, so that the result shows which one was chosen.
 
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text.h"
@@ -19,7 +19,7 @@ namespace {
 template <class Text>
 class StrCalls : public testing::Test {
 protected:
-    /// An array that is longer than its text.
+    /// Longer than its text.
     char array[8] = {'a', 'b', 'c', '\0', 'x', 'y', 'z', '\0'};
     char* const writable = array;
     char const* const plain = array;
@@ -104,8 +104,8 @@ TYPED_TEST(StrCalls, take_a_literal_0_for_a_null_pointer) {
     EXPECT_TRUE(text == 0 && 0 == text && !(text != 0) && text <= 0 && 0 >= text && !(text < 0));
     EXPECT_EQ(contentOfAny(FPath("a").add(0)), "a");
     EXPECT_EQ(contentOfAny(FPath("a") += 0), "a");
-    EXPECT_EQ(contentOfAny(BufStr<15>("a").add(0)), "a") << "or for a byte, which appends nothing either";
-    EXPECT_EQ(contentOfAny(BufStr<15>("a") << 0), "a0") << "but for a number, where a number is stated";
+    EXPECT_EQ(contentOfAny(BufStr<15>("a").add(0)), "a") << "or for a zero byte, which appends nothing either";
+    EXPECT_EQ(contentOfAny(BufStr<15>("a") << 0), "a0") << "but for a number where an overload takes one";
 }
 
 #pragma GCC diagnostic pop

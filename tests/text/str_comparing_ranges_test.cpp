@@ -1,4 +1,4 @@
-// Ranges that clang 14 cannot compile with this standard library, whatever they hold.
+// Range algorithms that clang 14 cannot compile with this standard library, for any element type.
 
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text.h"

@@ -1,5 +1,5 @@
-// Narrow texts compare as texts with each other, with plain text and with standard strings: from both sides, through
-// operators and through the standard's function objects.
+// Narrow texts compare by content with each other, with plain text and with standard strings: on either side of an
+// operator, and through the standard's function objects.
 
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/text.h"
@@ -22,7 +22,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// A text of each kind, in memory of its own.
+/// Holds a text of each kind in its own memory.
 template <class T>
 struct Held {
     explicit Held(std::string const& text) : own(text), value(own) {}
@@ -65,7 +65,7 @@ struct Held<std::string_view> {
     std::string_view value;
 };
 
-/// The names of those comparisons that do not say what they should.
+/// Collects the names of comparisons whose results are wrong.
 struct Findings {
     void check(char const* name, bool result, bool expected) {
         if (result != expected) names += std::string(name) + " ";
@@ -123,7 +123,7 @@ std::vector<std::string> const& words() {
     return all;
 }
 
-/// Every word against every other one, so that no order of addresses fits all of them.
+/// Compares every word with every other, so that no order of addresses gives the expected results.
 template <class A, class B>
 void compareAll(bool throughRanges) {
     for (std::string const& one : words()) {

@@ -58,7 +58,7 @@ bool isTerminated(String const& s) {
     return static_cast<typename Kind<String>::Char const*>(s)[s.size()] == 0;
 }
 
-/// A text in a block of its own without a unit behind its terminator, so that a sanitizer sees what reads too far.
+/// A text in its own block, which ends with the terminator, so that a sanitizer sees every read beyond it.
 template <class Char>
 struct Exact {
     explicit Exact(std::basic_string<Char> const& text) : units(text.begin(), text.end()) { units.push_back(0); }

@@ -1,6 +1,6 @@
 /// \file
-/// A naive model of the strings with an inside area: what they hold, their capacity, and where they are. Every rule is
-/// written out step by step over plain standard strings.
+/// A naive model of the strings with an inside area: their content, their capacity, and whether they are on the heap.
+/// Every rule is written out over plain standard strings.
 
 #ifndef TESTS_TEXT_TEXT_MODEL_H
 #define TESTS_TEXT_TEXT_MODEL_H
@@ -9,7 +9,7 @@
 #include <cstdint>
 #include <string>
 
-/// A source: the units that lie before its own end, which a zero follows, and the length that the caller gives.
+/// A source: its units, which a zero follows, and the length that the caller gives.
 template <class Char>
 struct ModelSource {
     std::basic_string<Char> units;
@@ -79,7 +79,7 @@ public:
     void cut(std::uint64_t n) {
         if (n < content.size()) content.resize(n);
     }
-    /// After the first units of the buffer have been written, a zero behind them where there is room.
+    /// Follows a direct write into the buffer, with a zero behind the units where there is room.
     void written(Text const& units, std::uint64_t n) {
         std::uint64_t length = std::min<std::uint64_t>(units.find(Char()), units.size());
         length = std::min(length, capacity);

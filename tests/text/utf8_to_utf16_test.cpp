@@ -1,5 +1,5 @@
-// The conversion from UTF-8 to UTF-16 against a second, slow reading: mixtures of all kinds of characters, so that
-// blocks and runs end at every place, in rooms that are too small, just large enough and larger.
+// Compares the conversion from UTF-8 to UTF-16 with a second, slow one. The texts mix all kinds of characters, so that
+// blocks and runs end at every place; the outputs are too small, just large enough, and larger.
 
 #include "tests/text/random_utf.h"
 

@@ -28,7 +28,7 @@ class ViewOpsOfBufStr : public testing::Test {};
 using ViewedBufStrs = testing::Types<BufStr<15>, BufStr<255>>;
 TYPED_TEST_SUITE(ViewOpsOfBufStr, ViewedBufStrs, );
 
-/// Not terminated: a sanitizer sees what reads behind the end.
+/// Not terminated, so that a sanitizer sees every read behind the end.
 struct Unterminated {
     explicit Unterminated(std::string_view text) : bytes(text.begin(), text.end()) {}
     operator std::string_view() const { return {bytes.data(), bytes.size()}; }

@@ -18,7 +18,7 @@ using WText = std::basic_string<WChar>;
 #pragma GCC diagnostic ignored "-Wnon-virtual-dtor" // as WBStr itself, never deleted through a base
 #endif
 
-/// Writes down what it asks of its heap.
+/// Records its calls of the heap.
 class Recording : public WBStr {
 public:
     using WBStr::operator=;

@@ -1,4 +1,4 @@
-// Wide texts compare only as their headers say; what else must not compile.
+// Wide texts have only the comparisons that their headers declare; no other compiles.
 
 #include "zor_basis/files/f_path.h"
 #include "zor_basis/files/wc_path.h"
@@ -67,7 +67,7 @@ template <class A, class B>
 inline constexpr bool IS_INCOMPARABLE = !Equal<A, B> && !Unequal<A, B> && !TAKES<std::equal_to<>, A, B> &&
                                         HAS_NO_STRICT_ORDER<A, B> && HAS_NO_OTHER_ORDER<A, B>;
 
-/// Wide texts: equality with all, "<" and ">" between themselves, nothing else.
+/// Equality with all the others, "<" and ">" between wide texts, no other comparison.
 template <class Wide, class... Others>
 inline constexpr bool IS_AS_DECLARED = (... && (HAS_EQUALITY<Wide, Others> && HAS_STRICT_ORDER<Wide, Others> &&
                                                 HAS_NO_OTHER_ORDER<Wide, Others>));

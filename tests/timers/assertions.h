@@ -1,5 +1,5 @@
 /// \file
-/// Hears the assertions of the platform layer instead of having them on standard error.
+/// Records the assertions of the platform layer, which then do not go to standard error.
 
 #ifndef TESTS_TIMERS_ASSERTIONS_H
 #define TESTS_TIMERS_ASSERTIONS_H
@@ -15,7 +15,7 @@ public:
     Assertions& operator=(Assertions const&) = delete;
     ~Assertions() { xos_HostSetAssertHandler(nullptr, nullptr); }
 
-    /// What was heard since the last call, as "LINE MODULE MESSAGE;" for each.
+    /// The assertions since the last call, each as "LINE MODULE MESSAGE;".
     std::string take() {
         std::string heard;
         heard.swap(heard_);

@@ -1,5 +1,5 @@
 /// \file
-/// What the assertions of misused timers say, as `Assertions` hears it.
+/// The assertions of misused timers, as `Assertions` records them.
 
 #ifndef TESTS_TIMERS_COMPLAINTS_H
 #define TESTS_TIMERS_COMPLAINTS_H

@@ -1,4 +1,4 @@
-// What both scope timers do with the pile that they drive.
+// What both scope timers have in common.
 
 #include <zor_basis/timers.h>
 

@@ -1,5 +1,5 @@
 /// \file
-/// Timers whose statistics can be seen, and measurements that took as long as a test wants.
+/// Timers with visible statistics, and measurements of any length.
 
 #ifndef TESTS_TIMERS_OPENED_H
 #define TESTS_TIMERS_OPENED_H
@@ -31,7 +31,7 @@ inline std::ostream& operator<<(std::ostream& out, Statistics const& s) {
                << s.suspendMax;
 }
 
-/// A pile with its statistics laid open.
+/// A pile with visible statistics.
 template <class Pile>
 class Opened : public Pile {
 public:
@@ -64,7 +64,7 @@ inline void pileUp(ZOR_Basis::PileTimer& pile, std::int64_t elapsed, std::int64_
     pile.addTotal(timer);
 }
 
-/// How many measurements a row of the timer tells.
+/// The number of measurements in the timer's row.
 inline std::string countOf(ZOR_Basis::PileTimer* timer) {
     ZOR_Basis::BufStr<255> line;
     timer->print(line, 1);
@@ -76,7 +76,7 @@ inline bool isIdle(zbTimerDat const& record) {
     return record.start == 0 && record.stop == 0 && record.suspendStart == 0 && record.suspended == 0;
 }
 
-/// Waits until the counter has moved. \return a reading after that
+/// Waits until the counter advances. \return its new value
 inline std::int64_t nextTick() {
     std::int64_t const before = ZOR_Basis::BaseTimer::Clock();
     std::int64_t now = before;

@@ -1,4 +1,4 @@
-// A pile driven by random measurements beside a list of them.
+// Compares a pile with a list of its random measurements.
 
 #include <zor_basis/timers.h>
 
@@ -22,7 +22,7 @@ struct Measured {
     std::int64_t elapsed, suspended;
 };
 
-/// The statistics by going over the list.
+/// Computes the statistics from the list.
 Statistics statistics(std::vector<Measured> const& list) {
     Statistics s;
     for (Measured const& m : list) {
@@ -42,10 +42,10 @@ Statistics statistics(std::vector<Measured> const& list) {
     return s;
 }
 
-/// A pile, and the list of what it was given.
+/// A pile, and the list of its measurements.
 struct PileBesideList {
     std::int64_t below(std::uint64_t n) { return static_cast<std::int64_t>(random() % n); }
-    /// Of any magnitude up to 2 to the 44th.
+    /// A time of any magnitude up to 2 to the power of 44.
     std::int64_t ticks() { return below(std::uint64_t{1} << below(45)); }
 
     void measure(std::int64_t elapsed, std::int64_t suspended) {
@@ -59,7 +59,7 @@ struct PileBesideList {
     std::vector<Measured> list;
 };
 
-/// What the row tells of the statistics.
+/// The numbers of the row for the statistics.
 RowNumbers inUnits(Statistics const& s, int units) {
     auto const convert = [units](std::int64_t ticks) {
         std::int64_t const frequency = OpenedPile::frequency();

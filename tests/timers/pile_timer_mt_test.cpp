@@ -14,7 +14,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// Lets calls of the platform layer fail and counts them.
+/// Removes the faults that a test has set in the platform layer.
 class PileTimerMTOnHost : public testing::Test {
 protected:
     ~PileTimerMTOnHost() override { xos_HostFailClear(); }
@@ -72,7 +72,7 @@ TEST_F(PileTimerMTOnHost, loses_nothing_of_many_threads) {
     EXPECT_EQ(statistics.total, THREADS * EACH * (EACH + 1) / 2);
     EXPECT_EQ(statistics.max, EACH);
     EXPECT_EQ(statistics.min, 1);
-    EXPECT_EQ(statistics.minCount, 1) << "the first of all is one of 1 tick";
+    EXPECT_EQ(statistics.minCount, 1) << "the first measurement of a thread takes 1 tick";
     EXPECT_EQ(statistics.suspendTotal, THREADS * EACH / 2);
     EXPECT_EQ(statistics.suspendMax, 1);
 }

@@ -1,4 +1,4 @@
-// Rows of piles beside rows made the long way round.
+// Compares the rows of piles with those of the plain model.
 
 #include <zor_basis/timers.h>
 

@@ -229,7 +229,7 @@ TEST(PileTimer, copies_everything) {
         EXPECT_EQ(copy->suspendStart, original.suspendStart);
     }
     assigned.start(false);
-    EXPECT_EQ(assertions.take(), ALREADY_STARTED) << "the checks went over";
+    EXPECT_EQ(assertions.take(), ALREADY_STARTED) << "the copy checks, too";
 }
 
 TEST(PileTimer, absorbs_null) {

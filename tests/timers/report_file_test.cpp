@@ -37,7 +37,7 @@ protected:
         for (auto const& entry : fs::directory_iterator(folder())) fs::remove(entry);
     }
 
-    /// Made with the registry.
+    /// The registry makes it.
     static fs::path folder() {
         TimerMgr::Mgr();
         return scratchRoot() / "timer";
@@ -185,7 +185,7 @@ TEST_F(ReportFileInFolder, makes_its_folder_again_where_it_was_removed) {
     EXPECT_EQ(heard.take(), "");
     xos_HostCallsReset();
     manager.resetTimers(true);
-    EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 0u) << "one that is there is not made";
+    EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 0u) << "an existing folder is not made again";
     fs::remove_all(folder());
     manager.resetTimers(false);
     EXPECT_FALSE(fs::exists(folder())) << "only for a report";

@@ -1,5 +1,5 @@
 /// \file
-/// A report row, made the long way round.
+/// A plain model of a report row.
 
 #ifndef TESTS_TIMERS_REPORT_MODEL_H
 #define TESTS_TIMERS_REPORT_MODEL_H
@@ -9,7 +9,7 @@
 #include <cstdint>
 #include <string>
 
-/// A number with its groups of three digits, as text.
+/// A number as text with its groups of three digits separated.
 inline std::string grouped(std::int64_t value, char separator) {
     std::string text = std::to_string(value);
     std::size_t const first = value < 0 ? 1 : 0;

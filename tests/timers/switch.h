@@ -1,5 +1,5 @@
 /// \file
-/// A manager of no timers, for what asks no more than whether it is active.
+/// A manager without timers, for tests of objects that only ask whether it is active.
 
 #ifndef TESTS_TIMERS_SWITCH_H
 #define TESTS_TIMERS_SWITCH_H

@@ -16,7 +16,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// Lets calls of the platform layer fail and counts them.
+/// Removes the faults that a test has set in the platform layer.
 class TimerMgrImplOnHost : public testing::Test {
 protected:
     ~TimerMgrImplOnHost() override { xos_HostFailClear(); }
@@ -77,7 +77,7 @@ TEST_F(TimerMgrImplOnHost, Kept_timers_09_a_displaced_timer_stays_alive) {
         manager.setActive(true);
         pileUp(*first, 5);
         manager.reset(false);
-        EXPECT_EQ(countOf(first), "1") << "its manager knows it no longer";
+        EXPECT_EQ(countOf(first), "1") << "the manager no longer owns it";
     }
     EXPECT_STREQ(first->cname(), "first");
     delete first;
@@ -102,7 +102,7 @@ TEST_F(TimerMgrImplOnHost, resets_only_while_active) {
     manager.reset(false);
     EXPECT_EQ(countOf(timer), "1");
     manager.resetTimers(false);
-    EXPECT_EQ(countOf(timer), "0") << "asked directly it resets at any time";
+    EXPECT_EQ(countOf(timer), "0") << "a direct call resets even an inactive manager";
 }
 
 TEST_F(TimerMgrImplOnHost, works_without_semaphores_and_gives_back_only_what_it_took) {

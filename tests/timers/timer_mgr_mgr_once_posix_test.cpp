@@ -1,11 +1,11 @@
-// Where the root is the whole file system, its path has no text.
+// If the root is that of the whole file system, its path is empty.
 
 #include "tests/support/child.h"
 
 #include <gtest/gtest.h>
 
 TEST(TimerMgrMgrOncePosix, reports_beneath_the_root_of_the_file_system) {
-    // Both calls fail, so that nothing is left there.
+    // Both calls fail, so that nothing is created there.
     ChildResult const result = run({"timers_child",
                                     {"new", "report", "folder"},
                                     {{"XOS_ROOT", "/"}, {"XOS_FAULTS", "xos_DirCreateEx:0:9,xos_FileOpen:0:9"}},

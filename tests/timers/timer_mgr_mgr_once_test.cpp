@@ -1,4 +1,4 @@
-// The registry is made once in a process, so each case has a child of its own.
+// The registry is made once in a process, so each case runs a child process.
 
 #include "tests/support/child.h"
 #include "tests/support/scratch_root.h"
@@ -28,7 +28,7 @@ protected:
 
     using Names = std::set<std::string>;
 
-    /// The reports without their seconds: two of the same name are one file or two, as the clock will have it.
+    /// The names without their seconds: two reports make one file or two, depending on the clock.
     Names reports(fs::path const& folder) {
         Names names;
         for (auto const& entry : fs::directory_iterator(folder)) {
@@ -71,7 +71,7 @@ TEST_F(TimerMgrMgrOnce, goes_on_without_a_folder) {
     EXPECT_FALSE(fs::exists(root_ / "timer"));
     EXPECT_EQ(after({"new", "report", "get"}, root, "xos_DirCreateEx:0:1"), "report\nfound\n");
     EXPECT_EQ(reports(root_ / "timer"), (Names{"_child_0.timer"}))
-        << "made for the report, when it was not with the registry";
+        << "the report makes the folder that the registry could not make";
     EXPECT_EQ(after({"new", "report", "get"}, (root_ / "missing").generic_string()), "report\nfound\n");
     EXPECT_FALSE(fs::exists(root_ / "missing")) << "parents are not made";
 }

@@ -55,7 +55,7 @@ bool measured(TimerMgr& manager, PileTimer const& timer, How const& how) {
     return started && suspended && resumed && !timer.started();
 }
 
-/// A manager with one timer, whose id is 3.
+/// A manager with one timer of the id 3.
 struct OneTimer {
     static constexpr std::uint64_t ID = 3;
     TimerMgrImpl manager{"drives", 5};
@@ -145,7 +145,7 @@ void measure(TimerMgr* manager, Stage&& stage) {
     TimerMgr::stop(manager, stage);
 }
 
-/// Measures by every type that converts to the id 3 or to the timer, and once by null.
+/// Measures with every type that converts to the id 3 or to the timer, and once with null.
 void measureByAllTypes(TimerMgr* manager, PileTimer* timer, PileTimerAuto& driver) {
     enum Stage { LOAD, PARSE, RENDER, PRINT };
     std::atomic<std::uint64_t> const sharedId{3};
