@@ -21,7 +21,7 @@ std::string plain(WChar const* name) {
     return text;
 }
 
-struct DirIteratorTest : testing::Test {
+struct DirIteratorInAFolder : testing::Test {
     WideText here() const { return wide(scratch.path()); }
 
     static Names namesOf(DirIterImplW& list) {
@@ -35,7 +35,7 @@ struct DirIteratorTest : testing::Test {
 
 } // namespace
 
-TEST_F(DirIteratorTest, breathes) {
+TEST_F(DirIteratorInAFolder, breathes) {
     put(scratch / "page 1.tif", "123");
     DirIteratorW list(LOOK_ALL, here().c_str());
     WChar const* const name = list->next();
@@ -48,7 +48,7 @@ TEST_F(DirIteratorTest, breathes) {
     EXPECT_EQ(list->lastError(), 18u);
 }
 
-TEST_F(DirIteratorTest, answers_without_an_entry_and_without_a_fault) {
+TEST_F(DirIteratorInAFolder, answers_without_an_entry_and_without_a_fault) {
     put(scratch / "file", "123");
     DirIteratorW list(LOOK_ALL, here().c_str());
     EXPECT_TRUE(list->isFile());
@@ -62,7 +62,7 @@ TEST_F(DirIteratorTest, answers_without_an_entry_and_without_a_fault) {
     EXPECT_LE(list->size(), 3u);
 }
 
-TEST_F(DirIteratorTest, reports_the_kinds_asked_for) {
+TEST_F(DirIteratorInAFolder, reports_the_kinds_asked_for) {
     makeFolder(scratch / "folder");
     makeFolder(scratch / "other");
     put(scratch / "file", "1");
@@ -95,7 +95,7 @@ TEST_F(DirIteratorTest, reports_the_kinds_asked_for) {
     }
 }
 
-TEST_F(DirIteratorTest, tells_what_each_entry_is) {
+TEST_F(DirIteratorInAFolder, tells_what_each_entry_is) {
     makeFolder(scratch / "folder");
     put(scratch / "folder/inside", "not listed");
     put(scratch / "file", "1234");
@@ -116,7 +116,7 @@ TEST_F(DirIteratorTest, tells_what_each_entry_is) {
     EXPECT_EQ(seen, 2);
 }
 
-TEST_F(DirIteratorTest, ends_at_once_in_an_empty_directory) {
+TEST_F(DirIteratorInAFolder, ends_at_once_in_an_empty_directory) {
     for (LookForType type : {LOOK_ALL, LOOK_FILES, LOOK_DIRS}) {
         DirIteratorW list(type, here().c_str());
         EXPECT_EQ(list->lastError(), 0u);
@@ -127,7 +127,7 @@ TEST_F(DirIteratorTest, ends_at_once_in_an_empty_directory) {
     }
 }
 
-TEST_F(DirIteratorTest, says_why_there_is_no_listing) {
+TEST_F(DirIteratorInAFolder, says_why_there_is_no_listing) {
     WideText const missing = here() + wide("/missing");
     DirIteratorW list(LOOK_ALL, missing.c_str());
     EXPECT_EQ(list->next(), nullptr);
@@ -144,7 +144,7 @@ TEST_F(DirIteratorTest, says_why_there_is_no_listing) {
     EXPECT_EQ(none->lastError(), 2u);
 }
 
-TEST_F(DirIteratorTest, matches_its_wildcard) {
+TEST_F(DirIteratorInAFolder, matches_its_wildcard) {
     for (char const* name : {"a.txt", "b.txt", "ab.tif", "c"}) put(scratch / name, "");
     makeFolder(scratch / "d.txt");
     struct Case {
@@ -178,7 +178,7 @@ TEST_F(DirIteratorTest, matches_its_wildcard) {
     }
 }
 
-TEST_F(DirIteratorTest, Kept_list_dir_01_shows_the_wildcard_in_its_path_while_it_lists) {
+TEST_F(DirIteratorInAFolder, Kept_list_dir_01_shows_the_wildcard_in_its_path_while_it_lists) {
     put(scratch / "a", "");
     DirIteratorW list(LOOK_ALL, here().c_str());
     EXPECT_EQ(plain(list->getPath().wstr()), scratch.path());
@@ -193,7 +193,7 @@ TEST_F(DirIteratorTest, Kept_list_dir_01_shows_the_wildcard_in_its_path_while_it
     EXPECT_EQ(plain(list->getPath().wstr()), scratch.path() + "/a?");
 }
 
-TEST_F(DirIteratorTest, starts_again_after_it_was_finished) {
+TEST_F(DirIteratorInAFolder, starts_again_after_it_was_finished) {
     for (char const* name : {"a", "b", "c"}) put(scratch / name, "");
     DirIteratorW list(LOOK_ALL, here().c_str());
     list->finish();
@@ -206,7 +206,7 @@ TEST_F(DirIteratorTest, starts_again_after_it_was_finished) {
     EXPECT_EQ(namesOf(*list.operator->()), (Names{"a", "b", "c"})) << "broken off in the middle";
 }
 
-TEST_F(DirIteratorTest, lists_another_directory_after_its_path_was_replaced) {
+TEST_F(DirIteratorInAFolder, lists_another_directory_after_its_path_was_replaced) {
     makeFolder(scratch / "one");
     makeFolder(scratch / "two");
     put(scratch / "one/a", "");
@@ -223,13 +223,13 @@ TEST_F(DirIteratorTest, lists_another_directory_after_its_path_was_replaced) {
     EXPECT_EQ(plain(list->getPath().wstr()), plain(two.c_str()));
 }
 
-TEST_F(DirIteratorTest, keeps_each_name_until_the_next) {
+TEST_F(DirIteratorInAFolder, keeps_each_name_until_the_next) {
     for (int i = 0; i < 200; ++i) put(scratch / ("name " + std::to_string(i)), "");
     DirIteratorW list(LOOK_FILES, here().c_str());
     EXPECT_EQ(namesOf(*list.operator->()).size(), 200u);
 }
 
-TEST_F(DirIteratorTest, is_given_up_in_the_middle) {
+TEST_F(DirIteratorInAFolder, is_given_up_in_the_middle) {
     for (char const* name : {"a", "b", "c"}) put(scratch / name, "");
     for (int i = 0; i < 3000; ++i) { // more than a process may hold open
         DirIteratorW list(LOOK_ALL, here().c_str());
@@ -237,7 +237,7 @@ TEST_F(DirIteratorTest, is_given_up_in_the_middle) {
     }
 }
 
-TEST_F(DirIteratorTest, knows_sizes_above_four_gigabytes) {
+TEST_F(DirIteratorInAFolder, knows_sizes_above_four_gigabytes) {
     put(scratch / "large", "x");
     std::uint64_t const size = (std::uint64_t{6} << 30) + 1;
     std::filesystem::resize_file(scratch / "large", size);

@@ -17,9 +17,9 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct DirTest : testing::Test {
-    DirTest() { xos_HostCallsReset(); }
-    ~DirTest() override { xos_HostFailClear(); }
+struct DirOnDisk : testing::Test {
+    DirOnDisk() { xos_HostCallsReset(); }
+    ~DirOnDisk() override { xos_HostFailClear(); }
 
     std::string at(std::string const& name) const { return scratch / name; }
     static std::string quoted(std::string const& text) { return "\"" + text + "\""; }
@@ -40,7 +40,7 @@ struct DirTest : testing::Test {
 
 } // namespace
 
-TEST_F(DirTest, breathes) {
+TEST_F(DirOnDisk, breathes) {
     std::string const folder = at("one/two three");
     EXPECT_FALSE(Dir::Exist(folder.c_str()));
     EXPECT_TRUE(Dir::New(folder.c_str(), true));
@@ -50,7 +50,7 @@ TEST_F(DirTest, breathes) {
     EXPECT_EQ(scratch.content(), Names{"one/"});
 }
 
-TEST_F(DirTest, exists_for_entries_of_any_kind) {
+TEST_F(DirOnDisk, exists_for_entries_of_any_kind) {
     put(at("f"), "");
     EXPECT_TRUE(Dir::Exist(at("f").c_str()));
     EXPECT_TRUE(Dir::Exist(scratch.path().c_str()));
@@ -59,7 +59,7 @@ TEST_F(DirTest, exists_for_entries_of_any_kind) {
     EXPECT_FALSE(Dir::Exist(""));
 }
 
-TEST_F(DirTest, is_made_by_one_call_of_the_platform) {
+TEST_F(DirOnDisk, is_made_by_one_call_of_the_platform) {
     EXPECT_TRUE(Dir::New(at("d").c_str(), false));
     EXPECT_EQ(last("xos_DirCreateEx"), "\"d\", 0");
     EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 1u);
@@ -68,7 +68,7 @@ TEST_F(DirTest, is_made_by_one_call_of_the_platform) {
     EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 1u) << "without the platform";
 }
 
-TEST_F(DirTest, is_not_made_where_a_file_is) {
+TEST_F(DirOnDisk, is_not_made_where_a_file_is) {
     put(at("f"), "text");
     EXPECT_FALSE(Dir::New(at("f").c_str(), false));
     EXPECT_FALSE(Dir::New(at("f").c_str(), true));
@@ -78,14 +78,14 @@ TEST_F(DirTest, is_not_made_where_a_file_is) {
     EXPECT_EQ(textOf(at("f")), "text");
 }
 
-TEST_F(DirTest, is_not_made_without_its_parents_unless_asked) {
+TEST_F(DirOnDisk, is_not_made_without_its_parents_unless_asked) {
     EXPECT_FALSE(Dir::New(at("a/b").c_str(), false));
     EXPECT_EQ(scratch.content(), Names{});
     EXPECT_TRUE(Dir::New(at("a/b").c_str(), true));
     EXPECT_EQ(scratch.content(), (Names{"a/", "a/b/"}));
 }
 
-TEST_F(DirTest, has_its_parents_made_from_the_top) {
+TEST_F(DirOnDisk, has_its_parents_made_from_the_top) {
     std::string const path = at("a/b/c/file");
     EXPECT_TRUE(Dir::NewFor(path.c_str()));
     EXPECT_EQ(scratch.content(), (Names{"a/", "a/b/", "a/b/c/"}));
@@ -94,7 +94,7 @@ TEST_F(DirTest, has_its_parents_made_from_the_top) {
     EXPECT_EQ(last("xos_DirCreateEx"), "\"a/b/c\", 0");
 }
 
-TEST_F(DirTest, has_its_parents_made_in_order) {
+TEST_F(DirOnDisk, has_its_parents_made_in_order) {
     // With each call failing in turn, what is there is always the top of the tree. The first three are tried again on
     // the way down.
     Names const whole{"a/", "a/b/", "a/b/c/"};
@@ -109,7 +109,7 @@ TEST_F(DirTest, has_its_parents_made_in_order) {
     }
 }
 
-TEST_F(DirTest, has_parents_made_through_either_slash_kind_and_runs_of_them) {
+TEST_F(DirOnDisk, has_parents_made_through_either_slash_kind_and_runs_of_them) {
     struct Case {
         Row row;
         char const* path;
@@ -136,7 +136,7 @@ TEST_F(DirTest, has_parents_made_through_either_slash_kind_and_runs_of_them) {
     }
 }
 
-TEST_F(DirTest, looks_for_parents_without_deep_recursion) {
+TEST_F(DirOnDisk, looks_for_parents_without_deep_recursion) {
     put(at("f"), "");
     std::string path = at("f");
     for (int i = 0; i < 2000; ++i) path += "/a";
@@ -158,7 +158,7 @@ TEST_F(DirTest, looks_for_parents_without_deep_recursion) {
     EXPECT_EQ(scratch.content(), Names{"f"});
 }
 
-TEST_F(DirTest, Kept_dir_01_has_no_parent_to_make_without_a_slash) {
+TEST_F(DirOnDisk, Kept_dir_01_has_no_parent_to_make_without_a_slash) {
     EXPECT_FALSE(Dir::NewFor("zb-no-slash"));
     EXPECT_FALSE(Dir::New("zb-no-slash", true));
     EXPECT_FALSE(Dir::NewForW(ZB_W("zb-no-slash")));
@@ -172,7 +172,7 @@ TEST_F(DirTest, Kept_dir_01_has_no_parent_to_make_without_a_slash) {
     EXPECT_FALSE(Dir::Exist("zb-no-slash"));
 }
 
-TEST_F(DirTest, Kept_dir_02_is_its_own_parent_behind_the_only_slash) {
+TEST_F(DirOnDisk, Kept_dir_02_is_its_own_parent_behind_the_only_slash) {
     ASSERT_EQ(xos_HostFail("xos_DirCreateEx", 0, 1), 0);
     EXPECT_FALSE(Dir::NewFor("/zb-only-slash"));
     EXPECT_EQ(last("xos_DirCreateEx"), "\"/zb-only-slash\", 0");
@@ -180,7 +180,7 @@ TEST_F(DirTest, Kept_dir_02_is_its_own_parent_behind_the_only_slash) {
     EXPECT_FALSE(Dir::Exist("/zb-only-slash"));
 }
 
-TEST_F(DirTest, is_made_by_wide_paths_without_the_platform) {
+TEST_F(DirOnDisk, is_made_by_wide_paths_without_the_platform) {
     EXPECT_FALSE(Dir::NewW(wide(at("a/b")).c_str(), false));
     EXPECT_TRUE(Dir::NewW(wide(at("a/b")).c_str(), true));
     EXPECT_TRUE(Dir::NewW(wide(at("a/b")).c_str(), true));
@@ -194,7 +194,7 @@ TEST_F(DirTest, is_made_by_wide_paths_without_the_platform) {
     EXPECT_EQ(xos_HostCalls("xos_DirCreateEx"), 0u);
 }
 
-TEST_F(DirTest, is_removed_with_the_flags_of_its_arguments) {
+TEST_F(DirOnDisk, is_removed_with_the_flags_of_its_arguments) {
     struct Case {
         Row row;
         bool recursive;
@@ -215,7 +215,7 @@ TEST_F(DirTest, is_removed_with_the_flags_of_its_arguments) {
     }
 }
 
-TEST_F(DirTest, is_removed_with_its_contents_when_asked) {
+TEST_F(DirOnDisk, is_removed_with_its_contents_when_asked) {
     makeFolder(at("d/e"));
     put(at("d/e/f"), "1");
     EXPECT_FALSE(Dir::Rem(at("d").c_str(), false, false));
@@ -224,7 +224,7 @@ TEST_F(DirTest, is_removed_with_its_contents_when_asked) {
     EXPECT_EQ(scratch.content(), Names{});
 }
 
-TEST_F(DirTest, counts_as_removed_where_nothing_is_and_never_removes_a_file) {
+TEST_F(DirOnDisk, counts_as_removed_where_nothing_is_and_never_removes_a_file) {
     put(at("f"), "1");
     EXPECT_TRUE(Dir::Rem(at("missing").c_str(), true, true));
     EXPECT_TRUE(Dir::Rem("", true, false));
@@ -234,7 +234,7 @@ TEST_F(DirTest, counts_as_removed_where_nothing_is_and_never_removes_a_file) {
     EXPECT_TRUE(exists(at("f")));
 }
 
-TEST_F(DirTest, is_copied_with_the_flags_of_its_arguments) {
+TEST_F(DirOnDisk, is_copied_with_the_flags_of_its_arguments) {
     struct Case {
         Row row;
         bool recursive;
@@ -259,7 +259,7 @@ TEST_F(DirTest, is_copied_with_the_flags_of_its_arguments) {
     EXPECT_EQ(xos_HostCalls("xos_DirMove"), 0u);
 }
 
-TEST_F(DirTest, is_copied_with_its_tree) {
+TEST_F(DirOnDisk, is_copied_with_its_tree) {
     makeFolder(at("d/e f"));
     put(at("d/e f/g"), "text");
     EXPECT_TRUE(Dir::Copy(at("copy").c_str(), at("d").c_str(), true, false, false));
@@ -270,7 +270,7 @@ TEST_F(DirTest, is_copied_with_its_tree) {
     EXPECT_FALSE(Dir::Copy(at("copy").c_str(), at("missing").c_str(), true, true, false));
 }
 
-TEST_F(DirTest, is_moved_by_the_platform_if_that_can) {
+TEST_F(DirOnDisk, is_moved_by_the_platform_if_that_can) {
     makeFolder(at("d"));
     put(at("d/f"), "1");
     EXPECT_TRUE(Dir::Move(at("e").c_str(), at("d").c_str(), false, false));
@@ -282,7 +282,7 @@ TEST_F(DirTest, is_moved_by_the_platform_if_that_can) {
     EXPECT_EQ(xos_HostCalls("xos_DirRemove"), 0u);
 }
 
-TEST_F(DirTest, is_moved_by_copying_where_the_platform_cannot_move) {
+TEST_F(DirOnDisk, is_moved_by_copying_where_the_platform_cannot_move) {
     struct Case {
         Row row;
         bool overwrite;
@@ -308,7 +308,7 @@ TEST_F(DirTest, is_moved_by_copying_where_the_platform_cannot_move) {
     }
 }
 
-TEST_F(DirTest, counts_as_moved_although_the_source_could_not_be_removed) {
+TEST_F(DirOnDisk, counts_as_moved_although_the_source_could_not_be_removed) {
     makeFolder(at("d"));
     ASSERT_EQ(xos_HostFail("xos_DirMove", 0, 1), 0);
     ASSERT_EQ(xos_HostFail("xos_DirRemove", 0, 1), 0);
@@ -316,7 +316,7 @@ TEST_F(DirTest, counts_as_moved_although_the_source_could_not_be_removed) {
     EXPECT_EQ(scratch.content(), (Names{"d/", "m/"}));
 }
 
-TEST_F(DirTest, Kept_dir_03_is_lost_when_neither_moving_nor_copying_works) {
+TEST_F(DirOnDisk, Kept_dir_03_is_lost_when_neither_moving_nor_copying_works) {
     makeFolder(at("d/e"));
     put(at("d/e/f"), "1");
     ASSERT_EQ(xos_HostFail("xos_DirMove", 0, 1), 0);
@@ -325,7 +325,7 @@ TEST_F(DirTest, Kept_dir_03_is_lost_when_neither_moving_nor_copying_works) {
     EXPECT_EQ(scratch.content(), Names{});
 }
 
-TEST_F(DirTest, links_with_the_source_first_at_the_platform) {
+TEST_F(DirOnDisk, links_with_the_source_first_at_the_platform) {
     put(at("f"), "1");
     EXPECT_TRUE(Dir::Link(at("g").c_str(), at("f").c_str()));
     EXPECT_EQ(last("xos_FileHardLink"), "\"f\", \"g\"");
@@ -335,7 +335,7 @@ TEST_F(DirTest, links_with_the_source_first_at_the_platform) {
     EXPECT_FALSE(Dir::Link(at("h").c_str(), at("missing").c_str()));
 }
 
-TEST_F(DirTest, is_split_at_the_deepest_existing_ancestor) {
+TEST_F(DirOnDisk, is_split_at_the_deepest_existing_ancestor) {
     makeFolder(at("a/b"));
     put(at("a/f"), "");
     struct Case {
@@ -397,7 +397,7 @@ TEST_F(DirTest, is_split_at_the_deepest_existing_ancestor) {
     EXPECT_TRUE(rest.empty());
 }
 
-TEST_F(DirTest, Kept_dir_04_is_not_split_at_the_first_two_characters) {
+TEST_F(DirOnDisk, Kept_dir_04_is_not_split_at_the_first_two_characters) {
     FPath existing;
     FPath rest;
     EXPECT_FALSE(Dir::SplitCheck("./zb-x", existing, rest)) << "the slash at index 1";

@@ -13,7 +13,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct FStatTest : testing::Test {
+struct FStatOnDisk : testing::Test {
     static std::int64_t now() {
         return std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch())
             .count();
@@ -36,16 +36,16 @@ struct FStatTest : testing::Test {
 
 } // namespace
 
-TEST_F(FStatTest, breathes) {
+TEST_F(FStatOnDisk, breathes) {
     put(scratch / "a b.txt", "12345");
     FStat const entry((scratch / "a b.txt").c_str());
     EXPECT_TRUE(entry.exist());
     EXPECT_EQ(entry.size(), 5u);
 }
 
-TEST_F(FStatTest, is_cleared_before_it_is_examined) { expectCleared(FStat()); }
+TEST_F(FStatOnDisk, is_cleared_before_it_is_examined) { expectCleared(FStat()); }
 
-TEST_F(FStatTest, tells_kind_size_and_times_of_a_file) {
+TEST_F(FStatOnDisk, tells_kind_size_and_times_of_a_file) {
     std::int64_t const before = now() - 2;
     put(scratch / "file", "123");
     FStat entry;
@@ -60,7 +60,7 @@ TEST_F(FStatTest, tells_kind_size_and_times_of_a_file) {
     }
 }
 
-TEST_F(FStatTest, takes_the_modification_time_from_its_own_field) {
+TEST_F(FStatOnDisk, takes_the_modification_time_from_its_own_field) {
     put(scratch / "old", "1");
     namespace fs = std::filesystem;
     fs::last_write_time(scratch / "old", fs::file_time_type::clock::now() - std::chrono::hours(24 * 400));
@@ -68,7 +68,7 @@ TEST_F(FStatTest, takes_the_modification_time_from_its_own_field) {
     EXPECT_NEAR(static_cast<double>(now() - entry.modified()), 400.0 * 86400, 4000);
 }
 
-TEST_F(FStatTest, tells_a_directory) {
+TEST_F(FStatOnDisk, tells_a_directory) {
     makeFolder(scratch / "folder");
     FStat const entry((scratch / "folder").c_str());
     EXPECT_EQ(entry.type(), FStat::ST_DIR);
@@ -77,7 +77,7 @@ TEST_F(FStatTest, tells_a_directory) {
     EXPECT_FALSE(entry.isFile());
 }
 
-TEST_F(FStatTest, finds_nothing_at_missing_null_and_empty_paths) {
+TEST_F(FStatOnDisk, finds_nothing_at_missing_null_and_empty_paths) {
     std::string const missing = scratch / "no/such";
     for (char const* path : {missing.c_str(), "", static_cast<char const*>(nullptr)}) {
         for (bool fallback : {true, false}) {
@@ -90,13 +90,13 @@ TEST_F(FStatTest, finds_nothing_at_missing_null_and_empty_paths) {
     }
 }
 
-TEST_F(FStatTest, takes_both_slash_kinds) {
+TEST_F(FStatOnDisk, takes_both_slash_kinds) {
     makeFolder(scratch / "a/b");
     put(scratch / "a/b/c", "1234");
     EXPECT_EQ(FStat::size((scratch.path() + "\\a\\b/c").c_str()), 4u);
 }
 
-TEST_F(FStatTest, has_static_forms_of_every_query) {
+TEST_F(FStatOnDisk, has_static_forms_of_every_query) {
     put(scratch / "f", "12");
     std::string const file = scratch / "f";
     std::string const missing = scratch / "g";
@@ -120,7 +120,7 @@ TEST_F(FStatTest, has_static_forms_of_every_query) {
     EXPECT_EQ(FStat::accessed(missing.c_str()), 0);
 }
 
-TEST_F(FStatTest, reads_wide_paths) {
+TEST_F(FStatOnDisk, reads_wide_paths) {
     put(scratch / "f", "12");
     FStat entry;
     EXPECT_TRUE(entry.updateW(wide(scratch / "f").c_str()));
@@ -133,7 +133,7 @@ TEST_F(FStatTest, reads_wide_paths) {
     EXPECT_FALSE(entry.updateW(nullptr));
 }
 
-TEST_F(FStatTest, sees_sizes_above_four_gigabytes) {
+TEST_F(FStatOnDisk, sees_sizes_above_four_gigabytes) {
     put(scratch / "large", "x");
     std::uint64_t const size = (std::uint64_t{5} << 30) + 3;
     std::filesystem::resize_file(scratch / "large", size);
@@ -141,7 +141,7 @@ TEST_F(FStatTest, sees_sizes_above_four_gigabytes) {
     EXPECT_EQ(FStat(wide(scratch / "large").c_str()).size(), size);
 }
 
-TEST_F(FStatTest, does_not_retry_what_is_simply_missing) {
+TEST_F(FStatOnDisk, does_not_retry_what_is_simply_missing) {
     auto const start = std::chrono::steady_clock::now();
     FStat entry;
     EXPECT_FALSE(entry.updateMultiRetryNetwork((scratch / "g").c_str()));
@@ -152,7 +152,7 @@ TEST_F(FStatTest, does_not_retry_what_is_simply_missing) {
     EXPECT_EQ(entry.size(), 1u);
 }
 
-TEST_F(FStatTest, is_a_plain_value) {
+TEST_F(FStatOnDisk, is_a_plain_value) {
     static_assert(std::is_trivially_copyable_v<FStat>);
     put(scratch / "f", "12");
     FStat const entry((scratch / "f").c_str());

@@ -8,14 +8,14 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct FileEntryTest : testing::Test {
+struct FileEntryOnDisk : testing::Test {
     Str here() const { return Str(scratch.path()); }
     Scratch scratch;
 };
 
 } // namespace
 
-TEST_F(FileEntryTest, breathes) {
+TEST_F(FileEntryOnDisk, breathes) {
     put(scratch / "a b", "123");
     FileEntry const entry(here(), "a b", 77);
     EXPECT_TRUE(entry.exist());
@@ -29,7 +29,7 @@ TEST_F(FileEntryTest, breathes) {
     EXPECT_STREQ(entry.getFullPath().c_str(), (scratch / "a b").c_str());
 }
 
-TEST_F(FileEntryTest, stores_what_it_is_given_without_a_look) {
+TEST_F(FileEntryOnDisk, stores_what_it_is_given_without_a_look) {
     FileEntry const entry(FStat::ST_LINK, "no/such\\", "name", std::uint64_t{1} << 40, -5);
     EXPECT_EQ(entry.getType(), FStat::ST_LINK);
     EXPECT_TRUE(entry.exist());
@@ -45,7 +45,7 @@ TEST_F(FileEntryTest, stores_what_it_is_given_without_a_look) {
     EXPECT_STREQ(FileEntry(FStat::ST_FILE, "d", nullptr, 0, 0).getFullPath().c_str(), "d");
 }
 
-TEST_F(FileEntryTest, takes_names_as_either_text) {
+TEST_F(FileEntryOnDisk, takes_names_as_either_text) {
     makeFolder(scratch / "d");
     FileEntry const entry(here(), Str("d"), 3);
     EXPECT_TRUE(entry.isDir());
@@ -54,7 +54,7 @@ TEST_F(FileEntryTest, takes_names_as_either_text) {
     EXPECT_STREQ(entry.getFullPath().c_str(), (scratch / "d").c_str());
 }
 
-TEST_F(FileEntryTest, has_no_time_where_nothing_is) {
+TEST_F(FileEntryOnDisk, has_no_time_where_nothing_is) {
     FileEntry const entry(here(), "missing", 99);
     EXPECT_FALSE(entry.exist());
     EXPECT_EQ(entry.getTime(), 0);
@@ -62,7 +62,7 @@ TEST_F(FileEntryTest, has_no_time_where_nothing_is) {
     EXPECT_STREQ(entry.getFullPath().c_str(), (scratch / "missing").c_str());
 }
 
-TEST_F(FileEntryTest, splits_a_full_path) {
+TEST_F(FileEntryOnDisk, splits_a_full_path) {
     put(scratch / "f", "12");
     std::string const path = scratch / "f";
     FileEntry const entry{Str(path)};
@@ -79,7 +79,7 @@ TEST_F(FileEntryTest, splits_a_full_path) {
     EXPECT_STREQ(top.getName().c_str(), "zb-missing");
 }
 
-TEST_F(FileEntryTest, refreshes_what_has_changed) {
+TEST_F(FileEntryOnDisk, refreshes_what_has_changed) {
     put(scratch / "f", "12");
     FileEntry entry(here(), "f", 50);
     EXPECT_FALSE(entry.Refresh()) << "nothing changed";
@@ -106,7 +106,7 @@ TEST_F(FileEntryTest, refreshes_what_has_changed) {
     EXPECT_FALSE(entry.Refresh());
 }
 
-TEST_F(FileEntryTest, Kept_entry_01_keeps_the_time_of_a_changed_file) {
+TEST_F(FileEntryOnDisk, Kept_entry_01_keeps_the_time_of_a_changed_file) {
     put(scratch / "f", "12");
     FileEntry entry(here(), "f", 50);
     put(scratch / "f", "1234");
@@ -119,20 +119,20 @@ TEST_F(FileEntryTest, Kept_entry_01_keeps_the_time_of_a_changed_file) {
     EXPECT_EQ(entry.getSize(), 0u);
 }
 
-TEST_F(FileEntryTest, forgets_a_size_that_was_given_to_a_directory_without_a_change) {
+TEST_F(FileEntryOnDisk, forgets_a_size_that_was_given_to_a_directory_without_a_change) {
     makeFolder(scratch / "d");
     FileEntry entry(FStat::ST_DIR, here(), "d", 4096, 1);
     EXPECT_FALSE(entry.Refresh());
     EXPECT_EQ(entry.getSize(), 0u);
 }
 
-TEST_F(FileEntryTest, joins_its_full_path_again) {
+TEST_F(FileEntryOnDisk, joins_its_full_path_again) {
     FileEntry entry(FStat::ST_FILE, "dir", "name", 1, 2);
     entry.updateFullPath();
     EXPECT_STREQ(entry.getFullPath().c_str(), "dir/name");
 }
 
-TEST_F(FileEntryTest, is_copied_and_moved_with_all_its_fields) {
+TEST_F(FileEntryOnDisk, is_copied_and_moved_with_all_its_fields) {
     FileEntry const entry(FStat::ST_OTHER, "dir", std::string(300, 'n').c_str(), 1, 2);
     FileEntry const copy(entry);
     FileEntry source(entry);

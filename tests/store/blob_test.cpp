@@ -14,7 +14,7 @@ using namespace ZOR_Basis;
 namespace {
 
 template <class B>
-struct BlobTest : testing::Test {
+struct BlobOfEitherKind : testing::Test {
     static B make(std::string const& bytes) {
         B blob;
         blob.copy(bytes.size(), bytes.data());
@@ -26,13 +26,13 @@ struct BlobTest : testing::Test {
 };
 
 using Blobs = testing::Types<Blob, SecretBlob>;
-TYPED_TEST_SUITE(BlobTest, Blobs);
+TYPED_TEST_SUITE(BlobOfEitherKind, Blobs);
 
 std::string length(std::uint32_t n) { return std::string(reinterpret_cast<char const*>(&n), 4); }
 
 } // namespace
 
-TYPED_TEST(BlobTest, breathes) {
+TYPED_TEST(BlobOfEitherKind, breathes) {
     TypeParam blob;
     EXPECT_EQ(blob.size(), 0u);
     EXPECT_EQ(blob.sizeBuf(), 0u);
@@ -85,7 +85,7 @@ TEST(Blob, is_empty_while_a_block_is_released_whose_bytes_do_not_stay) {
     EXPECT_EQ(blob.sizeAtRelease, 0U);
 }
 
-TYPED_TEST(BlobTest, is_copied_with_blocks_of_their_own_of_exactly_the_size) {
+TYPED_TEST(BlobOfEitherKind, is_copied_with_blocks_of_their_own_of_exactly_the_size) {
     TypeParam blob = this->make("abcdef");
     blob.alloc(100, true);
     TypeParam const copy(blob);
@@ -106,7 +106,7 @@ TYPED_TEST(BlobTest, is_copied_with_blocks_of_their_own_of_exactly_the_size) {
     EXPECT_EQ(this->bytes(assigned), "12");
 }
 
-TYPED_TEST(BlobTest, grows_exactly) {
+TYPED_TEST(BlobOfEitherKind, grows_exactly) {
     TypeParam blob;
     for (std::uint64_t n = 1; n < 40; ++n) {
         blob.add(1, "x");
@@ -119,7 +119,7 @@ TYPED_TEST(BlobTest, grows_exactly) {
     EXPECT_EQ(blob.sizeBuf(), 51u);
 }
 
-TYPED_TEST(BlobTest, adds_nothing_for_nothing) {
+TYPED_TEST(BlobOfEitherKind, adds_nothing_for_nothing) {
     TypeParam blob = this->make("ab");
     char const* const block = blob.val();
     blob.add(0, "xyz");
@@ -132,7 +132,7 @@ TYPED_TEST(BlobTest, adds_nothing_for_nothing) {
     EXPECT_EQ(empty.val(), nullptr);
 }
 
-TYPED_TEST(BlobTest, keeps_its_block_when_cleared) {
+TYPED_TEST(BlobOfEitherKind, keeps_its_block_when_cleared) {
     TypeParam blob = this->make("abcdef");
     char const* const block = blob.val();
     blob.clear();
@@ -149,7 +149,7 @@ TYPED_TEST(BlobTest, keeps_its_block_when_cleared) {
     EXPECT_EQ(blob.sizeBuf(), 6u);
 }
 
-TYPED_TEST(BlobTest, makes_room) {
+TYPED_TEST(BlobOfEitherKind, makes_room) {
     TypeParam blob = this->make("abc");
     blob.alloc(10, true);
     EXPECT_EQ(blob.sizeBuf(), 10u);
@@ -166,7 +166,7 @@ TYPED_TEST(BlobTest, makes_room) {
     EXPECT_EQ(this->bytes(empty), "1234");
 }
 
-TYPED_TEST(BlobTest, Kept_blob_01_changes_nothing_where_there_is_room_already) {
+TYPED_TEST(BlobOfEitherKind, Kept_blob_01_changes_nothing_where_there_is_room_already) {
     TypeParam blob = this->make("abc");
     char const* const block = blob.val();
     for (bool keep : {true, false}) {
@@ -178,7 +178,7 @@ TYPED_TEST(BlobTest, Kept_blob_01_changes_nothing_where_there_is_room_already) {
     }
 }
 
-TYPED_TEST(BlobTest, takes_sizes_unchecked) {
+TYPED_TEST(BlobOfEitherKind, takes_sizes_unchecked) {
     TypeParam blob;
     blob.setSize(1'000);
     EXPECT_EQ(blob.size(), 1'000u);
@@ -186,7 +186,7 @@ TYPED_TEST(BlobTest, takes_sizes_unchecked) {
     blob.setSize(0);
 }
 
-TYPED_TEST(BlobTest, takes_sources_in_its_own_block) {
+TYPED_TEST(BlobOfEitherKind, takes_sources_in_its_own_block) {
     TypeParam blob = this->make("abcdef");
     blob.add(blob.size(), blob.val());
     EXPECT_EQ(this->bytes(blob), "abcdefabcdef");
@@ -199,7 +199,7 @@ TYPED_TEST(BlobTest, takes_sources_in_its_own_block) {
     EXPECT_EQ(this->bytes(blob), "fabefaabe");
 }
 
-TYPED_TEST(BlobTest, compares_bytes_and_sizes) {
+TYPED_TEST(BlobOfEitherKind, compares_bytes_and_sizes) {
     struct Case {
         Row row;
         std::string a;
@@ -228,7 +228,7 @@ TYPED_TEST(BlobTest, compares_bytes_and_sizes) {
     EXPECT_TRUE(roomy == this->make("abc")) << "what is behind the size does not count";
 }
 
-TYPED_TEST(BlobTest, is_stored_as_length_and_bytes) {
+TYPED_TEST(BlobOfEitherKind, is_stored_as_length_and_bytes) {
     for (std::string const& text : {std::string(), std::string("a"), std::string("a\0b", 3), std::string(300, 'x')}) {
         MemoryFile file;
         EXPECT_TRUE(this->make(text).write(&file));
@@ -248,7 +248,7 @@ TEST(Blob, has_golden_bytes) {
     EXPECT_EQ(file.content.substr(0, 5), std::string("\x02\x01\x00\x00z", 5));
 }
 
-TYPED_TEST(BlobTest, is_not_changed_by_a_length_that_is_cut) {
+TYPED_TEST(BlobOfEitherKind, is_not_changed_by_a_length_that_is_cut) {
     for (std::uint64_t n = 0; n < 4; ++n) {
         MemoryFile file(length(2).substr(0, n));
         TypeParam blob = this->make("before");
@@ -261,7 +261,7 @@ TYPED_TEST(BlobTest, is_not_changed_by_a_length_that_is_cut) {
     EXPECT_EQ(this->bytes(blob), "before");
 }
 
-TYPED_TEST(BlobTest, Kept_blob_02_has_the_announced_size_after_a_short_read) {
+TYPED_TEST(BlobOfEitherKind, Kept_blob_02_has_the_announced_size_after_a_short_read) {
     MemoryFile file(length(100) + "abc");
     TypeParam blob = this->make("x");
     EXPECT_FALSE(blob.read(&file));
@@ -270,7 +270,7 @@ TYPED_TEST(BlobTest, Kept_blob_02_has_the_announced_size_after_a_short_read) {
     EXPECT_EQ(std::memcmp(blob.val(), "abc", 3), 0);
 }
 
-TYPED_TEST(BlobTest, reports_what_could_not_be_written) {
+TYPED_TEST(BlobOfEitherKind, reports_what_could_not_be_written) {
     for (std::uint64_t room = 0; room <= 7; ++room) {
         MemoryFile file;
         file.room = room;
@@ -298,7 +298,7 @@ TEST(Blob, Kept_blob_03_stores_the_low_32_bits_of_a_size_beyond) {
     blob.setSize(0);
 }
 
-TYPED_TEST(BlobTest, behaves_as_a_vector_of_bytes) {
+TYPED_TEST(BlobOfEitherKind, behaves_as_a_vector_of_bytes) {
     auto random = randomSource();
     TypeParam blob;
     std::string model;

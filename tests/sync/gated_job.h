@@ -4,6 +4,8 @@
 #ifndef TESTS_SYNC_GATED_JOB_H
 #define TESTS_SYNC_GATED_JOB_H
 
+#include "tests/support/wait_for.h"
+
 #include <zor_basis/sync.h>
 
 #include <atomic>
@@ -11,17 +13,6 @@
 #include <condition_variable>
 #include <mutex>
 #include <thread>
-
-/// Tries something again and again, at most some seconds.
-template <class Try>
-bool soon(Try const& attempt) {
-    auto const end = std::chrono::steady_clock::now() + std::chrono::seconds(20);
-    while (!attempt()) {
-        if (std::chrono::steady_clock::now() > end) return false;
-        std::this_thread::yield();
-    }
-    return true;
-}
 
 /// Watches something for a moment. \return whether it never became true
 template <class Try>

@@ -14,9 +14,9 @@ using namespace ZOR_Basis;
 
 namespace {
 
-class LockTest : public testing::Test {
+class LockOfAType : public testing::Test {
 protected:
-    ~LockTest() override { xos_HostFailClear(); }
+    ~LockOfAType() override { xos_HostFailClear(); }
 };
 
 /// Whether another thread gets the lock within a moment; it gives it back.
@@ -41,7 +41,7 @@ private:
 
 } // namespace
 
-TEST_F(LockTest, breathes) {
+TEST_F(LockOfAType, breathes) {
     for (Lock::Type type : {Lock::Binary, Lock::Mutex}) {
         Lock lock(type, false);
         lock.lock();
@@ -52,7 +52,7 @@ TEST_F(LockTest, breathes) {
     }
 }
 
-TEST_F(LockTest, makes_the_semaphore_of_its_type) {
+TEST_F(LockOfAType, makes_the_semaphore_of_its_type) {
     struct Case {
         Row row;
         std::uint32_t type;
@@ -75,7 +75,7 @@ TEST_F(LockTest, makes_the_semaphore_of_its_type) {
     }
 }
 
-TEST_F(LockTest, that_begins_locked_keeps_others_out) {
+TEST_F(LockOfAType, that_begins_locked_keeps_others_out) {
     for (Lock::Type type : {Lock::Binary, Lock::Mutex}) {
         Lock lock(type, true);
         Waiter waiter(lock);
@@ -85,7 +85,7 @@ TEST_F(LockTest, that_begins_locked_keeps_others_out) {
     }
 }
 
-TEST_F(LockTest, as_a_mutex_may_be_locked_again_by_its_thread) {
+TEST_F(LockOfAType, as_a_mutex_may_be_locked_again_by_its_thread) {
     Lock lock(Lock::Mutex, true);
     lock.lock();
     lock.unlock();
@@ -95,7 +95,7 @@ TEST_F(LockTest, as_a_mutex_may_be_locked_again_by_its_thread) {
     EXPECT_TRUE(waiter.hasIt());
 }
 
-TEST_F(LockTest, as_a_binary_may_be_unlocked_by_any_thread) {
+TEST_F(LockOfAType, as_a_binary_may_be_unlocked_by_any_thread) {
     Lock lock(Lock::Binary, true);
     std::thread([&lock] { lock.unlock(); }).join();
     lock.lock();
@@ -107,7 +107,7 @@ TEST_F(LockTest, as_a_binary_may_be_unlocked_by_any_thread) {
     lock.unlock();
 }
 
-TEST_F(LockTest, that_could_not_be_made_locks_nothing) {
+TEST_F(LockOfAType, that_could_not_be_made_locks_nothing) {
     xos_HostFail("xos_SemMCreate", 0, 1);
     xos_HostFail("xos_SemBCreate", 0, 1);
     Lock mutex(Lock::Mutex, true);
@@ -118,7 +118,7 @@ TEST_F(LockTest, that_could_not_be_made_locks_nothing) {
     binary.unlock();
 }
 
-TEST_F(LockTest, Kept_sync_01_assigning_shares_the_semaphore) {
+TEST_F(LockOfAType, Kept_sync_01_assigning_shares_the_semaphore) {
     Lock first(Lock::Binary, true);
     xos_HostCallsReset();
     {

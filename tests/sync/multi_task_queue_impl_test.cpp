@@ -17,9 +17,9 @@ using namespace ZOR_Basis;
 
 namespace {
 
-class MTQ_ImplTest : public testing::Test {
+class MTQ_ImplCalls : public testing::Test {
 protected:
-    ~MTQ_ImplTest() override { xos_HostFailClear(); }
+    ~MTQ_ImplCalls() override { xos_HostFailClear(); }
 };
 
 bool add(MultiTaskQueue& queue, GatedJob& job, bool startNow = true) {
@@ -27,7 +27,7 @@ bool add(MultiTaskQueue& queue, GatedJob& job, bool startNow = true) {
 }
 
 bool isQuiet(MTQ_Impl const& queue, std::int32_t running) {
-    return soon([&] { return queue.running() == running && queue.ending() == 0; });
+    return waitFor([&] { return queue.running() == running && queue.ending() == 0; });
 }
 
 bool succeed(void*) { return true; }
@@ -70,7 +70,7 @@ bool addOwned(MultiTaskQueue& queue, TaskArgument* argument) {
 
 } // namespace
 
-TEST_F(MTQ_ImplTest, makes_a_mutex_and_an_empty_signal_and_destroys_them) {
+TEST_F(MTQ_ImplCalls, makes_a_mutex_and_an_empty_signal_and_destroys_them) {
     xos_HostCallsReset();
     std::unique_ptr<MultiTaskQueue> queue(MultiTaskQueue::New(MultiTaskQueue::Continue, 1));
     EXPECT_EQ(xos_HostCalls("xos_SemMCreate"), 1u);
@@ -80,7 +80,7 @@ TEST_F(MTQ_ImplTest, makes_a_mutex_and_an_empty_signal_and_destroys_them) {
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 2u);
 }
 
-TEST_F(MTQ_ImplTest, makes_tasks_with_the_same_parameters_always) {
+TEST_F(MTQ_ImplCalls, makes_tasks_with_the_same_parameters_always) {
     MTQ_Impl queue(MultiTaskQueue::Continue, 0);
     for (bool byRecord : {false, true}) {
         SCOPED_TRACE(byRecord);
@@ -93,11 +93,11 @@ TEST_F(MTQ_ImplTest, makes_tasks_with_the_same_parameters_always) {
                       static_cast<unsigned long long>(reinterpret_cast<std::uintptr_t>(record)));
         std::string const call = xos_HostLastCall("xos_TaskCreate");
         EXPECT_EQ(call.substr(call.find(',')), expected);
-        EXPECT_TRUE(soon([&] { return record->finished(); }));
+        EXPECT_TRUE(waitFor([&] { return record->finished(); }));
     }
 }
 
-TEST_F(MTQ_ImplTest, walks_under_its_mutex_but_not_at_the_end) {
+TEST_F(MTQ_ImplCalls, walks_under_its_mutex_but_not_at_the_end) {
     MTQ_Impl queue(MultiTaskQueue::Continue, 0);
     queue.add(succeed, nullptr, false, false, false);
     xos_HostCallsReset();
@@ -111,7 +111,7 @@ TEST_F(MTQ_ImplTest, walks_under_its_mutex_but_not_at_the_end) {
     EXPECT_EQ(xos_HostCalls("xos_SemGive"), 2u);
 }
 
-TEST_F(MTQ_ImplTest, Kept_queue_01_a_task_that_cannot_be_made_counts_as_running_for_ever) {
+TEST_F(MTQ_ImplCalls, Kept_queue_01_a_task_that_cannot_be_made_counts_as_running_for_ever) {
     for (bool forced : {false, true}) {
         std::atomic<int> deletions{0};
         {
@@ -141,7 +141,7 @@ TEST_F(MTQ_ImplTest, Kept_queue_01_a_task_that_cannot_be_made_counts_as_running_
     }
 }
 
-TEST_F(MTQ_ImplTest, keeps_the_argument_of_a_task_that_could_not_be_made_and_deletes_it_later) {
+TEST_F(MTQ_ImplCalls, keeps_the_argument_of_a_task_that_could_not_be_made_and_deletes_it_later) {
     std::atomic<int> deletions{0};
     {
         MTQ_Impl queue(MultiTaskQueue::StopOnError, 1);
@@ -153,7 +153,7 @@ TEST_F(MTQ_ImplTest, keeps_the_argument_of_a_task_that_could_not_be_made_and_del
     EXPECT_EQ(deletions, 1);
 }
 
-TEST_F(MTQ_ImplTest, starts_no_more_where_a_task_fails_while_all_that_wait_are_started) {
+TEST_F(MTQ_ImplCalls, starts_no_more_where_a_task_fails_while_all_that_wait_are_started) {
     struct Case {
         Row row;
         MultiTaskQueue::ErrPolicy policy;
@@ -167,7 +167,7 @@ TEST_F(MTQ_ImplTest, starts_no_more_where_a_task_fails_while_all_that_wait_are_s
         xos_HostFail("xos_TaskCreate", 1, 1); // the third job's
         std::thread waiter([&] { queue.wait(); });
         first.open();
-        EXPECT_TRUE(soon([&] { return second.runs() && queue.failed(); }));
+        EXPECT_TRUE(waitFor([&] { return second.runs() && queue.failed(); }));
         for (GatedJob* job : {&keeper, &second, &fourth}) job->open();
         EXPECT_TRUE(isQuiet(queue, 1));
         EXPECT_EQ(fourth.runs(), c.lastOneRuns);
@@ -182,7 +182,7 @@ TEST_F(MTQ_ImplTest, starts_no_more_where_a_task_fails_while_all_that_wait_are_s
     }
 }
 
-TEST_F(MTQ_ImplTest, Kept_queue_03_does_not_fail_where_a_record_cannot_start) {
+TEST_F(MTQ_ImplCalls, Kept_queue_03_does_not_fail_where_a_record_cannot_start) {
     MTQ_Impl queue(MultiTaskQueue::StopOnError, 0);
     queue.add(succeed, nullptr, false, false, false);
     xos_HostFail("xos_TaskCreate", 0, 1);
@@ -197,7 +197,7 @@ TEST_F(MTQ_ImplTest, Kept_queue_03_does_not_fail_where_a_record_cannot_start) {
     EXPECT_TRUE(isQuiet(queue, -1));
 }
 
-TEST_F(MTQ_ImplTest, goes_on_where_its_mutex_cannot_be_taken_and_gives_nothing_back_then) {
+TEST_F(MTQ_ImplCalls, goes_on_where_its_mutex_cannot_be_taken_and_gives_nothing_back_then) {
     for (std::uint32_t skip = 0; skip < 6; ++skip) {
         SCOPED_TRACE(skip);
         MTQ_Impl queue(MultiTaskQueue::Continue, 1);
@@ -218,7 +218,7 @@ TEST_F(MTQ_ImplTest, goes_on_where_its_mutex_cannot_be_taken_and_gives_nothing_b
     }
 }
 
-TEST_F(MTQ_ImplTest, goes_on_without_semaphores) {
+TEST_F(MTQ_ImplCalls, goes_on_without_semaphores) {
     for (char const* function : {"xos_SemMCreate", "xos_SemBCreate"}) {
         SCOPED_TRACE(function);
         xos_HostFail(function, 0, 1);
@@ -233,7 +233,7 @@ TEST_F(MTQ_ImplTest, goes_on_without_semaphores) {
         GatedJob third;
         EXPECT_TRUE(add(queue, third));
         std::thread opener([&] {
-            EXPECT_TRUE(soon([&] { return second.runs(); }));
+            EXPECT_TRUE(waitFor([&] { return second.runs(); }));
             second.open();
             third.open();
         });
@@ -245,7 +245,7 @@ TEST_F(MTQ_ImplTest, goes_on_without_semaphores) {
     }
 }
 
-TEST_F(MTQ_ImplTest, ends_each_job_under_its_mutex_on_the_jobs_own_task) {
+TEST_F(MTQ_ImplCalls, ends_each_job_under_its_mutex_on_the_jobs_own_task) {
     constexpr int JOBS = 400;
     constexpr int TAKES_OF_A_JOB = 3; // to add it, to start it, to report its end
     Ends ends;
@@ -259,7 +259,7 @@ TEST_F(MTQ_ImplTest, ends_each_job_under_its_mutex_on_the_jobs_own_task) {
     EXPECT_EQ(xos_HostCalls("xos_SemGive"), std::uint64_t{TAKES_OF_A_JOB + 1} * JOBS) << "the signal, too";
 }
 
-TEST_F(MTQ_ImplTest, leaves_no_job_to_the_task_of_another_that_waits_for_the_mutex) {
+TEST_F(MTQ_ImplCalls, leaves_no_job_to_the_task_of_another_that_waits_for_the_mutex) {
     Ends ends;
     GatedJob gate;
     MTQ_Impl queue(MultiTaskQueue::Continue, 0);
@@ -278,11 +278,11 @@ TEST_F(MTQ_ImplTest, leaves_no_job_to_the_task_of_another_that_waits_for_the_mut
     auto* const keeper = new TaskArgument(ends);
     keeper->endBehind(gate);
     EXPECT_TRUE(addOwned(queue, keeper));
-    EXPECT_TRUE(soon([&] { return gate.runs(); })) << "the mutex is held";
+    EXPECT_TRUE(waitFor([&] { return gate.runs(); })) << "the mutex is held";
     first.open();
-    EXPECT_TRUE(soon([&] { return queue.ending() == 2; }));
+    EXPECT_TRUE(waitFor([&] { return queue.ending() == 2; }));
     second.open();
-    EXPECT_TRUE(soon([&] { return queue.ending() == 3; }));
+    EXPECT_TRUE(waitFor([&] { return queue.ending() == 3; }));
     EXPECT_TRUE(notInAMoment([&] { return queue.ending() != 3; })) << "each waits for the mutex itself";
     gate.open();
     EXPECT_TRUE(isQuiet(queue, 0));
@@ -290,7 +290,7 @@ TEST_F(MTQ_ImplTest, leaves_no_job_to_the_task_of_another_that_waits_for_the_mut
     EXPECT_EQ(ends.elsewhere, 0);
 }
 
-TEST_F(MTQ_ImplTest, drops_its_jobs_where_its_semaphores_cannot_be_destroyed) {
+TEST_F(MTQ_ImplCalls, drops_its_jobs_where_its_semaphores_cannot_be_destroyed) {
     for (std::uint32_t skip : {0u, 1u}) {
         std::atomic<int> deletions{0};
         {

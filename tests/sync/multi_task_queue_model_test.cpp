@@ -30,9 +30,9 @@ struct ModelJob {
     bool hasTask = false;
 };
 
-class Model {
+class QueueModel {
 public:
-    Model(bool stops, int limit) : stops_(stops), limit_(limit) {}
+    QueueModel(bool stops, int limit) : stops_(stops), limit_(limit) {}
 
     bool mayProceed() const { return !stops_ || !failed; }
 
@@ -73,9 +73,16 @@ private:
 };
 
 /// One queue and its model, driven by random steps.
-class Pair {
+class QueueAndModel {
 public:
-    Pair(std::uint64_t seed, bool failsTasks)
+    struct Step {
+        char const* name;
+        unsigned of8; ///< how many of eight steps are of this kind
+        void (QueueAndModel::*take)();
+    };
+    static Step const STEPS[];
+
+    QueueAndModel(std::uint64_t seed, bool failsTasks)
         : random_(seed),
           failsTasks_(failsTasks),
           stops_(random_() % 2 == 0),
@@ -99,21 +106,14 @@ public:
 
 private:
     void step() {
-        switch (random_() % 8) {
-        case 0:
-        case 1:
-        case 2:
-            return add(random_() % 3 == 0);
-        case 3:
-        case 4:
-        case 5:
-            return finishAny();
-        case 6:
-            return removeAny();
-        default:
-            return wait();
-        }
+        auto number = static_cast<unsigned>(random_() % 8);
+        Step const* chosen = STEPS;
+        for (; number >= chosen->of8; ++chosen) number -= chosen->of8;
+        SCOPED_TRACE(chosen->name);
+        (this->*chosen->take)();
     }
+
+    void addAny() { add(random_() % 3 == 0); }
 
     void add(bool startNow) {
         bool const owns = random_() % 2 == 0;
@@ -141,7 +141,7 @@ private:
         settle();
     }
     void settle() {
-        EXPECT_TRUE(soon([&] { return queue_->running() == model_.running && queue_->ending() == 0; }));
+        EXPECT_TRUE(waitFor([&] { return queue_->running() == model_.running && queue_->ending() == 0; }));
     }
 
     using Places = std::vector<std::list<ModelJob>::iterator>;
@@ -206,7 +206,7 @@ private:
             }
         }
         std::thread opener([&] {
-            for (MTQ_Dat const* record : waiting) EXPECT_TRUE(soon([&] { return record->started(); }));
+            for (MTQ_Dat const* record : waiting) EXPECT_TRUE(waitFor([&] { return record->started(); }));
             for (GatedJob* job : left) job->open(result);
         });
         queue_->wait();
@@ -236,8 +236,15 @@ private:
     std::atomic<int> deletions_{0};
     std::vector<GatedJob*> arguments_;
     std::vector<std::unique_ptr<GatedJob>> borrowed_;
-    Model model_;
+    QueueModel model_;
     std::unique_ptr<MTQ_Impl> queue_;
+};
+
+QueueAndModel::Step const QueueAndModel::STEPS[] = {
+    {"add a job", 3, &QueueAndModel::addAny},
+    {"end a running job", 3, &QueueAndModel::finishAny},
+    {"have a running job removed", 1, &QueueAndModel::removeAny},
+    {"wait", 1, &QueueAndModel::wait},
 };
 
 } // namespace
@@ -245,7 +252,7 @@ private:
 TEST(MTQ_Model, agrees_with_the_queue_over_random_steps_and_failing_tasks) {
     std::mt19937_64 random = randomSource();
     std::uint64_t const rounds = randomSteps(60);
-    for (std::uint64_t i = 0; i < rounds && !testing::Test::HasFailure(); ++i) Pair(random(), true).run(60);
+    for (std::uint64_t i = 0; i < rounds && !testing::Test::HasFailure(); ++i) QueueAndModel(random(), true).run(60);
 }
 
 TEST(MTQ_Model, agrees_with_eight_queues_on_eight_threads) {
@@ -255,7 +262,7 @@ TEST(MTQ_Model, agrees_with_eight_queues_on_eight_threads) {
     for (unsigned t = 0; t < THREADS; ++t) {
         threads.emplace_back([t, rounds] {
             std::mt19937_64 random(randomSource()() + t);
-            for (std::uint64_t i = 0; i < rounds; ++i) Pair(random(), false).run(60);
+            for (std::uint64_t i = 0; i < rounds; ++i) QueueAndModel(random(), false).run(60);
         });
     }
     for (std::thread& thread : threads) thread.join();
@@ -323,7 +330,7 @@ TEST(MTQ_Stress, runs_every_job_of_eight_adding_threads_once) {
             }
             first.open();
             std::thread opener([&] {
-                EXPECT_TRUE(policy != MultiTaskQueue::Continue || soon([&] { return ran == accepted; }));
+                EXPECT_TRUE(policy != MultiTaskQueue::Continue || waitFor([&] { return ran == accepted; }));
                 last.open();
             });
             queue.wait();

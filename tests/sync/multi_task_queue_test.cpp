@@ -1,7 +1,7 @@
 #include <zor_basis/sync.h>
 
 #include "tests/support/table.h"
-#include "tests/sync/gated_job.h"
+#include "tests/sync/queue_records.h"
 
 #include <gtest/gtest.h>
 
@@ -13,21 +13,6 @@
 using namespace ZOR_Basis;
 
 namespace {
-
-using Queue = std::unique_ptr<MultiTaskQueue>;
-
-Queue make(MultiTaskQueue::ErrPolicy policy, int limit) { return Queue(MultiTaskQueue::New(policy, limit)); }
-
-/// Adds a job whose argument stays the test's.
-bool add(Queue const& queue, GatedJob& job, bool startNow = false, bool removeWhenDone = false) {
-    return queue->add(GatedJob::run, job.argument(), false, startNow, removeWhenDone);
-}
-
-std::vector<MTQ_Dat*> records(Queue const& queue) {
-    std::vector<MTQ_Dat*> all;
-    for (MTQ_Dat* record = queue->first(); record != nullptr; record = queue->next()) all.push_back(record);
-    return all;
-}
 
 std::string startedOnes(Queue const& queue) {
     std::string text;
@@ -106,14 +91,14 @@ TEST(MultiTaskQueue, counts_finished_jobs_no_longer_to_the_limit) {
     first.open();
     // The job counts until it has reported its end.
     GatedJob* last = nullptr;
-    EXPECT_TRUE(soon([&] {
+    EXPECT_TRUE(waitFor([&] {
         last = new GatedJob;
         queue->add(GatedJob::run, last->argument(), true, false, false);
         return records(queue).back()->started();
     }));
     EXPECT_FALSE(second.runs()) << "what was queued before stays there until somebody waits";
     std::thread opener([&] {
-        EXPECT_TRUE(soon([&] { return second.runs(); }));
+        EXPECT_TRUE(waitFor([&] { return second.runs(); }));
         for (MTQ_Dat* record : records(queue)) {
             static_cast<GatedJob*>(static_cast<MTQ_Arg*>(record->argument()))->open();
         }
@@ -133,7 +118,7 @@ TEST(MultiTaskQueue, Kept_queue_02_waiting_starts_all_that_are_left_when_a_job_f
     });
     EXPECT_TRUE(notInAMoment([&] { return jobs[2].runs() || hasWaited; }));
     jobs[1].open();
-    EXPECT_TRUE(soon([&] { return jobs[2].runs() && jobs[3].runs() && jobs[4].runs(); })) << "together";
+    EXPECT_TRUE(waitFor([&] { return jobs[2].runs() && jobs[3].runs() && jobs[4].runs(); })) << "together";
     EXPECT_FALSE(hasWaited);
     for (GatedJob& job : jobs) job.open();
     waiter.join();
@@ -198,7 +183,7 @@ TEST(MultiTaskQueue, stops_on_error_where_it_is_told_to) {
             EXPECT_TRUE(add(queue, second));
             EXPECT_TRUE(add(queue, queued));
             first.open(false);
-            EXPECT_TRUE(soon([&] { return queue->failed(); }));
+            EXPECT_TRUE(waitFor([&] { return queue->failed(); }));
             EXPECT_FALSE(add(queue, late));
             EXPECT_FALSE(add(queue, late, true)) << "forced or not";
             EXPECT_FALSE(queue->add(GatedJob::run, refused->argument(), true, true, false));
@@ -252,21 +237,6 @@ TEST(MultiTaskQueue, deletes_arguments_of_jobs_that_never_started) {
     EXPECT_EQ(deletions, 5);
 }
 
-TEST(MultiTaskQueue, drops_a_job_that_is_told_so_while_it_runs) {
-    Queue const queue = make(MultiTaskQueue::Continue, 10);
-    GatedJob first, second;
-    EXPECT_TRUE(add(queue, first));
-    EXPECT_TRUE(add(queue, second));
-    queue->first()->setRemoveWhenDone();
-    first.open();
-    second.open();
-    queue->wait();
-    ASSERT_EQ(records(queue).size(), 1u);
-    EXPECT_EQ(records(queue)[0]->argument(), second.argument());
-    records(queue)[0]->setRemoveWhenDone();
-    EXPECT_EQ(records(queue).size(), 1u) << "too late";
-}
-
 TEST(MultiTaskQueue, lists_jobs_in_the_order_of_adding) {
     Queue const queue = make(MultiTaskQueue::Continue, 0);
     int numbers[4] = {};
@@ -296,7 +266,7 @@ TEST(MultiTaskQueue, goes_on_behind_a_record_that_was_dropped_under_the_walk) {
         for (std::size_t i = 0; i < dropped; ++i) queue->next();
         ASSERT_NE(queue->current(), nullptr);
         jobs[dropped].open();
-        EXPECT_TRUE(soon([&] { return queue->current() == nullptr; }));
+        EXPECT_TRUE(waitFor([&] { return queue->current() == nullptr; }));
         if (dropped < 2) {
             MTQ_Dat const* const following = queue->next();
             ASSERT_NE(following, nullptr);
@@ -351,36 +321,5 @@ TEST(MultiTaskQueue, has_looked_at_every_end_when_waiting_ends) {
         EXPECT_TRUE(isDeleted);
         EXPECT_TRUE(queue->failed());
         EXPECT_EQ(queue->first(), nullptr);
-    }
-}
-
-TEST(MultiTaskQueue, Kept_queue_03_counts_only_the_end_of_a_job_that_is_started_by_its_record) {
-    Queue const queue = make(MultiTaskQueue::StopOnError, 0);
-    GatedJob direct, first, second;
-    EXPECT_TRUE(add(queue, direct));
-    EXPECT_TRUE(queue->first()->start());
-    EXPECT_TRUE(queue->first()->started());
-    EXPECT_TRUE(soon([&] { return direct.runs(); }));
-    queue->wait(); // nothing that it knows of runs
-    EXPECT_FALSE(queue->first()->finished());
-    EXPECT_TRUE(add(queue, first, true)); // running: 1
-    direct.open(false);
-    EXPECT_TRUE(soon([&] { return queue->failed(); })) << "its end is reported all the same";
-    queue->wait(); // the other's end counted for the one that still runs
-    EXPECT_FALSE(records(queue)[1]->finished());
-    first.open();
-    EXPECT_TRUE(soon([&] { return records(queue)[1]->finished(); }));
-}
-
-TEST(MultiTaskQueue, drops_a_job_that_was_started_by_its_record) {
-    for (int i = 0; i < 500; ++i) {
-        std::atomic<int> deletions{0};
-        Queue queue = make(MultiTaskQueue::Continue, 0);
-        auto* const job = new GatedJob(&deletions);
-        job->open();
-        queue->add(GatedJob::run, job->argument(), true, false, true);
-        EXPECT_TRUE(queue->first()->start());
-        EXPECT_TRUE(soon([&] { return deletions == 1; }));
-        queue.reset();
     }
 }

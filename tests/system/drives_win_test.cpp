@@ -14,7 +14,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-using LocalDisks = RegistryTest;
+using LocalDisksWin = RegistryScratch;
 
 UINT kind = DRIVE_UNKNOWN;
 std::string askedVolume;
@@ -68,8 +68,8 @@ DWORD WINAPI connection(char const* drive, char* remote, DWORD* n) {
 
 using Steps = std::vector<std::string>;
 
-struct MappedDrives : RegistryTest {
-    MappedDrives() {
+struct MappedDrivesWin : RegistryScratch {
+    MappedDrivesWin() {
         steps.clear();
         admits = acts = true;
         connected = nullptr;
@@ -106,7 +106,7 @@ std::string unmappedLogin(char const* path) {
 
 } // namespace
 
-TEST_F(LocalDisks, are_fixed_optical_or_in_memory) {
+TEST_F(LocalDisksWin, are_fixed_optical_or_in_memory) {
     queryCalls.volumePath = volumePath;
     queryCalls.driveType = driveType;
     for (UINT k = 0; k <= 8; ++k) {
@@ -128,7 +128,7 @@ TEST_F(LocalDisks, are_fixed_optical_or_in_memory) {
     EXPECT_EQ(askedVolume, "V:\\x") << "a view ends where it ends";
 }
 
-TEST_F(LocalDisks, Kept_sys_05_may_be_listed_as_devices) {
+TEST_F(LocalDisksWin, Kept_sys_05_may_be_listed_as_devices) {
     setBytes(HKEY_LOCAL_MACHINE, MOUNTED_DEVICES, "\\DosDevices\\Q:", REG_BINARY, "device");
     setBytes(HKEY_LOCAL_MACHINE, MOUNTED_DEVICES, "\\DosDevices\\R", REG_BINARY, "device");
     for (bool known : {true, false}) {
@@ -148,7 +148,7 @@ TEST_F(LocalDisks, Kept_sys_05_may_be_listed_as_devices) {
     EXPECT_FALSE(Sys::isLocalDisk("Q:\\x"));
 }
 
-TEST_F(LocalDisks, of_this_machine_can_be_asked) {
+TEST_F(LocalDisksWin, of_this_machine_can_be_asked) {
     EXPECT_TRUE(Sys::isLocalDisk("C:\\"));
     EXPECT_TRUE(Sys::isLocalDisk("C:\\no\\such\\path"));
     EXPECT_TRUE(Sys::isLocalDisk("C:/windows"));
@@ -156,7 +156,7 @@ TEST_F(LocalDisks, of_this_machine_can_be_asked) {
     EXPECT_FALSE(Sys::isLocalDisk(""));
 }
 
-TEST_F(MappedDrives, Kept_sys_06_give_three_characters_for_the_share) {
+TEST_F(MappedDrivesWin, Kept_sys_06_give_three_characters_for_the_share) {
     set(HKEY_CURRENT_USER, "Network\\P", "RemotePath", "\\\\srv\\share");
     set(HKEY_CURRENT_USER, "Network\\R", "RemotePath", "\\\\srv\\share\\");
     set(HKEY_CURRENT_USER, "Network\\S", "RemotePath", "//srv/share/");
@@ -192,7 +192,7 @@ TEST_F(MappedDrives, Kept_sys_06_give_three_characters_for_the_share) {
     EXPECT_EQ(steps, Steps{}) << "nobody is logged on";
 }
 
-TEST_F(MappedDrives, survive_values_that_are_no_texts) {
+TEST_F(MappedDrivesWin, survive_values_that_are_no_texts) {
     setRaw(HKEY_CURRENT_USER, "Network\\P", "RemotePath", "\\\\srv\\open");
     setRaw(HKEY_CURRENT_USER, "Network\\R", "RemotePath", "ab", REG_DWORD);
     set(HKEY_CURRENT_USER, "Network\\S", "RemotePath", "\\\\srv\\" + std::string(505, 's'));
@@ -203,7 +203,7 @@ TEST_F(MappedDrives, survive_values_that_are_no_texts) {
     EXPECT_EQ(unmapped("T:\\x"), "before") << "longer than 512 bytes";
 }
 
-TEST_F(MappedDrives, are_those_of_a_users_profile) {
+TEST_F(MappedDrivesWin, are_those_of_a_users_profile) {
     set(HKEY_CURRENT_USER, "Network\\P", "RemotePath", "\\\\srv\\current");
     makeProfile("zb_a", "jane", "SALES");
     makeProfile("zb_b", "john", "SALES");
@@ -237,7 +237,7 @@ TEST_F(MappedDrives, are_those_of_a_users_profile) {
     EXPECT_EQ(steps, Steps{});
 }
 
-TEST_F(MappedDrives, are_asked_of_the_user_who_is_logged_on_for_it) {
+TEST_F(MappedDrivesWin, are_asked_of_the_user_who_is_logged_on_for_it) {
     makeProfile("zb_a", "jane", "SALES");
     map("zb_a", 'P', "\\\\srv\\jane");
     EXPECT_EQ(unmapped("P:\\x", "jane@SALES", "secret"), "\\\\srv\\jane/x");
@@ -267,7 +267,7 @@ TEST_F(MappedDrives, are_asked_of_the_user_who_is_logged_on_for_it) {
     EXPECT_EQ(steps, Steps{}) << "nobody is no user";
 }
 
-TEST_F(MappedDrives, are_those_of_whoever_is_logged_on) {
+TEST_F(MappedDrivesWin, are_those_of_whoever_is_logged_on) {
     set(HKEY_CURRENT_USER, "Network\\P", "RemotePath", "\\\\srv\\current");
     makeProfile("zb_a", "jane", "SALES");
     makeProfile("zb_b", "john", "SALES");
@@ -287,7 +287,7 @@ TEST_F(MappedDrives, are_those_of_whoever_is_logged_on) {
     EXPECT_EQ(unmappedLogin(""), "before");
 }
 
-TEST_F(MappedDrives, of_this_machine_can_be_asked) {
+TEST_F(MappedDrivesWin, of_this_machine_can_be_asked) {
     queryCalls.connection = realCalls.connection;
     EXPECT_EQ(unmappedLogin("Q:\\x"), "before");
 }
@@ -316,7 +316,7 @@ void askEverything() {
 
 } // namespace
 
-TEST_F(MappedDrives, and_all_other_queries_close_what_they_open_whichever_call_fails) {
+TEST_F(MappedDrivesWin, and_all_other_queries_close_what_they_open_whichever_call_fails) {
     set(HKEY_LOCAL_MACHINE, DOMAIN_CACHE, "SALES", "sales.example");
     makeProfile("zb_a", "jane", "SALES");
     map("zb_a", 'P', "\\\\srv\\jane");

@@ -84,8 +84,8 @@ int jane(char const* name, passwd* record, char* buffer, std::size_t, passwd** f
     return 0;
 }
 
-struct LogonLinux : QueryCallsTest {
-    LogonLinux() {
+struct LogonPosix : QueryCallsTest {
+    LogonPosix() {
         asked.clear();
         changes.clear();
         failing.clear();
@@ -95,7 +95,7 @@ struct LogonLinux : QueryCallsTest {
         queryCalls.groupsOf = threeGroups;
         admitWith("auth required pam_permit.so\naccount required pam_permit.so\n");
     }
-    ~LogonLinux() override { Sys::revertToSelf(); }
+    ~LogonPosix() override { Sys::revertToSelf(); }
 
     void admitWith(std::string const& rules) { put(scratch / "zor_basis", rules); }
 
@@ -116,7 +116,7 @@ using Changes = std::vector<std::string>;
 
 } // namespace
 
-TEST_F(LogonLinux, asks_pam_by_the_name_of_the_service) {
+TEST_F(LogonPosix, asks_pam_by_the_name_of_the_service) {
     Handle const first(Sys::loginUser("jane", "secret", true));
     ASSERT_NE(first, nullptr);
     EXPECT_TRUE(first->isValid());
@@ -129,7 +129,7 @@ TEST_F(LogonLinux, asks_pam_by_the_name_of_the_service) {
     EXPECT_EQ(asked, (Changes{"zor_basis jane", "zor_basis jane@SALES", "zor_basis jane@SALES", "zor_basis jane"}));
 }
 
-TEST_F(LogonLinux, fails_where_pam_refuses) {
+TEST_F(LogonPosix, fails_where_pam_refuses) {
     admitWith("auth required pam_deny.so\naccount required pam_permit.so\n");
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr);
     admitWith("auth required pam_permit.so\naccount required pam_deny.so\n");
@@ -141,7 +141,7 @@ TEST_F(LogonLinux, fails_where_pam_refuses) {
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr);
 }
 
-TEST_F(LogonLinux, fails_for_users_without_an_account) {
+TEST_F(LogonPosix, fails_for_users_without_an_account) {
     EXPECT_EQ(Sys::loginUser("john", "secret", true), nullptr);
     queryCalls.groupsOf = endlessGroups;
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "whose groups are unknown";
@@ -153,7 +153,7 @@ TEST_F(LogonLinux, fails_for_users_without_an_account) {
     EXPECT_EQ(changes.front(), "groups 5000");
 }
 
-TEST_F(LogonLinux, hands_the_password_to_the_modules) {
+TEST_F(LogonPosix, hands_the_password_to_the_modules) {
     if (!fs::exists(MATRIX)) CASE_CANNOT_HOLD("libpam-wrapper is not installed");
     put(scratch / "passwords", "jane:secret:zor_basis\njohn:secret:other\n");
     std::string const module = std::string(" required ") + MATRIX + " passdb=" + (scratch / "passwords");
@@ -173,7 +173,7 @@ TEST_F(LogonLinux, hands_the_password_to_the_modules) {
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "the password is shown to nobody";
 }
 
-TEST_F(LogonLinux, changes_the_user_last_and_back_first) {
+TEST_F(LogonPosix, changes_the_user_last_and_back_first) {
     pretend();
     Handle const handle(Sys::loginUser("jane", "secret", true));
     ASSERT_NE(handle, nullptr);
@@ -188,7 +188,7 @@ TEST_F(LogonLinux, changes_the_user_last_and_back_first) {
     EXPECT_EQ(changes, Changes{}) << "it was itself";
 }
 
-TEST_F(LogonLinux, acts_as_one_user_at_a_time) {
+TEST_F(LogonPosix, acts_as_one_user_at_a_time) {
     pretend();
     Handle const handle(Sys::loginUser("jane", "secret", true));
     Changes const there{"groups 3", "group 4002", "user 4001"};
@@ -217,7 +217,7 @@ TEST_F(LogonLinux, acts_as_one_user_at_a_time) {
     EXPECT_EQ(changes, back) << "whatever becomes of it";
 }
 
-TEST_F(LogonLinux, leaves_the_thread_as_it_was_where_a_change_fails) {
+TEST_F(LogonPosix, leaves_the_thread_as_it_was_where_a_change_fails) {
     pretend();
     Handle const handle(Sys::loginUser("jane", "secret", true));
     failing = "groups 3";
@@ -239,7 +239,7 @@ TEST_F(LogonLinux, leaves_the_thread_as_it_was_where_a_change_fails) {
     EXPECT_EQ(changes, Changes{});
 }
 
-TEST_F(LogonLinux, stays_where_the_way_back_fails_and_can_try_again) {
+TEST_F(LogonPosix, stays_where_the_way_back_fails_and_can_try_again) {
     pretend();
     Handle const handle(Sys::loginUser("jane", "secret", true));
     for (char const* step : {"user 10", "group 20", "groups 2"}) {
@@ -255,7 +255,7 @@ TEST_F(LogonLinux, stays_where_the_way_back_fails_and_can_try_again) {
     }
 }
 
-TEST_F(LogonLinux, is_a_matter_of_one_thread) {
+TEST_F(LogonPosix, is_a_matter_of_one_thread) {
     pretend();
     Handle const handle(Sys::loginUser("jane", "secret", true));
     ASSERT_TRUE(Sys::impersonate(handle.get()));
@@ -266,7 +266,7 @@ TEST_F(LogonLinux, is_a_matter_of_one_thread) {
     EXPECT_EQ(changes.size(), 3u);
 }
 
-TEST_F(LogonLinux, really_acts_as_nobody_while_another_thread_stays_root) {
+TEST_F(LogonPosix, really_acts_as_nobody_while_another_thread_stays_root) {
     if (geteuid() != 0) CASE_CANNOT_HOLD("only root may act as others");
     queryCalls.userByName = real.userByName;
     queryCalls.groupsOf = real.groupsOf;
@@ -301,7 +301,7 @@ TEST_F(LogonLinux, really_acts_as_nobody_while_another_thread_stays_root) {
     EXPECT_EQ(status.st_gid, nogroup);
 }
 
-TEST_F(LogonLinux, really_fails_without_privilege) {
+TEST_F(LogonPosix, really_fails_without_privilege) {
     if (geteuid() != 0) CASE_CANNOT_HOLD("only root can give its privilege up");
     queryCalls.userByName = real.userByName;
     queryCalls.groupsOf = real.groupsOf;
@@ -323,7 +323,7 @@ TEST_F(LogonLinux, really_fails_without_privilege) {
     }).join();
 }
 
-TEST_F(LogonLinux, leaves_nothing_behind_after_10000_times) {
+TEST_F(LogonPosix, leaves_nothing_behind_after_10000_times) {
     if (geteuid() != 0) CASE_CANNOT_HOLD("only root may act as others");
     queryCalls.userByName = real.userByName;
     queryCalls.groupsOf = real.groupsOf;

@@ -45,8 +45,8 @@ BOOL WINAPI closeHandle(HANDLE handle) {
     return TRUE;
 }
 
-struct LogonWindows : testing::Test {
-    LogonWindows() {
+struct LogonWin : testing::Test {
+    LogonWin() {
         steps.clear();
         nextToken = reinterpret_cast<HANDLE>(77);
         admits = acts = reverts = TRUE;
@@ -55,7 +55,7 @@ struct LogonWindows : testing::Test {
         queryCalls.revertToSelf = revert;
         queryCalls.closeHandle = closeHandle;
     }
-    ~LogonWindows() override { queryCalls = real; }
+    ~LogonWin() override { queryCalls = real; }
 
     QueryCalls const real = queryCalls;
 };
@@ -79,7 +79,7 @@ bool threadActs() {
 
 } // namespace
 
-TEST_F(LogonWindows, asks_for_the_user_that_is_named) {
+TEST_F(LogonWin, asks_for_the_user_that_is_named) {
     struct Case {
         Row row;
         char const* user;
@@ -109,7 +109,7 @@ TEST_F(LogonWindows, asks_for_the_user_that_is_named) {
     EXPECT_EQ(steps, (Steps{"revert", "logon <jane> null  2 3"}));
 }
 
-TEST_F(LogonWindows, gives_nothing_where_it_is_refused) {
+TEST_F(LogonWin, gives_nothing_where_it_is_refused) {
     admits = FALSE;
     EXPECT_EQ(Sys::loginUser("jane", "wrong", true), nullptr);
     EXPECT_EQ(steps, (Steps{"revert", "logon <jane> null wrong 2 3"})) << "and closes nothing";
@@ -118,7 +118,7 @@ TEST_F(LogonWindows, gives_nothing_where_it_is_refused) {
     EXPECT_EQ(steps, Steps{}) << "an empty user is refused at once";
 }
 
-TEST_F(LogonWindows, closes_the_token_with_its_handle) {
+TEST_F(LogonWin, closes_the_token_with_its_handle) {
     delete Sys::loginUser("jane", "secret", true);
     EXPECT_EQ(steps.back(), "close 77");
     nextToken = nullptr;
@@ -135,7 +135,7 @@ TEST_F(LogonWindows, closes_the_token_with_its_handle) {
     EXPECT_EQ(steps.size(), 3u) << "a logon and two reversions: there is nothing to act with and nothing to close";
 }
 
-TEST_F(LogonWindows, lets_the_thread_act_as_one_user_at_a_time) {
+TEST_F(LogonWin, lets_the_thread_act_as_one_user_at_a_time) {
     Handle const handle(Sys::loginUser("jane", "secret", true));
     steps.clear();
     EXPECT_TRUE(Sys::impersonate(handle.get()));
@@ -155,7 +155,7 @@ TEST_F(LogonWindows, lets_the_thread_act_as_one_user_at_a_time) {
     EXPECT_TRUE(Sys::impersonate(nullptr)) << "whatever the system says";
 }
 
-TEST_F(LogonWindows, really_acts_with_a_token_of_its_own) {
+TEST_F(LogonWin, really_acts_with_a_token_of_its_own) {
     queryCalls = real;
     queryCalls.logonUser = logonUser;
     nextToken = ownToken();
@@ -180,7 +180,7 @@ TEST_F(LogonWindows, really_acts_with_a_token_of_its_own) {
     EXPECT_FALSE(threadActs()) << "a logon is made as the process itself";
 }
 
-TEST_F(LogonWindows, leaves_no_handle_behind_after_10000_times) {
+TEST_F(LogonWin, leaves_no_handle_behind_after_10000_times) {
     queryCalls = real;
     queryCalls.logonUser = logonUser;
     DWORD before = 0, after = 0;
@@ -198,7 +198,7 @@ TEST_F(LogonWindows, leaves_no_handle_behind_after_10000_times) {
     EXPECT_FALSE(threadActs());
 }
 
-TEST_F(LogonWindows, really_refuses_to_act_with_a_token_that_is_none) {
+TEST_F(LogonWin, really_refuses_to_act_with_a_token_that_is_none) {
     queryCalls = real;
     queryCalls.logonUser = logonUser;
     queryCalls.closeHandle = closeHandle;
@@ -208,7 +208,7 @@ TEST_F(LogonWindows, really_refuses_to_act_with_a_token_that_is_none) {
     EXPECT_FALSE(threadActs());
 }
 
-TEST_F(LogonWindows, really_logs_on_or_refuses_cleanly) {
+TEST_F(LogonWin, really_logs_on_or_refuses_cleanly) {
     // Wine admits everyone, with a token that nobody can act with; Windows does not know this user.
     queryCalls = real;
     Handle const handle(Sys::loginUser("zb_no_such_user", "secret", true));

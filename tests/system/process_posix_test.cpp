@@ -60,7 +60,7 @@ struct ProcessPosix : testing::Test {
     Scratch scratch;
 };
 
-using ProcessPosixFaults = ProcessPosix;
+using ProcessFaultsPosix = ProcessPosix;
 
 /* Calls that fail */
 
@@ -242,7 +242,7 @@ TEST_F(ProcessPosix, has_no_exit_code_where_children_are_ignored) {
 
 /* Faults */
 
-TEST_F(ProcessPosixFaults, a_program_that_cannot_be_started) {
+TEST_F(ProcessFaultsPosix, a_program_that_cannot_be_started) {
     processCalls.spawn = noSpawn;
     processCalls.spawnFromPath = noSpawn;
     unsigned long id = 5;
@@ -253,7 +253,7 @@ TEST_F(ProcessPosixFaults, a_program_that_cannot_be_started) {
     EXPECT_EQ(code, 0);
 }
 
-TEST_F(ProcessPosixFaults, an_end_that_cannot_be_learned) {
+TEST_F(ProcessFaultsPosix, an_end_that_cannot_be_learned) {
     processCalls.waitFor = noWait;
     EXPECT_EQ(shell("exit 3"), 0);
     unsigned long const id = start("/bin/true");
@@ -262,7 +262,7 @@ TEST_F(ProcessPosixFaults, an_end_that_cannot_be_learned) {
     while (waitid(P_ALL, 0, nullptr, WEXITED) == 0) {}
 }
 
-TEST_F(ProcessPosixFaults, a_process_that_cannot_be_opened) {
+TEST_F(ProcessFaultsPosix, a_process_that_cannot_be_opened) {
     unsigned long const id = start("/bin/true");
     processCalls.openProcess = noDescriptor;
     EXPECT_FALSE(Process::Wait(id));
@@ -272,7 +272,7 @@ TEST_F(ProcessPosixFaults, a_process_that_cannot_be_opened) {
     EXPECT_FALSE(hasChildren()) << "it was remembered";
 }
 
-TEST_F(ProcessPosixFaults, a_wait_that_fails_leaves_nothing_open) {
+TEST_F(ProcessFaultsPosix, a_wait_that_fails_leaves_nothing_open) {
     std::size_t const before = openHandles();
     unsigned long const id = start("/bin/true");
     processCalls.awaitDescriptor = noPoll;
@@ -282,7 +282,7 @@ TEST_F(ProcessPosixFaults, a_wait_that_fails_leaves_nothing_open) {
     EXPECT_TRUE(Process::Wait(id));
 }
 
-TEST_F(ProcessPosixFaults, an_end_that_is_not_allowed) {
+TEST_F(ProcessFaultsPosix, an_end_that_is_not_allowed) {
     unsigned long const id = startEndless();
     processCalls.signalDescriptor = noSignal;
     EXPECT_FALSE(Process::Terminate(id));
@@ -291,7 +291,7 @@ TEST_F(ProcessPosixFaults, an_end_that_is_not_allowed) {
     EXPECT_TRUE(Process::Wait(id));
 }
 
-TEST_F(ProcessPosixFaults, interruptions_do_not_end_a_wait) {
+TEST_F(ProcessFaultsPosix, interruptions_do_not_end_a_wait) {
     processCalls.awaitDescriptor = interruptedPoll;
     processCalls.waitFor = interruptedWait;
     interruptions = 3;
@@ -304,7 +304,7 @@ TEST_F(ProcessPosixFaults, interruptions_do_not_end_a_wait) {
     EXPECT_FALSE(hasChildren());
 }
 
-TEST_F(ProcessPosixFaults, a_system_without_descriptors_of_processes_knows_children) {
+TEST_F(ProcessFaultsPosix, a_system_without_descriptors_of_processes_knows_children) {
     processCalls.openProcess = noSuchCall;
     unsigned long const id = startEndless();
     EXPECT_TRUE(Process::Terminate(id));

@@ -32,8 +32,8 @@ constexpr char FUNCTION[] = "getpid";
 
 std::string quoted(std::string const& text) { return '"' + text + '"'; }
 
-struct ProcessTest : testing::Test {
-    ~ProcessTest() override {
+struct ProcessOfThisUser : testing::Test {
+    ~ProcessOfThisUser() override {
         xos_HostFailClear();
         xos_HostSetResolver(nullptr);
     }
@@ -46,13 +46,13 @@ struct ProcessTest : testing::Test {
 
 } // namespace
 
-TEST_F(ProcessTest, breathes) {
+TEST_F(ProcessOfThisUser, breathes) {
     int code = -1;
     EXPECT_TRUE(Process::Create(nullptr, nullptr, lineOf("exit 3").c_str(), &code));
     EXPECT_EQ(code, 3);
 }
 
-TEST_F(ProcessTest, is_awaited_and_gives_its_exit_code) {
+TEST_F(ProcessOfThisUser, is_awaited_and_gives_its_exit_code) {
     for (int const expected : {0, 1, 77, 255}) {
         int code = -1;
         EXPECT_TRUE(Process::Create(nullptr, nullptr, lineOf("exit " + std::to_string(expected)).c_str(), &code));
@@ -61,7 +61,7 @@ TEST_F(ProcessTest, is_awaited_and_gives_its_exit_code) {
     EXPECT_TRUE(Process::Create(nullptr, nullptr, lineOf("exit 4").c_str(), nullptr)) << "nobody asks";
 }
 
-TEST_F(ProcessTest, is_started_by_its_path) {
+TEST_F(ProcessOfThisUser, is_started_by_its_path) {
     int code = -1;
     EXPECT_TRUE(Process::Create(program.c_str(), nullptr, "any-name exit 5", &code));
     EXPECT_EQ(code, 5);
@@ -73,7 +73,7 @@ TEST_F(ProcessTest, is_started_by_its_path) {
     EXPECT_EQ(code, 9);
 }
 
-TEST_F(ProcessTest, takes_its_words_apart_itself) {
+TEST_F(ProcessOfThisUser, takes_its_words_apart_itself) {
     std::string const file = scratch / "words";
     std::string const line =
         lineOf("words " + quoted(file) + " plain \"two words\" \"\" a\\b \"c\\\\\" \\\"d\\\" $HOME 'e f' g&h >i");
@@ -83,7 +83,7 @@ TEST_F(ProcessTest, takes_its_words_apart_itself) {
     EXPECT_EQ(textOf(file), "plain\ntwo words\n\na\\b\nc\\\n\"d\"\n$HOME\n'e\nf'\ng&h\n>i\n");
 }
 
-TEST_F(ProcessTest, Kept_process_01_runs_by_itself_and_leaves_no_exit_code) {
+TEST_F(ProcessOfThisUser, Kept_process_01_runs_by_itself_and_leaves_no_exit_code) {
     std::string const file = scratch / "go";
     unsigned long id = 0;
     int code = 55;
@@ -96,7 +96,7 @@ TEST_F(ProcessTest, Kept_process_01_runs_by_itself_and_leaves_no_exit_code) {
     starter.join();
 }
 
-TEST_F(ProcessTest, is_not_there) {
+TEST_F(ProcessOfThisUser, is_not_there) {
     std::string const missing = programBeside("no_such_program");
     struct Case {
         Row row;
@@ -127,7 +127,7 @@ TEST_F(ProcessTest, is_not_there) {
     EXPECT_EQ(code, 0);
 }
 
-TEST_F(ProcessTest, is_not_found_under_an_identifier_that_there_is_not) {
+TEST_F(ProcessOfThisUser, is_not_found_under_an_identifier_that_there_is_not) {
     for (unsigned long const id : {0UL, 0x7FFFFFFEUL, 0xFFFFFFFFUL, ULONG_MAX}) {
         SCOPED_TRACE(id);
         EXPECT_FALSE(Process::Wait(id));
@@ -135,7 +135,7 @@ TEST_F(ProcessTest, is_not_found_under_an_identifier_that_there_is_not) {
     }
 }
 
-TEST_F(ProcessTest, leaves_nothing_open) {
+TEST_F(ProcessOfThisUser, leaves_nothing_open) {
     std::string const line = lineOf("exit 6");
     int code = 0;
     ASSERT_TRUE(Process::Create(nullptr, nullptr, line.c_str(), &code));
@@ -147,7 +147,7 @@ TEST_F(ProcessTest, leaves_nothing_open) {
     EXPECT_EQ(openHandles(), before);
 }
 
-TEST_F(ProcessTest, is_awaited_by_many_threads_at_once) {
+TEST_F(ProcessOfThisUser, is_awaited_by_many_threads_at_once) {
     std::vector<std::thread> threads;
     std::vector<int> codes(4, -1);
     for (std::size_t i = 0; i < codes.size(); ++i) {
@@ -162,7 +162,7 @@ TEST_F(ProcessTest, is_awaited_by_many_threads_at_once) {
 
 /* Libraries */
 
-TEST_F(ProcessTest, loads_libraries_and_finds_their_functions) {
+TEST_F(ProcessOfThisUser, loads_libraries_and_finds_their_functions) {
     void* const library = Process::loadLib(LIBRARY);
     ASSERT_NE(library, nullptr);
     EXPECT_EQ(std::string(xos_HostLastCall("xos_LibraryLoad")), quoted(LIBRARY));
@@ -173,7 +173,7 @@ TEST_F(ProcessTest, loads_libraries_and_finds_their_functions) {
     EXPECT_EQ(Process::ptrFunc(nullptr, library), nullptr);
 }
 
-TEST_F(ProcessTest, finds_a_function_that_works) {
+TEST_F(ProcessOfThisUser, finds_a_function_that_works) {
     void* const function = Process::ptrFunc(FUNCTION, Process::loadLib(LIBRARY));
     ASSERT_NE(function, nullptr);
     auto* const ownId = reinterpret_cast<unsigned (*)()>(function);
@@ -181,7 +181,7 @@ TEST_F(ProcessTest, finds_a_function_that_works) {
     EXPECT_EQ(ownId(), ownId());
 }
 
-TEST_F(ProcessTest, loads_no_library_that_is_not_there) {
+TEST_F(ProcessOfThisUser, loads_no_library_that_is_not_there) {
     EXPECT_EQ(Process::loadLib("zb_no_such_library"), nullptr);
     EXPECT_EQ(Process::loadLib(""), nullptr);
     EXPECT_EQ(Process::loadLib(nullptr), nullptr);
@@ -201,7 +201,7 @@ void* resolver(void* module, char const* name) {
 
 } // namespace
 
-TEST_F(ProcessTest, asks_the_platform_where_there_is_no_module) {
+TEST_F(ProcessOfThisUser, asks_the_platform_where_there_is_no_module) {
     EXPECT_EQ(Process::ptrFunc("known", nullptr), nullptr) << "without a resolver";
     xos_HostSetResolver(resolver);
     EXPECT_EQ(Process::ptrFunc("known", nullptr), &resolved);

@@ -83,21 +83,21 @@ BOOL WINAPI closeHandle(HANDLE handle) {
 using Calls = std::vector<std::string>;
 
 /// A system of our own.
-struct ProcessWinCalls : testing::Test {
-    ProcessWinCalls() {
+struct ProcessCallsWin : testing::Test {
+    ProcessCallsWin() {
         calls.clear();
         works = true;
         waitResult = WAIT_OBJECT_0;
         processCalls = {create, open, waitFor, exitCode, terminate, closeHandle};
     }
-    ~ProcessWinCalls() override { processCalls = real; }
+    ~ProcessCallsWin() override { processCalls = real; }
 
     ProcessCalls const real = processCalls;
 };
 
 } // namespace
 
-TEST_F(ProcessWinCalls, create_and_await) {
+TEST_F(ProcessCallsWin, create_and_await) {
     int code = 55;
     EXPECT_TRUE(Process::Create("app.exe", nullptr, "app \"a b\"", &code));
     EXPECT_EQ(calls, (Calls{"create app.exe app \"a b\" 16", "wait process", "code process", "close process",
@@ -105,12 +105,12 @@ TEST_F(ProcessWinCalls, create_and_await) {
     EXPECT_EQ(code, static_cast<int>(0xC0000005));
 }
 
-TEST_F(ProcessWinCalls, create_and_await_without_asking_for_the_code) {
+TEST_F(ProcessCallsWin, create_and_await_without_asking_for_the_code) {
     EXPECT_TRUE(Process::Create(nullptr, nullptr, "app", nullptr));
     EXPECT_EQ(calls, (Calls{"create null app 16", "wait process", "close process", "close thread"}));
 }
 
-TEST_F(ProcessWinCalls, create_and_let_run) {
+TEST_F(ProcessCallsWin, create_and_let_run) {
     unsigned long id = 0;
     int code = 55;
     EXPECT_TRUE(Process::Create("app.exe", &id, nullptr, &code));
@@ -119,7 +119,7 @@ TEST_F(ProcessWinCalls, create_and_let_run) {
     EXPECT_EQ(code, 0);
 }
 
-TEST_F(ProcessWinCalls, create_that_fails) {
+TEST_F(ProcessCallsWin, create_that_fails) {
     works = false;
     unsigned long id = 5;
     int code = 55;
@@ -129,7 +129,7 @@ TEST_F(ProcessWinCalls, create_that_fails) {
     EXPECT_EQ(code, 0);
 }
 
-TEST_F(ProcessWinCalls, exit_code_that_cannot_be_had) {
+TEST_F(ProcessCallsWin, exit_code_that_cannot_be_had) {
     processCalls.exitCodeOf = noExitCode;
     int code = 55;
     EXPECT_TRUE(Process::Create("app.exe", nullptr, nullptr, &code));
@@ -139,7 +139,7 @@ TEST_F(ProcessWinCalls, exit_code_that_cannot_be_had) {
     EXPECT_EQ(calls.back(), "close thread");
 }
 
-TEST_F(ProcessWinCalls, wait) {
+TEST_F(ProcessCallsWin, wait) {
     EXPECT_TRUE(Process::Wait(77));
     EXPECT_EQ(calls, (Calls{"open " + std::to_string(SYNCHRONIZE) + " 0 77", "wait process", "close process"}));
     for (DWORD const result : {DWORD{WAIT_FAILED}, DWORD{WAIT_ABANDONED}, DWORD{WAIT_TIMEOUT}}) {
@@ -153,7 +153,7 @@ TEST_F(ProcessWinCalls, wait) {
     EXPECT_EQ(calls, (Calls{"open " + std::to_string(SYNCHRONIZE) + " 0 77", "wait null"})) << "nothing to close";
 }
 
-TEST_F(ProcessWinCalls, terminate) {
+TEST_F(ProcessCallsWin, terminate) {
     EXPECT_TRUE(Process::Terminate(77));
     EXPECT_EQ(calls,
               (Calls{"open " + std::to_string(PROCESS_TERMINATE) + " 0 77", "terminate process 0", "close process"}));
@@ -171,14 +171,14 @@ namespace {
 class Running {
 public:
     Running() {
-        std::string const line = '"' + programBeside("process_child") + "\" until \"" + file + '"';
+        std::string const line = '"' + programBeside("process_child") + "\" until \"" + file_ + '"';
         EXPECT_TRUE(Process::Create(nullptr, &id, line.c_str(), nullptr));
         kept_ = OpenProcess(PROCESS_QUERY_INFORMATION | SYNCHRONIZE, FALSE, id);
         EXPECT_NE(kept_, nullptr);
     }
     ~Running() { CloseHandle(kept_); }
 
-    void go() const { put(file, "go"); }
+    void go() const { put(file_, "go"); }
     DWORD exitCode() const {
         DWORD code = STILL_ACTIVE;
         GetExitCodeProcess(kept_, &code);
@@ -189,7 +189,7 @@ public:
 
 private:
     Scratch scratch_;
-    std::string const file = scratch_ / "go";
+    std::string const file_ = scratch_ / "go";
     HANDLE kept_ = nullptr;
 };
 

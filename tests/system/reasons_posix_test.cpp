@@ -83,7 +83,7 @@ bool saves(std::string const& path) {
 
 } // namespace
 
-TEST(ReasonsOnLinux, of_those_who_may_not) {
+TEST(ReasonsPosix, of_those_who_may_not) {
     if (!isPrivileged()) CASE_CANNOT_HOLD("only root becomes another user");
     HttpServer const server{{{"/page", always(answer("200 OK", "the page"))}}};
     using In = Place const&;
@@ -135,7 +135,7 @@ TEST(ReasonsOnLinux, of_those_who_may_not) {
     });
 }
 
-TEST(ReasonsOnLinux, of_a_full_device) {
+TEST(ReasonsPosix, of_a_full_device) {
     std::string const text(1 << 20, 'x');
     expectReasons({
         Failure{{}, ENOSPC, 0, [&](auto&) { return File("/dev/full", File::FILE_WRITE)->write("x", 1) == 1; }},
@@ -168,7 +168,7 @@ TEST(ReasonsOnLinux, of_a_full_device) {
     });
 }
 
-TEST(ReasonsOnLinux, of_a_disk_that_becomes_full) {
+TEST(ReasonsPosix, of_a_disk_that_becomes_full) {
     Scratch const disk;
     SmallDisk const small(disk.path());
     if (!small.isMounted()) CASE_CANNOT_HOLD("mounting a file system needs privilege");
@@ -208,7 +208,7 @@ TEST(ReasonsOnLinux, of_a_disk_that_becomes_full) {
     });
 }
 
-TEST(ReasonsOnLinux, of_what_only_linux_has_or_tells) {
+TEST(ReasonsPosix, of_what_only_linux_has_or_tells) {
     char buffer[8];
     expectReasons({
         // Wine reads from such a stream.
@@ -316,8 +316,8 @@ bool refuseUser(uid_t) {
     return false;
 }
 
-struct ReasonsOfLogon : QueryCallsTest {
-    ReasonsOfLogon() {
+struct ReasonsOfLogonPosix : QueryCallsTest {
+    ReasonsOfLogonPosix() {
         configuration = rules.path();
         queryCalls.pamStart = startConfigured;
         queryCalls.userByName = oneAccount;
@@ -333,7 +333,7 @@ struct ReasonsOfLogon : QueryCallsTest {
 
 } // namespace
 
-TEST_F(ReasonsOfLogon, are_the_refusal_or_what_the_system_says) {
+TEST_F(ReasonsOfLogonPosix, are_the_refusal_or_what_the_system_says) {
     expectReasons({
         Failure{{},
                 EKEYREJECTED,
@@ -384,7 +384,7 @@ TEST_F(ReasonsOfLogon, are_the_refusal_or_what_the_system_says) {
     });
 }
 
-TEST_F(ReasonsOfLogon, are_those_of_the_first_refusal_where_acting_fails) {
+TEST_F(ReasonsOfLogonPosix, are_those_of_the_first_refusal_where_acting_fails) {
     std::unique_ptr<SysHdl> const jane(Sys::loginUser("jane", "secret", true));
     ASSERT_NE(jane, nullptr);
     expectReasons({

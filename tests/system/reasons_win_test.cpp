@@ -36,8 +36,8 @@ HANDLE WINAPI refuseToOpen(DWORD, BOOL, DWORD) {
     return nullptr;
 }
 
-struct ReasonsOnWindows : testing::Test {
-    ~ReasonsOnWindows() override {
+struct ReasonsWin : testing::Test {
+    ~ReasonsWin() override {
         queryCalls = queries;
         processCalls = processes;
     }
@@ -47,7 +47,7 @@ struct ReasonsOnWindows : testing::Test {
 
 } // namespace
 
-TEST_F(ReasonsOnWindows, of_the_registry_are_the_last_error) {
+TEST_F(ReasonsWin, of_the_registry_are_the_last_error) {
     expectReasons({
         Failure{{},
                 0,
@@ -81,7 +81,7 @@ TEST_F(ReasonsOnWindows, of_the_registry_are_the_last_error) {
     });
 }
 
-TEST_F(ReasonsOnWindows, of_logging_on_outlast_the_closing_of_handles) {
+TEST_F(ReasonsWin, of_logging_on_outlast_the_closing_of_handles) {
     expectReasons({
         Failure{{},
                 0,
@@ -103,7 +103,7 @@ TEST_F(ReasonsOnWindows, of_logging_on_outlast_the_closing_of_handles) {
     });
 }
 
-TEST_F(ReasonsOnWindows, of_processes_are_those_of_opening_them) {
+TEST_F(ReasonsWin, of_processes_are_those_of_opening_them) {
     processCalls.openProcess = refuseToOpen;
     expectReasons({
         Failure{{}, 0, ERROR_ACCESS_DENIED, [](auto&) { return Process::Wait(4); }},
@@ -111,7 +111,7 @@ TEST_F(ReasonsOnWindows, of_processes_are_those_of_opening_them) {
     });
 }
 
-TEST_F(ReasonsOnWindows, of_files_that_another_program_holds) {
+TEST_F(ReasonsWin, of_files_that_another_program_holds) {
     auto const opens = [](Place const& in, int mode, bool flag) {
         HANDLE const held = CreateFileA(in.at("file").c_str(), GENERIC_READ, 0, nullptr, OPEN_EXISTING, 0, nullptr);
         bool const isOpen = File(in.at("file").c_str(), File::FILE_READ | mode, flag).isOpen();

@@ -37,13 +37,13 @@ inline LSTATUS WINAPI closeCounted(HKEY key) {
     return result;
 }
 
-struct RegistryTest : testing::Test {
-    RegistryTest() {
+struct RegistryScratch : testing::Test {
+    RegistryScratch() {
         keysOpened = keysClosed = 0;
         ZOR_Basis::queryCalls.openKey = openCounted;
         ZOR_Basis::queryCalls.closeKey = closeCounted;
     }
-    ~RegistryTest() override {
+    ~RegistryScratch() override {
         EXPECT_EQ(keysOpened, keysClosed);
         ZOR_Basis::queryCalls = realCalls;
         for (; !undo_.empty(); undo_.pop_back()) undo_.back()();

@@ -10,7 +10,7 @@
 
 namespace fs = std::filesystem;
 
-TEST(SysRootLinux, Kept_root_01_is_empty_once_where_the_current_folder_is_long) {
+TEST(SysRootPosix, Kept_root_01_is_empty_once_where_the_current_folder_is_long) {
     Scratch const scratch(fs::canonical(fs::temp_directory_path()));
     fs::path folder = scratch.path();
     while (folder.string().size() < 600) folder /= std::string(50, 'd');

@@ -22,8 +22,8 @@ bool giveUp(pid_t child) {
 using Children = Unawaited<8, giveUp>;
 using Ids = std::vector<pid_t>;
 
-struct UnawaitedTest : testing::Test {
-    UnawaitedTest() {
+struct UnawaitedPosix : testing::Test {
+    UnawaitedPosix() {
         lastEnded = 0;
         givenUp.clear();
     }
@@ -35,13 +35,13 @@ struct UnawaitedTest : testing::Test {
 
 } // namespace
 
-TEST_F(UnawaitedTest, are_kept_while_there_is_room) {
+TEST_F(UnawaitedPosix, are_kept_while_there_is_room) {
     lastEnded = 100;
     add(1, 8);
     EXPECT_EQ(givenUp, Ids{});
 }
 
-TEST_F(UnawaitedTest, are_given_up_by_the_older_half) {
+TEST_F(UnawaitedPosix, are_given_up_by_the_older_half) {
     lastEnded = 100;
     add(1, 9);
     EXPECT_EQ(givenUp, (Ids{1, 2, 3, 4}));
@@ -49,7 +49,7 @@ TEST_F(UnawaitedTest, are_given_up_by_the_older_half) {
     EXPECT_EQ(givenUp, (Ids{1, 2, 3, 4, 5, 6, 7, 8}));
 }
 
-TEST_F(UnawaitedTest, are_kept_while_they_run) {
+TEST_F(UnawaitedPosix, are_kept_while_they_run) {
     lastEnded = 2;
     add(1, 9);
     EXPECT_EQ(givenUp, (Ids{1, 2}));
@@ -58,7 +58,7 @@ TEST_F(UnawaitedTest, are_kept_while_they_run) {
     EXPECT_EQ(givenUp, (Ids{1, 2, 3, 4, 5, 6}));
 }
 
-TEST_F(UnawaitedTest, are_not_remembered_where_all_run) {
+TEST_F(UnawaitedPosix, are_not_remembered_where_all_run) {
     add(1, 20);
     EXPECT_EQ(givenUp, Ids{});
     lastEnded = 100;
@@ -68,7 +68,7 @@ TEST_F(UnawaitedTest, are_not_remembered_where_all_run) {
     EXPECT_EQ(givenUp, (Ids{1, 2, 3, 4, 5, 6, 7, 8})) << "and never 9 to 20";
 }
 
-TEST_F(UnawaitedTest, are_the_callers_again) {
+TEST_F(UnawaitedPosix, are_the_callers_again) {
     lastEnded = 100;
     add(1, 8);
     for (pid_t const child : {1, 3, 8, 77}) children.remove(child);

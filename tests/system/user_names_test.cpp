@@ -1,13 +1,10 @@
-// Qualified user names and names of domains, and what holds of users on every machine.
+// Qualified user names and names of domains.
 
 #include <zor_basis/system.h>
 
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>
-
-#include <memory>
-#include <type_traits>
 
 using namespace ZOR_Basis;
 
@@ -79,7 +76,7 @@ TEST(ParseUser, knows_the_current_user_and_domain) {
     EXPECT_STREQ(domain.c_str(), currentDomain.c_str());
 }
 
-TEST(isCompositeName, looks_for_a_full_stop) {
+TEST(IsCompositeName, looks_for_a_full_stop) {
     EXPECT_TRUE(Sys::isCompositeName("sales.example.com"));
     EXPECT_TRUE(Sys::isCompositeName("."));
     EXPECT_TRUE(Sys::isCompositeName("sales."));
@@ -87,71 +84,4 @@ TEST(isCompositeName, looks_for_a_full_stop) {
     EXPECT_FALSE(Sys::isCompositeName(""));
     EXPECT_FALSE(Sys::isCompositeName(Str("sales.example", 5)));
     EXPECT_TRUE(Sys::isCompositeName(Str("sales.example", 6)));
-}
-
-TEST(SysUsers, know_the_user_of_the_thread) {
-    BufStr<15> user("before");
-    EXPECT_TRUE(Sys::CurrentUser(user, false));
-    EXPECT_FALSE(user.empty());
-    BufStr<15> again;
-    EXPECT_TRUE(Sys::CurrentUser(again, false));
-    EXPECT_STREQ(again.c_str(), user.c_str());
-}
-
-TEST(SysUsers, clear_what_was_there) {
-    BufStr<15> text("before");
-    Sys::CurrentUser(text, true);
-    EXPECT_STRNE(text.c_str(), "before");
-    text = "before";
-    Sys::CurrentDomain(text, false);
-    EXPECT_STRNE(text.c_str(), "before");
-    text = "before";
-    EXPECT_TRUE(Sys::CurrentDomain(text, true));
-    EXPECT_STRNE(text.c_str(), "before");
-    text = "before";
-    Sys::DefaultLogin(text);
-    EXPECT_STRNE(text.c_str(), "before");
-    text = "before";
-    Sys::CurHumanUser(text);
-    EXPECT_STRNE(text.c_str(), "before");
-}
-
-TEST(SysUsers, know_no_domain_that_nobody_has_named) {
-    BufStr<255> domain("before");
-    EXPECT_FALSE(Sys::FullDomain("no such domain", domain));
-    EXPECT_FALSE(Sys::ShortDomain("no.such.domain", domain));
-    EXPECT_STREQ(domain.c_str(), "before");
-}
-
-TEST(SysLogon, needs_a_user) {
-    EXPECT_EQ(Sys::loginUser("", "secret", true), nullptr);
-    EXPECT_EQ(Sys::loginUser("", "", false), nullptr);
-}
-
-TEST(SysLogon, lets_a_thread_that_is_itself_be_itself) {
-    BufStr<15> before, after;
-    Sys::CurrentUser(before, false);
-    EXPECT_TRUE(Sys::impersonate(nullptr));
-    EXPECT_TRUE(Sys::revertToSelf());
-    EXPECT_TRUE(Sys::revertToSelf());
-    EXPECT_TRUE(Sys::impersonate(nullptr));
-    Sys::CurrentUser(after, false);
-    EXPECT_STREQ(after.c_str(), before.c_str());
-}
-
-TEST(SysHdl, is_nobody_by_itself) {
-    static_assert(std::has_virtual_destructor_v<SysHdl>);
-    std::unique_ptr<SysHdl> const handle(new SysHdl);
-    EXPECT_FALSE(handle->isValid());
-    EXPECT_FALSE(Sys::impersonate(handle.get())) << "nobody to act as";
-    EXPECT_TRUE(Sys::revertToSelf());
-}
-
-TEST(SysDrives, do_not_know_paths_that_are_none) {
-    FPath unc("before");
-    EXPECT_FALSE(Sys::isLocalDisk(""));
-    EXPECT_FALSE(Sys::UnMap("", unc));
-    EXPECT_FALSE(Sys::UnMap("", "nobody we know", unc));
-    EXPECT_FALSE(Sys::UnMapLogin("", unc));
-    EXPECT_STREQ(unc.c_str(), "before");
 }

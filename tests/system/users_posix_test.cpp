@@ -16,7 +16,7 @@ using namespace ZOR_Basis;
 
 namespace {
 
-using UsersLinux = QueryCallsTest;
+using UsersPosix = QueryCallsTest;
 
 /// A password database that knows users 1000 and 1001, and wants so much room for their records.
 std::size_t roomWanted = 0;
@@ -67,7 +67,7 @@ std::string recordsOf(std::initializer_list<Session> sessions) {
 
 } // namespace
 
-TEST_F(UsersLinux, are_those_of_the_process_and_of_the_thread) {
+TEST_F(UsersPosix, are_those_of_the_process_and_of_the_thread) {
     queryCalls.userById = userById;
     queryCalls.realUser = id1000;
     queryCalls.effectiveUser = id1001;
@@ -81,7 +81,7 @@ TEST_F(UsersLinux, are_those_of_the_process_and_of_the_thread) {
     }
 }
 
-TEST_F(UsersLinux, are_nobody_where_the_database_does_not_know) {
+TEST_F(UsersPosix, are_nobody_where_the_database_does_not_know) {
     queryCalls.userById = userById;
     queryCalls.realUser = id4711;
     queryCalls.effectiveUser = id1000;
@@ -100,7 +100,7 @@ TEST_F(UsersLinux, are_nobody_where_the_database_does_not_know) {
     EXPECT_FALSE(Sys::ParseUser("", user, domain));
 }
 
-TEST_F(UsersLinux, have_their_own_names) {
+TEST_F(UsersPosix, have_their_own_names) {
     passwd const* const own = getpwuid(geteuid());
     ASSERT_NE(own, nullptr);
     std::string const name = own->pw_name;
@@ -109,13 +109,13 @@ TEST_F(UsersLinux, have_their_own_names) {
     EXPECT_EQ(user.c_str(), name);
 }
 
-TEST_F(UsersLinux, have_no_default_logon_and_no_domain_cache) {
+TEST_F(UsersPosix, have_no_default_logon_and_no_domain_cache) {
     BufStr<15> login("before");
     EXPECT_FALSE(Sys::DefaultLogin(login));
     EXPECT_STREQ(login.c_str(), "");
 }
 
-TEST_F(UsersLinux, Kept_sys_01_may_be_without_a_domain) {
+TEST_F(UsersPosix, Kept_sys_01_may_be_without_a_domain) {
     queryCalls.resolverDomain = resolve;
     BufStr<15> domain("before");
     resolvedDomain = nullptr;
@@ -133,7 +133,7 @@ TEST_F(UsersLinux, Kept_sys_01_may_be_without_a_domain) {
     EXPECT_STREQ(domain.c_str(), "Sales.Example.COM");
 }
 
-TEST_F(UsersLinux, sit_at_the_machine_where_a_session_says_so) {
+TEST_F(UsersPosix, sit_at_the_machine_where_a_session_says_so) {
     struct Case {
         Row row;
         std::string sessions;
@@ -167,7 +167,7 @@ TEST_F(UsersLinux, sit_at_the_machine_where_a_session_says_so) {
     }
 }
 
-TEST_F(UsersLinux, may_sit_nowhere) {
+TEST_F(UsersPosix, may_sit_nowhere) {
     queryCalls.sessions = "/no/such/file";
     queryCalls.userById = userById;
     queryCalls.effectiveUser = id4711;

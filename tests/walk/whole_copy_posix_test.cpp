@@ -12,7 +12,7 @@
 
 using namespace ZOR_Basis;
 
-TEST(WholeCopyOnLinux, differs_in_nothing_that_diff_sees) {
+TEST(WholeCopyPosix, differs_in_nothing_that_diff_sees) {
     Scratch scratch;
     auto random = randomSource();
     std::string const source = scratch / "source";

@@ -30,8 +30,8 @@ struct Meddler : FileVisitor {
     int entries = 0;
 };
 
-struct ChangingTree : testing::Test {
-    ChangingTree() {
+struct FileIteratorInAChangingTree : testing::Test {
+    FileIteratorInAChangingTree() {
         for (int i = 0; i < FILES; ++i) put(scratch / file(i), "x");
         makeFolder(scratch / "folder/inner");
         put(scratch / "folder/inner/deep", "x");
@@ -46,7 +46,7 @@ struct ChangingTree : testing::Test {
 
 } // namespace
 
-TEST_F(ChangingTree, may_lose_the_entry_that_is_visited) {
+TEST_F(FileIteratorInAChangingTree, may_lose_the_entry_that_is_visited) {
     Meddler meddler([this](std::string const& name) {
         if (name.starts_with("file-")) std::filesystem::remove(scratch / name);
     });
@@ -56,7 +56,7 @@ TEST_F(ChangingTree, may_lose_the_entry_that_is_visited) {
     EXPECT_EQ(scratch.content(), (Names{"folder/", "folder/inner/", "folder/inner/deep"}));
 }
 
-TEST_F(ChangingTree, may_lose_all_of_itself) {
+TEST_F(FileIteratorInAChangingTree, may_lose_all_of_itself) {
     Meddler meddler([this](std::string const&) {
         for (auto const& entry : std::filesystem::directory_iterator(scratch.path()))
             std::filesystem::remove_all(entry.path());
@@ -67,7 +67,7 @@ TEST_F(ChangingTree, may_lose_all_of_itself) {
     EXPECT_EQ(meddler.times.count("deep"), 0u);
 }
 
-TEST_F(ChangingTree, may_grow) {
+TEST_F(FileIteratorInAChangingTree, may_grow) {
     int made = 0;
     Meddler meddler([this, &made](std::string const&) {
         if (made < FILES) put(scratch / ("new-" + std::to_string(made++)), "x");
@@ -77,7 +77,7 @@ TEST_F(ChangingTree, may_grow) {
     for (auto const& [name, times] : meddler.times) EXPECT_EQ(times, 1) << name;
 }
 
-TEST_F(ChangingTree, may_lose_a_directory_that_was_reported) {
+TEST_F(FileIteratorInAChangingTree, may_lose_a_directory_that_was_reported) {
     Meddler meddler([this](std::string const& name) {
         if (name == "folder") std::filesystem::remove_all(scratch / name);
     });
@@ -86,7 +86,7 @@ TEST_F(ChangingTree, may_lose_a_directory_that_was_reported) {
     EXPECT_EQ(meddler.times.count("inner"), 0u);
 }
 
-TEST_F(ChangingTree, may_turn_a_file_into_a_directory) {
+TEST_F(FileIteratorInAChangingTree, may_turn_a_file_into_a_directory) {
     Meddler meddler([this](std::string const& name) {
         if (name != file(7)) return;
         std::filesystem::remove(scratch / name);

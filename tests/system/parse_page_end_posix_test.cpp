@@ -45,7 +45,7 @@ private:
 
 } // namespace
 
-TEST(ParseAtThePagesEnd, reads_no_byte_outside_of_the_text) {
+TEST(ParseAtThePagesEndPosix, reads_no_byte_outside_of_the_text) {
     OnePage const page;
     char out[401];
     for (std::size_t size = 1; size < 300; ++size) {
@@ -74,7 +74,7 @@ TEST(ParseAtThePagesEnd, reads_no_byte_outside_of_the_text) {
     }
 }
 
-TEST(ParseAtThePagesEnd, skips_blanks_up_to_the_end_only) {
+TEST(ParseAtThePagesEndPosix, skips_blanks_up_to_the_end_only) {
     OnePage const page;
     for (std::size_t size = 1; size < 100; ++size) {
         std::string const text(size, ' ');

@@ -1,4 +1,4 @@
-// Names beyond the code page. The sibling is names_posix_test.cpp.
+// Names beyond the code page, made, listed and opened.
 
 #include <zor_basis/files.h>
 
@@ -20,7 +20,7 @@ WideText wide(std::string const& ascii) { return {ascii.begin(), ascii.end()}; }
 
 } // namespace
 
-TEST(NamesWin, reach_beyond_the_code_page) {
+TEST(DirIteratorNamesWin, reach_beyond_the_code_page) {
     Scratch scratch;
     WideText const folder = wide(scratch.path()) + L"/" + ODD;
     EXPECT_TRUE(Dir::NewW((folder + L"\\" + ODD).c_str(), true));

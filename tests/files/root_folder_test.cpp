@@ -22,7 +22,7 @@ std::string under(std::string const& root, std::vector<std::string> const& steps
 
 } // namespace
 
-TEST(PathRoot, is_the_parent_of_a_folder_system) {
+TEST(RootFolderOfPaths, is_the_parent_of_a_folder_system) {
     struct Case {
         Row row;
         char const *root, *narrow, *wide;
@@ -42,7 +42,7 @@ TEST(PathRoot, is_the_parent_of_a_folder_system) {
     }
 }
 
-TEST(PathRoot, makes_nothing_fake_while_it_is_empty_unless_it_is_the_whole_file_system) {
+TEST(RootFolderOfPaths, makes_nothing_fake_while_it_is_empty_unless_it_is_the_whole_file_system) {
     EXPECT_EQ(under("system", {"fake", "/scsi0", "fake", "/JS_Root/x", "fake", "\\scsi0", "fake", "/"}),
               "plain  </scsi0>\nplain  </JS_Root/x>\nplain  <\\scsi0>\nplain  </>\n");
     for (char const* slash : {"/", "/system", "\\"}) {
@@ -52,11 +52,11 @@ TEST(PathRoot, makes_nothing_fake_while_it_is_empty_unless_it_is_the_whole_file_
     }
 }
 
-TEST(PathRoot, is_asked_for_by_one_thread_while_the_others_wait) {
+TEST(RootFolderOfPaths, is_asked_for_by_one_thread_while_the_others_wait) {
     for (int i = 0; i < 10; ++i) EXPECT_EQ(under("/srv/print", {"ask"}), "1 calls, 1 paths, </srv/print>\n");
 }
 
-TEST(PathRoot, is_one_text_in_wide_paths_of_all_threads) {
+TEST(RootFolderOfPaths, is_one_text_in_wide_paths_of_all_threads) {
     struct Case {
         Row row;
         std::string root, expected;
@@ -78,7 +78,7 @@ TEST(PathRoot, is_one_text_in_wide_paths_of_all_threads) {
     }
 }
 
-TEST(PathRoot, is_in_wide_paths_what_the_application_sets) {
+TEST(RootFolderOfPaths, is_in_wide_paths_what_the_application_sets) {
     EXPECT_EQ(under("/srv", {"set", "/own", "wide", "/scsi0", "pathroot", "race", "/own"}),
               "fake  </own>\n</own>\n0 wrong\n")
         << "before the first use";

@@ -61,7 +61,7 @@ void grow(std::string const& folder, unsigned depth, std::mt19937_64& random) {
 
 } // namespace
 
-TEST(WalkModel, reports_random_trees_in_the_order_of_the_model) {
+TEST(FileIteratorModel, reports_random_trees_in_the_order_of_the_model) {
     std::mt19937_64 random = randomSource();
     std::uint64_t const trees = randomSteps(6);
     std::size_t seenAtAll = 0;

@@ -16,8 +16,8 @@ namespace fs = std::filesystem;
 
 namespace {
 
-struct MountsLinux : QueryCallsTest {
-    MountsLinux() { use(TABLE); }
+struct MountTablePosix : QueryCallsTest {
+    MountTablePosix() { use(TABLE); }
 
     void use(std::string const& table) {
         put(file, table);
@@ -53,7 +53,7 @@ short line
 
 } // namespace
 
-TEST_F(MountsLinux, tell_local_disks) {
+TEST_F(MountTablePosix, tell_local_disks) {
     struct Case {
         Row row;
         char const* path;
@@ -87,7 +87,7 @@ TEST_F(MountsLinux, tell_local_disks) {
     }
 }
 
-TEST_F(MountsLinux, stand_for_their_shares) {
+TEST_F(MountTablePosix, stand_for_their_shares) {
     struct Case {
         Row row;
         char const *path, *unc; // null: none
@@ -133,7 +133,7 @@ TEST_F(MountsLinux, stand_for_their_shares) {
     }
 }
 
-TEST_F(MountsLinux, are_found_through_links_and_from_the_current_folder) {
+TEST_F(MountTablePosix, are_found_through_links_and_from_the_current_folder) {
     std::string const place = fs::canonical(scratch.path()).string();
     use("/dev/a / ext4 rw 0 0\n//srv/jobs " + place + "/jobs cifs rw 0 0\n");
     makeFolder(scratch / "jobs/deep");
@@ -152,7 +152,7 @@ TEST_F(MountsLinux, are_found_through_links_and_from_the_current_folder) {
     fs::current_path(before);
 }
 
-TEST_F(MountsLinux, are_found_through_links_to_the_root) {
+TEST_F(MountTablePosix, are_found_through_links_to_the_root) {
     fs::create_directory_symlink("/", scratch / "top");
     FPath unc;
     EXPECT_TRUE(Sys::UnMap((scratch / "top/zb/jobs/x").c_str(), unc));
@@ -160,7 +160,7 @@ TEST_F(MountsLinux, are_found_through_links_to_the_root) {
     EXPECT_TRUE(Sys::isLocalDisk((scratch / "top").c_str()));
 }
 
-TEST_F(MountsLinux, may_be_unknown) {
+TEST_F(MountTablePosix, may_be_unknown) {
     FPath unc("before");
     queryCalls.mountTable = "/no/such/table";
     EXPECT_FALSE(Sys::isLocalDisk("/"));
@@ -172,7 +172,7 @@ TEST_F(MountsLinux, may_be_unknown) {
     EXPECT_TRUE(Sys::UnMap("/zb/jobs/x", unc));
 }
 
-TEST_F(MountsLinux, may_have_long_lines) {
+TEST_F(MountTablePosix, may_have_long_lines) {
     std::string const options(20'000, 'o');
     use("overlay / overlay rw,lowerdir=" + options + " 0 0\n//srv/jobs /zb/jobs cifs rw," + options + " 0 0\n" +
         "//srv/last /zb/last cifs rw 0 0\n");
@@ -184,14 +184,14 @@ TEST_F(MountsLinux, may_have_long_lines) {
     EXPECT_STREQ(unc.c_str(), "//srv/last/x");
 }
 
-TEST_F(MountsLinux, of_this_machine_can_be_asked) {
+TEST_F(MountTablePosix, of_this_machine_can_be_asked) {
     queryCalls = real;
     FPath unc;
     EXPECT_FALSE(Sys::isLocalDisk("/proc/self"));
     EXPECT_FALSE(Sys::UnMap("/proc/self", unc));
 }
 
-TEST_F(MountsLinux, leave_no_file_open) {
+TEST_F(MountTablePosix, leave_no_file_open) {
     auto const open = [] { return std::distance(fs::directory_iterator("/proc/self/fd"), fs::directory_iterator()); };
     auto const before = open();
     for (int i = 0; i < 10'000; ++i) {

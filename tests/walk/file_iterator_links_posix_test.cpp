@@ -11,8 +11,8 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct WalkLinks : testing::Test {
-    WalkLinks() {
+struct FileIteratorLinksPosix : testing::Test {
+    FileIteratorLinksPosix() {
         makeFolder(scratch / "out");
         makeFolder(scratch / "tree");
         makeFolder(scratch / "dst");
@@ -26,7 +26,7 @@ struct WalkLinks : testing::Test {
 
 } // namespace
 
-TEST_F(WalkLinks, are_listed_as_files_and_reported_as_directories_and_not_entered) {
+TEST_F(FileIteratorLinksPosix, are_listed_as_files_and_reported_as_directories_and_not_entered) {
     Recorder seen;
     FileIterator((scratch / "tree").c_str(), LOOK_FILES, nullptr, nullptr).doIt(&seen, true, true);
     EXPECT_EQ(seen.below(scratch / "tree"), (std::multiset<std::string>{"link/", "self/"}));
@@ -35,19 +35,19 @@ TEST_F(WalkLinks, are_listed_as_files_and_reported_as_directories_and_not_entere
     EXPECT_TRUE(folders.paths.empty());
 }
 
-TEST_F(WalkLinks, may_be_where_a_walk_starts) {
+TEST_F(FileIteratorLinksPosix, may_be_where_a_walk_starts) {
     Recorder seen;
     FileIterator((scratch / "tree/link").c_str(), LOOK_FILES, nullptr, nullptr).doIt(&seen, true, true);
     EXPECT_EQ(seen.paths, std::vector<std::string>{scratch / "tree/link/secret"});
 }
 
-TEST_F(WalkLinks, count_nothing) {
+TEST_F(FileIteratorLinksPosix, count_nothing) {
     EXPECT_EQ(FileSizeVisitor::Get(Str(scratch / "tree"), true), 0);
     EXPECT_EQ(FileSizeVisitor::Get(Str(scratch / "tree/link"), true), 0);
     EXPECT_EQ(FileSizeVisitor::Get(Str(scratch / "out"), true), 5);
 }
 
-TEST_F(WalkLinks, are_copied_and_removed_themselves) {
+TEST_F(FileIteratorLinksPosix, are_copied_and_removed_themselves) {
     FileCopyVisitor copy(Str(scratch / "dst"), false, true);
     EXPECT_TRUE(FileIterator((scratch / "tree").c_str(), LOOK_BOTH, nullptr, nullptr).doIt(&copy, false, true));
     EXPECT_TRUE(std::filesystem::is_symlink(scratch / "dst/link"));
