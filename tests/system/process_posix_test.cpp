@@ -4,7 +4,7 @@
 
 #include "basis/system/process_calls_posix.h"
 
-#include "tests/host/core/thread_facts.h"
+#include "tests/support/thread_facts.h"
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
 

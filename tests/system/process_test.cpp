@@ -2,7 +2,7 @@
 
 #include <xos_host.h>
 
-#include "tests/host/core/thread_facts.h"
+#include "tests/support/thread_facts.h"
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"
