@@ -1,7 +1,6 @@
 /// \file
-/// How the modules beside xos_basics reach its control functions: at run time, by name. Where the server's own
-/// xos_basics is loaded there are none, and the modules do without: nothing is counted and nothing fails on demand.
-/// Twins: find_control_posix.cpp, find_control_win.cpp.
+/// How the other modules reach the control functions of xos_basics: at run time, by name. The server's own xos_basics
+/// has none; then nothing is counted and nothing fails on demand. Twins: find_control_posix.cpp, find_control_win.cpp.
 
 #ifndef HOST_CONTROL_LINK_CONTROL_LINK_H
 #define HOST_CONTROL_LINK_CONTROL_LINK_H
@@ -11,15 +10,15 @@
 
 namespace host {
 
-/// The address of a function of the loaded xos_basics; null when it has none of that name.
+/// Finds a function of the loaded xos_basics.
+/// \return its address; null if there is none of that name
 void* findControl(char const* name);
 
-/// Counts a call and remembers its arguments, texts by their address.
-/// \return whether the call is to fail; the last
-///     error is then set
+/// Counts a call and stores its arguments; a text is passed by its address.
+/// \return whether the call must fail; the last error is then set
 bool failsNow(char const* function, std::initializer_list<std::uint64_t> arguments);
 
-/// Says how `xos_HostAlertFire` runs an alert.
+/// Sets the function by which `xos_HostAlertFire` runs an alert.
 void offerAlertFire(int (*fire)(std::uint32_t id));
 
 inline std::uint64_t addressArgument(void const* address) { return reinterpret_cast<std::uintptr_t>(address); }

@@ -2,7 +2,7 @@
 /// The alerts of the process: one thread that knows when they are due, and workers that run them.
 ///
 /// Every due alert gets a worker of its own: an idle one, else a new one. So a callback that never returns costs a
-/// thread and holds up nobody. An alert is never run twice at the same time.
+/// thread and delays no other. An alert is never run twice at the same time.
 
 #ifndef HOST_HQ_BASIS_ALERT_SERVICE_H
 #define HOST_HQ_BASIS_ALERT_SERVICE_H

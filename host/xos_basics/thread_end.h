@@ -1,5 +1,5 @@
 /// \file
-/// A call at the end of each thread that asked for it. Twins: thread_end_posix.cpp, thread_end_win.cpp.
+/// Calls a function at the end of each thread that asked for it. Twins: thread_end_posix.cpp, thread_end_win.cpp.
 
 #ifndef HOST_XOS_BASICS_THREAD_END_H
 #define HOST_XOS_BASICS_THREAD_END_H
@@ -14,8 +14,8 @@ public:
 
     explicit ThreadEnd(Call call);
 
-    /// Has `call` called with `value` when the calling thread ends; its earlier value is forgotten. A thread that sets
-    /// a value while it ends is called once more.
+    /// Makes the end of the calling thread call the function with `value`, which replaces an earlier value. If the
+    /// function sets a value again, it is called again.
     void set(void* value) const;
 
 private:

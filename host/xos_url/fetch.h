@@ -35,7 +35,7 @@ struct FetchRequest {
 constexpr std::uint32_t MOST_REDIRECTS = 10;
 
 /// Hands the body of the answer to the sink; not that of an answer which leads on, or asks for a password that we have.
-/// \return whether the answer was a good one (200 to 299) and has arrived whole
+/// \return whether the status of the answer is 200 to 299 and all of it has arrived
 bool fetch(FetchRequest const& request, BodySink& sink);
 
 } // namespace host

@@ -1,7 +1,7 @@
 // Writing on demand.
 
-#include "tests/host/support/system_error.h"
 #include "tests/log/driven_logger.h"
+#include "tests/support/system_error.h"
 
 #include <gmock/gmock.h>
 

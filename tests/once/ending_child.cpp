@@ -78,7 +78,8 @@ void useInThreads() {
 
 void printCalls() {
     for (host::FunctionFacts const& function : host::FUNCTIONS) {
-        if (xos_HostCalls(function.name) != 0) std::puts(function.name);
+        std::string const name{function.name};
+        if (xos_HostCalls(name.c_str()) != 0) std::puts(name.c_str());
     }
     std::puts("no other");
 }

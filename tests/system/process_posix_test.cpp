@@ -4,9 +4,9 @@
 
 #include "basis/system/process_calls_posix.h"
 
-#include "tests/host/core/thread_facts.h"
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
+#include "tests/support/thread_facts.h"
 
 #include <gtest/gtest.h>
 

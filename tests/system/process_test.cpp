@@ -2,10 +2,10 @@
 
 #include <xos_host.h>
 
-#include "tests/host/core/thread_facts.h"
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
 #include "tests/support/table.h"
+#include "tests/support/thread_facts.h"
 
 #include <gtest/gtest.h>
 

@@ -8,7 +8,7 @@
 #include <zor_basis/system.h>
 #include <zor_basis/walk.h>
 
-#include "tests/host/url/http_server.h"
+#include "tests/support/http_server.h"
 
 #include <memory>
 

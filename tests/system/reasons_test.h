@@ -4,8 +4,8 @@
 #ifndef TESTS_SYSTEM_REASONS_TEST_H
 #define TESTS_SYSTEM_REASONS_TEST_H
 
-#include "tests/host/support/system_error.h"
 #include "tests/support/scratch.h"
+#include "tests/support/system_error.h"
 #include "tests/support/table.h"
 #include "xos_host.h"
 

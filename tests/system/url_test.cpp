@@ -2,7 +2,7 @@
 
 #include <xos_host.h>
 
-#include "tests/host/url/http_server.h"
+#include "tests/support/http_server.h"
 #include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>

@@ -27,7 +27,7 @@ ThreadCalls* unusedOrNewCalls() {
 }
 
 void releaseThreadCalls(void* calls) {
-    // Whatever still ends in this thread and calls us gets records anew, and gives them back in the next round.
+    // A later call while the thread ends adopts records again, and they are released in the next round.
     thisThread.calls = nullptr;
     beginEra();
     std::lock_guard const lock{registry.mutex};

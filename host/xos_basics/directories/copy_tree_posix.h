@@ -14,7 +14,7 @@ struct CopyRules {
     bool overwrite;
     /// Directories are copied, too.
     bool recursive;
-    /// Nobody else sees the target yet, so that its entries need no temporary names.
+    /// No other process sees the target yet, so its entries need no temporary names.
     bool unseen;
 };
 

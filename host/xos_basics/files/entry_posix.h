@@ -2,7 +2,7 @@
 /// Steps on single entries that files and trees share: places and new names. For `_posix` sources only.
 ///
 /// An entry is identified by the descriptor of its directory and its name there, so no other process can exchange its
-/// path between two steps. What fails leaves errno.
+/// path between two steps. A function that fails sets errno.
 
 #ifndef HOST_XOS_BASICS_FILES_ENTRY_POSIX_H
 #define HOST_XOS_BASICS_FILES_ENTRY_POSIX_H
@@ -31,7 +31,7 @@ inline bool sameEntry(struct stat const& a, struct stat const& b) {
     return a.st_dev == b.st_dev && a.st_ino == b.st_ino;
 }
 
-/// A name that nothing in a directory bears yet, in all likelihood.
+/// Makes up a name that almost certainly no entry of a directory has.
 std::string temporaryName();
 
 /// Makes something new under a temporary name.
@@ -47,7 +47,7 @@ std::string makeTemporary(Make make) {
     return {};
 }
 
-/// Renames, and fails with EEXIST when something has the new name already, at whatever moment it came there.
+/// Renames; fails with EEXIST if the new name exists, even if another process made it a moment before.
 bool renameToNew(int fromAt, char const* from, int toAt, char const* to);
 
 /// Gives the finished temporary entry its name. A failure removes it.

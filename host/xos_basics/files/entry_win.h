@@ -1,5 +1,6 @@
 /// \file
-/// Steps on single entries that files and trees share. For `_win` sources only. What fails leaves the last error.
+/// Steps on single entries that files and trees share. For `_win` sources only. A function that fails sets the last
+/// error.
 
 #ifndef HOST_XOS_BASICS_FILES_ENTRY_WIN_H
 #define HOST_XOS_BASICS_FILES_ENTRY_WIN_H
@@ -30,7 +31,7 @@ bool factsOf(HANDLE entry, EntryFacts& facts);
 /// Whether the last error says that there is no such entry.
 bool isMissing();
 
-/// A path beside `path` that nothing bears yet, in all likelihood.
+/// Makes up a path in the folder of `path` that almost certainly does not exist.
 std::wstring temporaryBeside(std::wstring const& path);
 
 /// Removes a file or a link, write-protected or not.

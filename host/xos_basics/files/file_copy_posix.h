@@ -1,5 +1,5 @@
 /// \file
-/// Complete copies of regular files. For `_posix` sources only. What fails leaves errno.
+/// Complete copies of regular files. For `_posix` sources only. A function that fails sets errno.
 
 #ifndef HOST_XOS_BASICS_FILES_FILE_COPY_POSIX_H
 #define HOST_XOS_BASICS_FILES_FILE_COPY_POSIX_H

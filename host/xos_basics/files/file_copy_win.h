@@ -1,5 +1,5 @@
 /// \file
-/// Complete copies of files. For `_win` sources only. What fails leaves the last error.
+/// Complete copies of files. For `_win` sources only. A function that fails sets the last error.
 
 #ifndef HOST_XOS_BASICS_FILES_FILE_COPY_WIN_H
 #define HOST_XOS_BASICS_FILES_FILE_COPY_WIN_H

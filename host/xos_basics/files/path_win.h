@@ -56,7 +56,7 @@ private:
     HANDLE handle_ = INVALID_HANDLE_VALUE;
 };
 
-/// The path in the form that calls take. What is long gets the form that has no limit.
+/// Converts a path for the system's calls; a long path gets the form without a length limit.
 bool systemPath(char const* path, std::wstring& wide);
 
 /// The absolute path in the form that has no limit, without a backslash at its end unless it is a root.

@@ -51,7 +51,7 @@ bool fillPool() {
 
 } // namespace
 
-/// Blocks that one thread has at hand. On the heap, because it is used when the thread's own memory may be gone.
+/// Blocks that one thread has at hand. On the heap, because it is used when thread-local memory may have been freed.
 struct ThreadStore {
     Semaphore* free;
     std::uint32_t count;

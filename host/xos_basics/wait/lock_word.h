@@ -27,7 +27,7 @@ struct LockWord {
 /// Waits a little in user space, then asleep.
 void takeContended(LockWord& lock);
 
-/// Wakes one of those who sleep at the lock.
+/// Wakes one of the threads that sleep at the lock.
 void wakeSleeper(LockWord& lock);
 
 inline bool isTakenAtOnce(LockWord& lock) {

@@ -1,6 +1,0 @@
-// A module of the same name.
-
-#include "basis/platform/xos_url.h"
-#include "tests/host/exchange/answers.h"
-
-int xos_URLGet(char const*, char const*, char const*, char const*) { return OTHER_URL; }

@@ -1,0 +1,26 @@
+// The sibling is thread_facts_posix.cpp.
+
+#include "host/windows_api.h"
+#include "tests/support/thread_facts.h"
+
+std::string nameOfThisThread() {
+    using GetDescription = HRESULT(WINAPI*)(HANDLE, PWSTR*);
+    auto* const found =
+        reinterpret_cast<void*>(GetProcAddress(GetModuleHandleA("kernel32.dll"), "GetThreadDescription"));
+    wchar_t* wide = nullptr;
+    if (found == nullptr || FAILED(reinterpret_cast<GetDescription>(found)(GetCurrentThread(), &wide))) {
+        return "no names here";
+    }
+    char name[128] = "";
+    WideCharToMultiByte(CP_ACP, 0, wide, -1, name, sizeof name, nullptr, nullptr);
+    LocalFree(wide);
+    return name;
+}
+
+std::size_t const LONGEST_THREAD_NAME = 63;
+
+std::size_t openHandles() {
+    DWORD count = 0;
+    GetProcessHandleCount(GetCurrentProcess(), &count);
+    return count;
+}
