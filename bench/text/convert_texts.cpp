@@ -99,8 +99,8 @@ std::uint32_t numberAt(std::string const& bytes, std::size_t offset) {
     return number;
 }
 
-/// All translations of a compiled message catalogue, each with a line feed behind it. The header's words: magic, version,
-/// count, table of originals, table of translations; a table has length and offset of each text.
+/// All translations of a compiled message catalogue, each with a line feed behind it. The header's words: magic,
+/// version, count, table of originals, table of translations; a table has length and offset of each text.
 std::string translations(char const* path) {
     std::string const bytes = contentOf(path);
     std::string text;

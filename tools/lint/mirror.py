@@ -51,6 +51,11 @@ def begins_with(name, component):
     return name == component or name.startswith(component + "_")
 
 
+def covering(component, name):
+    """The test file that a line of the list names; without a folder it stands in the component's own room."""
+    return Path("tests") / (name if "/" in name else room(component) / name)
+
+
 def missing(components, tested, listed):
     for path in sorted(components):
         if any(begins_with(name, path.name) for name in tested.get(room(path), {}).values()):
@@ -58,8 +63,8 @@ def missing(components, tested, listed):
                 yield f"{LIST}: {path} has tests of its own"
         elif str(path) not in listed:
             yield f"{path} has no tests/{room(path)}/{path.name}_test.cpp"
-        elif not (common.ROOT / "tests" / listed[str(path)]).is_file():
-            yield f"{LIST}: {path}: there is no tests/{listed[str(path)]}"
+        elif not (common.ROOT / covering(path, listed[str(path)])).is_file():
+            yield f"{LIST}: {path}: there is no {covering(path, listed[str(path)])}"
 
 
 def unnamed(names, tested, listed):
