@@ -52,8 +52,8 @@ function(zb_optimised_tests)
   endif()
 endfunction()
 
-# zb_joined_tests(<room> <files>): compiles the test files of one room together, some at a time, if ZB_JOINED_TESTS is on.
-# Those of one system stand alone: they define what the system's headers declare.
+# zb_joined_tests(<room> <files>): compiles the test files of one room together, some at a time, if ZB_JOINED_TESTS is
+# on. Those of one system stand alone: they define what the system's headers declare.
 function(zb_joined_tests room)
   set(most 8)
   list(FILTER ARGN EXCLUDE REGEX "_(posix|win)_test")
