@@ -3,6 +3,8 @@
 
 #include <zor_basis/log.h>
 
+#include "tests/support/wait_for.h"
+
 #include <xos_host.h>
 
 #include <atomic>
@@ -29,16 +31,6 @@ void fireAlert() {
     std::uint32_t id = 1;
     while (id <= LAST_TRIED && xos_HostAlertFire(id) != 0) ++id;
     hasReturned = true;
-}
-
-/// Repeats an attempt for a few seconds at most.
-template <class Try>
-bool succeeds(Try const& attempt) {
-    for (int i = 0; i < 4000; ++i) {
-        if (attempt()) return true;
-        std::this_thread::sleep_for(std::chrono::milliseconds(1));
-    }
-    return false;
 }
 
 bool isThere(fs::path const& file) {
@@ -76,9 +68,9 @@ int main(int argc, char** argv) {
     }
     std::thread(fireAlert).detach();
     fs::path const file = fs::path("tmp") / "zb_log" / "child" / (bySession ? "1.log" : "0.log");
-    if (succeeds([&] { return bySession ? isThere(file) : holds(file, "line"); })) std::puts("written");
+    if (waitFor([&] { return bySession ? isThere(file) : holds(file, "line"); })) std::puts("written");
     for (int i = 0; i < 3; ++i) {
-        if (succeeds([&] { return isRemoved(file); }) && succeeds([&] { return isThere(file); })) {
+        if (waitFor([&] { return isRemoved(file); }) && waitFor([&] { return isThere(file); })) {
             std::puts("opened again");
         }
     }

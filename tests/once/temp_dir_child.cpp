@@ -15,7 +15,7 @@
 //   last=FUNCTION    prints the arguments of its last call
 //   fail=FUNCTION    lets its next call fail
 //   touch=FILE       makes an empty file
-//   wait=FILE        waits until there is such a file, a minute at most
+//   wait=FILE        waits until there is such a file, 30 s at most
 //   background       another thread makes one with Create
 //   tried=COUNT      waits until that thread has tried so many more names
 //   join             waits for that thread: prints its path
@@ -26,10 +26,11 @@
 
 #include <zor_basis/system/vdp_temp_dir.h>
 
+#include "tests/support/wait_for.h"
+
 #include <xos_host.h>
 
 #include <algorithm>
-#include <chrono>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -54,16 +55,6 @@ FPath madeByHelper;
 
 void print(char const* text) { std::printf("%s\n", text != nullptr ? text : "none"); }
 
-template <class Condition>
-bool waitUntil(Condition condition) {
-    auto const end = std::chrono::steady_clock::now() + std::chrono::minutes(1);
-    while (!condition()) {
-        if (std::chrono::steady_clock::now() > end) return false;
-        std::this_thread::sleep_for(std::chrono::milliseconds(1));
-    }
-    return true;
-}
-
 void endUnless(bool done) {
     if (!done) std::_Exit(2);
 }
@@ -78,7 +69,7 @@ void assign() {
 
 /// Each attempt asks the platform layer for the status of the new name.
 bool awaitAttempts(std::uint64_t count) {
-    return waitUntil([count] { return xos_HostCalls("xos_FileStatByNameEx") >= count; });
+    return waitFor([count] { return xos_HostCalls("xos_FileStatByNameEx") >= count; });
 }
 
 void unblock(std::string const& path) {
@@ -159,7 +150,7 @@ constexpr Step STEPS[] = {
     {"last", [](std::string const& value) { print(xos_HostLastCall(value.c_str())); }},
     {"fail", [](std::string const& value) { xos_HostFail(value.c_str(), 0, 1); }},
     {"touch", [](std::string const& value) { std::ofstream(value.c_str()).flush(); }},
-    {"wait", [](std::string const& value) { endUnless(waitUntil([&value] { return fs::exists(value); })); }},
+    {"wait", [](std::string const& value) { endUnless(waitFor([&value] { return fs::exists(value); })); }},
     {"background", [](std::string const&) { helper = std::thread([] { VDPTempDir::Create(madeByHelper); }); }},
     {"tried",
      [](std::string const& value) {

@@ -350,7 +350,7 @@ constexpr Operation<InlineTextBesideModel<String>> NARROW_TEXT_OPERATIONS[] = {
 
 template <class String>
 Operation<InlineTextBesideModel<String>> const& drawnFor(InlineTextBesideModel<String>& b) {
-    if constexpr (b.NARROW) {
+    if constexpr (InlineTextBesideModel<String>::NARROW) {
         if (b.oneIn(6)) return drawn(NARROW_TEXT_OPERATIONS<String>, b.random);
     }
     return drawn(INLINE_TEXT_OPERATIONS<String>, b.random);

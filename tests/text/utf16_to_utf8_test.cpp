@@ -9,13 +9,9 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct WayUtf16ToUtf8 {
-    char const* name;
-    decltype(&Utf::toUtf8) convert;
-};
-void PrintTo(WayUtf16ToUtf8 const& way, std::ostream* out) { *out << way.name; }
+using Utf16ToUtf8Way = mixture::Way<decltype(Utf::toUtf8)>;
 
-struct Utf16ToUtf8 : testing::TestWithParam<WayUtf16ToUtf8> {
+struct Utf16ToUtf8 : testing::TestWithParam<Utf16ToUtf8Way> {
     mixture::Source source = randomSource();
 
     void check(reference::WideText const& wide, std::uint64_t room) const {
@@ -48,8 +44,8 @@ struct Utf16ToUtf8 : testing::TestWithParam<WayUtf16ToUtf8> {
 } // namespace
 
 INSTANTIATE_TEST_SUITE_P(Ways, Utf16ToUtf8,
-                         testing::Values(WayUtf16ToUtf8{"as_the_processor_can", Utf::toUtf8},
-                                         WayUtf16ToUtf8{"without_shuffle", Utf::toUtf8WithoutShuffle}),
+                         testing::Values(Utf16ToUtf8Way{"as_the_processor_can", Utf::toUtf8},
+                                         Utf16ToUtf8Way{"without_shuffle", Utf::toUtf8WithoutShuffle}),
                          [](auto const& way) { return way.param.name; });
 
 TEST_P(Utf16ToUtf8, converts_mixtures_of_all_kinds_of_characters) {

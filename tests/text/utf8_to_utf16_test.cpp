@@ -9,13 +9,9 @@ using namespace ZOR_Basis;
 
 namespace {
 
-struct WayUtf8ToUtf16 {
-    char const* name;
-    decltype(&Utf::toUtf16) convert;
-};
-void PrintTo(WayUtf8ToUtf16 const& way, std::ostream* out) { *out << way.name; }
+using Utf8ToUtf16Way = mixture::Way<decltype(Utf::toUtf16)>;
 
-struct Utf8ToUtf16 : testing::TestWithParam<WayUtf8ToUtf16> {
+struct Utf8ToUtf16 : testing::TestWithParam<Utf8ToUtf16Way> {
     mixture::Source source = randomSource();
 
     void check(std::string const& narrow, std::uint64_t room) const {
@@ -50,8 +46,8 @@ struct Utf8ToUtf16 : testing::TestWithParam<WayUtf8ToUtf16> {
 } // namespace
 
 INSTANTIATE_TEST_SUITE_P(Ways, Utf8ToUtf16,
-                         testing::Values(WayUtf8ToUtf16{"as_the_processor_can", Utf::toUtf16},
-                                         WayUtf8ToUtf16{"without_shuffle", Utf::toUtf16WithoutShuffle}),
+                         testing::Values(Utf8ToUtf16Way{"as_the_processor_can", Utf::toUtf16},
+                                         Utf8ToUtf16Way{"without_shuffle", Utf::toUtf16WithoutShuffle}),
                          [](auto const& way) { return way.param.name; });
 
 TEST_P(Utf8ToUtf16, converts_mixtures_of_all_kinds_of_characters) {
