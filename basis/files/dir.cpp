@@ -13,7 +13,7 @@ namespace {
 
 using PathRules::orEmpty;
 
-/// What stands in the way of a directory, or is one.
+/// What exists where a directory is wanted.
 enum class Place { FREE, DIRECTORY, BLOCKED };
 
 bool leadsToDirectory(char const* path) {
@@ -36,7 +36,7 @@ struct Narrow {
     static bool make(FPath const& path) { return xos_DirCreateEx(path, 0) == 0; }
 };
 
-/// Wide paths: the system makes them, and whatever exists and is no directory is in the way.
+/// Wide paths: the system makes directories, and any existing entry that is not one is in the way.
 struct Wide {
     using Path = WcPath;
     using Char = WChar;
@@ -70,7 +70,7 @@ bool ensure(typename Kind::Path const& whole) {
     typename Kind::Path path(whole);
     for (Place place = Kind::look(path); !isOrBecomesDirectory<Kind>(path, place); place = Kind::look(path)) {
         std::uint64_t const name = path.offsetName();
-        // Behind a slash at the very front is nothing more to cut.
+        // Nothing is left to cut before a slash at the very front.
         if (place == Place::BLOCKED || name < 2) return false;
         path.cut(name - 1);
     }
@@ -85,7 +85,7 @@ template <class Kind>
 bool newFor(typename Kind::Path parent) {
     std::uint64_t const name = parent.offsetName();
     if (name == 0) return refuse(Reason::BAD_ARGUMENT);
-    // kept dir-02: cutting before the first character is read as not cutting.
+    // kept dir-02: cutting before the first character means not cutting.
     if (name > 1) parent.cut(name - 1);
     return ensure<Kind>(parent);
 }
@@ -95,7 +95,7 @@ bool makeNew(typename Kind::Path const& path, bool makeParents) {
     Place const place = Kind::look(path);
     if (place == Place::DIRECTORY) return true;
     if (place == Place::BLOCKED) return refuse(Reason::ALREADY_THERE);
-    // kept dir-01: the parent of a bare name is the current directory, which nobody can make.
+    // kept dir-01: the parent of a bare name is the current directory, which cannot be made.
     return (!makeParents || newFor<Kind>(path)) && Kind::make(path);
 }
 
@@ -135,7 +135,7 @@ bool Dir::Move(char const* dst, char const* src, bool overwrite, bool flagB) {
 bool Dir::Link(char const* dst, char const* src) { return xos_FileHardLink(orEmpty(src), orEmpty(dst)) == 0; }
 
 bool Dir::SplitCheck(char const* path, FPath& existing, FPath& rest) {
-    // kept dir-04: where only a first component could exist, there is nothing to split off.
+    // kept dir-04: if only a first component could exist, there is nothing to split off.
     constexpr std::uint64_t FIRST_INDEX = 1;
     existing.clear();
     rest.clear();

@@ -35,7 +35,7 @@ public:
 
     bool isDir() override { return !isFile(); }
     bool isFile() override {
-        // Without an entry the answers are those of an empty file, as on the sibling before the first one.
+        // Without an entry, the answers are those of an empty file, as in the sibling before the first entry.
         if (entry_ == nullptr) return true;
         switch (entry_->d_type) {
         case DT_DIR:
@@ -82,7 +82,7 @@ private:
         return false;
     }
 
-    /// What the entry, or what it leads to, is; a link that leads nowhere is itself.
+    /// The status of the entry or of its target; a link without a target counts as itself.
     struct stat const& status() {
         if (examined_) return status_;
         examined_ = true;

@@ -12,7 +12,7 @@ void DirIterImplW::setPath(WStr const& path) {
 void DirIterImplW::setWildCard(char const* wildcard) { Convert::LocalToWide(wildcard, wildcard_); }
 
 void DirIterImplW::appendWildCard() {
-    // kept list-dir-01: the path is the text that the system is asked with.
+    // kept list-dir-01: the system is called with this very path.
     directoryLength_ = path_.size();
     if (wildcard_.empty()) {
         path_.add(ZB_W("*"));

@@ -12,7 +12,7 @@ namespace {
 
 using Path = PathText<NarrowPathKind>;
 
-/// Whether a path lies under the root already and so needs no translation. Every path begins with an unknown root's
+/// Tells whether a path already lies under the root and needs no translation. Every path begins with an unknown root's
 /// empty text: nothing can be translated to it. All absolute paths lie under "/", which says nothing about fake roots.
 bool isUnder(RootFolder::Root const& root, char const* text, std::uint64_t length) {
     std::uint64_t const size = root.text.size();
@@ -30,7 +30,7 @@ std::uint64_t fakeRoot(char const* text, std::uint64_t length, RootFolder::Root 
     return 0;
 }
 
-/// What stands for the root before a rest.
+/// The text that replaces the root in front of the rest of a path.
 Str rootBefore(RootFolder::Root const& root, char const* rest) {
     bool const alone = root.isFileSystem && *rest == '\0';
     return alone ? Str("/") : Str(root.text);

@@ -26,7 +26,7 @@ FStat::StatMode kindOf(std::uint32_t mode) {
     }
 }
 
-/// Counts the failures of one retried look and says when to give up.
+/// Counts the failures of a retried query and decides when to give up.
 class Retries {
 public:
     bool mayGoOn(std::uint32_t error) {
@@ -79,7 +79,7 @@ bool FStat::updateW(WChar const* path) {
     xos_Stat record{};
     if (!systemCalls.statusWide(PathRules::orEmpty(path), record)) return false;
     // kept stat-02: wide callers list directories and take everything else for something to open. The type bits are a
-    // number: a socket's have the directory's bit, too, and it is none.
+    // number: those of a socket contain the directory's bit, although a socket is no directory.
     type_ = (record.st_mode_ & MODE_TYPE) == MODE_DIRECTORY ? ST_DIR : ST_FILE;
     modified_ = record.st_mtime_;
     created_ = record.st_ctime_;

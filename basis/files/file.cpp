@@ -23,7 +23,7 @@ IFile* makeBackend(char const* path, int mode, bool flag) {
     return new (std::nothrow) FileStdDir(path, mode);
 }
 
-/// Opens a file, which makes it where nothing is.
+/// Opens a file, which makes it if nothing exists.
 bool touch(char const* path) {
     xos_File const made = xos_FileOpen(orEmpty(path), OPEN_WRITES | OPEN_CREATES);
     if (made != 0) xos_FileCloseEx(made, 0);

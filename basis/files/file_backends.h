@@ -27,8 +27,8 @@ public:
     bool flush() override;
     std::int64_t seek(int origin, int offset) override;
     bool isOpen() override { return handle_ != 0; }
-    /// Closes the file before the end of the object's life.
-    /// \return whether all that was written has arrived
+    /// Closes the file before the object is destroyed.
+    /// \return whether all written data has arrived
     bool close() { return xos_FileCloseEx(std::exchange(handle_, 0), 0) == 0; }
 
 private:
@@ -52,7 +52,7 @@ public:
     bool isOpen() override { return stream_ != nullptr; }
 
 private:
-    /// Else the last error says why not.
+    /// If false, the last error says why.
     bool canBeUsed() const;
     char const* nextLine(char* buffer, int room);
 

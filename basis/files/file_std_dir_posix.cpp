@@ -22,7 +22,7 @@ int flagsOf(int mode) {
     return flags;
 }
 
-/// A disk that becomes full takes what it still can, and only the next call says why it was not all.
+/// A disk that becomes full accepts a part, and only the next call reports why it did not accept the rest.
 ssize_t writeWhole(int descriptor, char const* from, std::size_t n) {
     std::size_t done = 0;
     while (done < n) {
@@ -47,7 +47,7 @@ FileStdDir::~FileStdDir() {
     ::close(descriptor_);
 }
 
-// kept file-01: the runtime's -1 comes out as it is, as all ones.
+// kept file-01: the runtime's -1 is returned unchanged, as all ones.
 std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
     return inPieces(static_cast<char*>(buffer), n,
                     [this](char* to, unsigned piece) { return ::read(descriptor_, to, piece); });

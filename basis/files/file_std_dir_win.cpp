@@ -26,7 +26,7 @@ int flagsOf(int mode) {
 /// Runs a call of the runtime on a descriptor. \return -1 where that fails or there is none
 template <class Call>
 auto onDescriptor(int descriptor, Call call) -> decltype(call(descriptor)) {
-    // Never handed to the runtime, which may end the process for it.
+    // Never passed to the runtime, which may end the process because of it.
     if (descriptor == -1) {
         refuse(Reason::NOT_OPEN);
         return -1;
@@ -54,7 +54,7 @@ FileStdDir::~FileStdDir() {
     ::_close(descriptor_);
 }
 
-// kept file-01: the runtime's -1 comes out as it is, as all ones.
+// kept file-01: the runtime's -1 is returned unchanged, as all ones.
 std::uint64_t FileStdDir::read(void* buffer, std::uint64_t n) {
     return inPieces(static_cast<char*>(buffer), n, [this](char* to, unsigned piece) {
         return onDescriptor(descriptor_, [=](int from) { return ::_read(from, to, piece); });

@@ -10,7 +10,7 @@ namespace ZOR_Basis {
 namespace {
 
 std::uint32_t flagsOf(int mode) {
-    // The platform layer's text mode, 0x20, is never asked for: what is written comes back as it was.
+    // The platform layer's text mode, 0x20, is never used: bytes are read back exactly as they were written.
     std::uint32_t flags = 0;
     if ((mode & File::FILE_READ) != 0) flags |= OPEN_READS;
     if ((mode & File::FILE_WRITE) != 0) flags |= OPEN_WRITES;

@@ -38,7 +38,7 @@ private:
     std::uint32_t code_;
 };
 
-/// Keeps the reason of a failure while what it left is cleared away.
+/// Preserves the reason of a failure during clean-up.
 class KeepLastError {
 public:
     KeepLastError() = default;
@@ -50,11 +50,11 @@ private:
     LastError const kept_;
 };
 
-/// Surrounds calls of the runtime library. On Windows it tells failures of its own in `errno` alone.
+/// Surrounds calls of the runtime library, which on Windows reports its own failures in `errno` only.
 class RuntimeCall {
 public:
     RuntimeCall();
-    /// Sees to it that the failure's reason is the last error.
+    /// Makes the reason of the failure the last error.
     void fail() const;
 };
 

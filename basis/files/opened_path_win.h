@@ -29,7 +29,7 @@ private:
     HANDLE const handle_;
 };
 
-/// Opens an entry, over all links, and finds its path, which is no link.
+/// Opens an entry through all links and finds the path of their target.
 /// \param found  receives it, in the form "C:\folder\name" or "\\server\share\name"
 bool openedPath(char const* path, FPath& found);
 

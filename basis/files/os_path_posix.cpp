@@ -1,4 +1,4 @@
-// Names of the file system in wide text and back. Windows has wide names itself.
+// Converts names of the file system to wide text and back. Windows has wide names of its own.
 
 #include "basis/files/os_path_posix.h"
 

@@ -11,9 +11,9 @@
 
 namespace ZOR_Basis {
 
-/// The wide form of a name that the system gave. A byte that is no UTF-8 becomes U+DC80 to U+DCFF.
+/// Converts a name from the system to wide text. A byte that is not UTF-8 becomes U+DC80 to U+DCFF.
 void wideName(char const* name, WBStr& out);
-/// The bytes of a wide name, those of U+DC80 to U+DCFF restored; other unpaired surrogates become U+FFFD.
+/// Converts a wide name to bytes and restores those of U+DC80 to U+DCFF; other unpaired surrogates become U+FFFD.
 void narrowName(WChar const* name, BufStr<255>& out);
 
 /// A path for one system call: every backslash is a slash.

@@ -18,7 +18,7 @@ using detail::isNothing;
 template <class Char>
 inline constexpr Char EMPTY[] = {0};
 
-/// A path as it is handed on: null is the empty one.
+/// The path that is passed on: a null path becomes the empty one.
 template <class Char>
 constexpr Char const* orEmpty(Char const* path) {
     return path != nullptr ? path : EMPTY<Char>;
@@ -57,7 +57,7 @@ bool isWildCard(Char const* text) {
     return false;
 }
 
-/// The index behind the last slash of the first `length` characters; 0 without one.
+/// The index behind the last slash among the first `length` characters; 0 if there is none.
 template <class Char>
 std::uint64_t offsetName(Char const* text, std::uint64_t length) {
     while (length > 0 && !isSlash(text[length - 1])) --length;
@@ -104,7 +104,7 @@ bool isSub(Char const* path, Char const* directory) {
 template <class Char>
 std::uint64_t normalize(Char const* source, bool url, Char* out) {
     Char* const begin = out;
-    // kept path-03: for a URL the first run is taken for that behind the scheme, without a look at what is before it.
+    // kept path-03: in a URL the first run counts as the one behind the scheme, whatever precedes it.
     bool firstRunPending = url || isSlash(*source);
     while (*source != Char()) {
         if (!isSlash(*source)) {

@@ -1,5 +1,5 @@
 /// \file
-/// The members that narrow and wide paths share, over the string that each derives from. What differs is in the kinds.
+/// The members that narrow and wide paths share, on the string that each derives from. The kinds hold the differences.
 
 #ifndef BASIS_FILES_PATH_TEXT_H
 #define BASIS_FILES_PATH_TEXT_H
@@ -89,7 +89,7 @@ struct PathText {
         if (offset == 0) {
             directory.clear();
         } else {
-            // kept path-05: behind a slash at the very front no character is left, which `copy` takes as all of them.
+            // kept path-05: nothing precedes a slash at the very front, and a length of 0 makes `copy` take the whole.
             directory.copy(text, offset - 1);
         }
     }

@@ -12,7 +12,7 @@ inline constexpr std::uint64_t TRANSFER_FAILED = ~std::uint64_t{0};
 /// The runtime transfers this many bytes in one call on every system.
 inline constexpr std::uint64_t LARGEST_PIECE = 0x40000000;
 
-/// Calls `transfer(place, bytes)` until all is done or a call does less than it was asked for. It gives the bytes done,
+/// Calls `transfer(place, bytes)` until everything is transferred or a call transfers less. It returns the bytes done,
 /// or a negative number for a failure.
 /// \return the bytes transferred, all ones where the very first call failed
 template <class Byte, class Transfer>

@@ -14,7 +14,7 @@ namespace {
 
 constexpr int MOST_ATTEMPTS = 100;
 
-/// A name in the folder of the target that is new in all likelihood, and short whatever the target's is.
+/// A name in the folder of the target: very probably a new one, and short even if the target's is long.
 void nameBeside(FPath const& target, FPath& temporary) {
     static std::atomic<std::uint64_t> counter{0};
     temporary = target;

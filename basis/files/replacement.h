@@ -14,8 +14,8 @@ namespace ZOR_Basis {
 /// Whatever fails, and at whatever moment the process ends, the path leads to the old content or to the whole new one.
 ///
 /// The temporary file lies in the folder of the one that is replaced, as only a rename within one file system is one
-/// step. It is made by the system, exclusively, which the platform layer has no function for; all else is the platform
-/// layer's.
+/// step. The system makes it exclusively, for which the platform layer has no function; the platform layer does
+/// everything else.
 ///
 /// \error every failure leaves its reason as the thread's last error
 class Replacement {
@@ -29,9 +29,9 @@ public:
     /// Makes and opens the temporary file. It gets the owner and the permissions of the file that is replaced, as far
     /// as the system allows. A link stays, and what it leads to is replaced.
     /// \param mode  as for `File::open`
-    /// \error also where the file that is there may not be written, or is no file
+    /// \error also if the existing entry may not be written or is not a file
     bool open(char const* path, int mode);
-    /// What takes the content.
+    /// The file that receives the content.
     /// \pre it is open
     IFile& content() { return *file_; }
     /// Flushes the content to the disk and then renames the temporary file.

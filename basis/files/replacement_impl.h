@@ -1,5 +1,5 @@
 /// \file
-/// What replacing a file asks of the system itself: replacement_win.cpp, replacement_posix.cpp.
+/// The system calls that replace a file: replacement_win.cpp, replacement_posix.cpp.
 
 #ifndef BASIS_FILES_REPLACEMENT_IMPL_H
 #define BASIS_FILES_REPLACEMENT_IMPL_H
@@ -10,16 +10,16 @@
 
 namespace ZOR_Basis {
 
-/// Finds the path of the file itself that a path leads to over symbolic links.
-/// \param target  receives it; the path itself where it is no link, or where nothing is there
+/// Follows symbolic links to the path of the file itself.
+/// \param target  receives it; the path itself if it is not a link or nothing exists there
 /// \error the path is empty, or its links cannot be followed
 bool followLinks(char const* path, FPath& target);
 
 enum class Made { YES, NAME_TAKEN, FAILED };
 
-/// Makes an empty file that nothing had the name of, with the owner and the permissions of the target if there is one,
+/// Makes an empty file under an unused name, with the owner and the permissions of the target if there is one,
 /// as far as the system allows.
-/// \return FAILED also where a target may not be written, or is no file
+/// \return FAILED also if the target may not be written or is not a file
 Made makeBeside(char const* temporary, char const* target);
 
 /// Whether a name may begin behind this character of a path.

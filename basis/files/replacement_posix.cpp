@@ -16,7 +16,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// As many as the system follows itself.
+/// The number of links that the system itself follows.
 constexpr int MOST_LINKS = 40;
 constexpr mode_t EVERYONE_READS_AND_WRITES = 0666;
 constexpr mode_t OWNER_READS_AND_WRITES = 0600;
@@ -50,7 +50,7 @@ void goTo(char const* link, std::uint64_t length, FPath& path) {
     text.add(link, length);
 }
 
-/// The permissions for a file whose group could not be kept: its group is one of the others.
+/// The permissions of a file whose group could not be kept: the new group gets those of all others.
 mode_t withoutGroup(mode_t mode) { return (mode & 0707) | ((mode & 07) << 3 & mode); }
 
 /// Gives the list of further users and groups, where there is one.
@@ -61,7 +61,7 @@ void keepAccessList(int from, int to) {
     if (n > 0) ::fsetxattr(to, LIST, list, static_cast<std::size_t>(n), 0);
 }
 
-/// A file system that keeps none of it, and one that does not let this user, leave the file to its maker alone.
+/// If the file system stores none of this, or refuses it to this user, only the maker may use the file.
 void keepAccess(int from, struct stat const& facts, int to) {
     mode_t const mode = facts.st_mode & 0777;
     if (::fchown(to, facts.st_uid, facts.st_gid) == 0) {

@@ -12,7 +12,7 @@ namespace {
 
 constexpr DWORD KEPT_ATTRIBUTES = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM | FILE_ATTRIBUTE_NOT_CONTENT_INDEXED;
 
-/// The list of those who may use a file, for a new one in the same folder.
+/// The access control list of a file, for a new file in the same folder.
 class AccessList {
 public:
     explicit AccessList(char const* path) {

@@ -16,9 +16,9 @@ constexpr std::uint64_t FIRST_ROOM = 512;
 constexpr char SYSTEM[] = "system";
 
 std::atomic<Root const*> kept{nullptr};
-std::uint64_t room = FIRST_ROOM; // of the one that asks
+std::uint64_t room = FIRST_ROOM; // used by the asking thread only
 
-/// The root while it is not known. Not a static object: it must outlive everything that asks.
+/// The root before it is known. It is not a static object because it must outlive every caller.
 Root const& unknown(bool isFileSystem) {
     static Root const* const roots = new Root[2]{{{}, false}, {{}, true}};
     return roots[isFileSystem ? 1 : 0];
@@ -53,7 +53,7 @@ Root fromFolder(char const* folder) {
 
 Root const& get() {
     if (Root const* const known = kept.load(std::memory_order_acquire)) return *known;
-    // One asks, the others wait for its answer.
+    // One thread asks; the others wait for its answer.
     static NeverDestroyed<std::mutex> asking;
     std::lock_guard const one(*asking);
     if (Root const* const known = kept.load(std::memory_order_relaxed)) return *known;

@@ -1,5 +1,5 @@
 /// \file
-/// The installation's root folder as text, for those who cannot ask `Sys`, which answers in paths.
+/// The installation's root folder as text, for rooms below `Sys`, which returns it as a path.
 
 #ifndef BASIS_FILES_ROOT_FOLDER_H
 #define BASIS_FILES_ROOT_FOLDER_H
@@ -15,8 +15,8 @@ struct Root {
     bool isFileSystem = false;
 };
 
-/// The root, kept for the life of the process once it has a text; until then looked for at each call.
-/// \thread thread-safe; one asks at a time, and those that come meanwhile share its answer if it has a text
+/// The root. It is kept for the life of the process once it is not empty; until then each call looks for it.
+/// \thread thread-safe; one thread asks at a time, and others that call meanwhile share its answer unless it is empty
 Root const& get();
 
 /// The root that the platform layer's answer or the current folder stands for.

@@ -12,7 +12,7 @@ namespace ZOR_Basis::RootFolder {
 extern bool const HAS_ONE_FILE_SYSTEM;
 
 /// Writes the current folder.
-/// \return false if it does not fit `size` bytes, or is not to be had
+/// \return false if it does not fit into `size` bytes or cannot be found
 bool currentFolder(char* out, std::uint64_t size);
 
 } // namespace ZOR_Basis::RootFolder

@@ -13,7 +13,7 @@
 
 namespace ZOR_Basis {
 
-/// The codes of Windows, which stand for the errors of their kind on every system.
+/// Error codes of Windows, which stand for errors of the same kind on every system.
 enum SystemError : std::uint32_t {
     NO_ERROR_YET = 0,
     FILE_NOT_FOUND = 2,
@@ -29,7 +29,7 @@ struct SystemCalls {
     /// Status by a narrow path; on Linux of a link itself.
     /// \return whether there is an entry
     bool (*status)(char const* path, xos_Stat& record);
-    /// The same of what a link leads to.
+    /// The same for the target of a link.
     bool (*statusOfTarget)(char const* path, xos_Stat& record);
     /// Status by a wide path, following links.
     bool (*statusWide)(WChar const* path, xos_Stat& record);

@@ -28,7 +28,7 @@ void copyRecord(struct __stat64 const& from, xos_Stat& record) {
     record.st_ctime_ = from.st_ctime;
 }
 
-/// Hands on what a call of the runtime gives. \param call  true, or a pointer, where it succeeds
+/// Returns the result of a call of the runtime. \param call  returns true or a pointer if it succeeds
 template <class Call>
 auto told(Call call) {
     RuntimeCall const runtime;

@@ -63,11 +63,11 @@ bool isEscape(std::basic_string_view<Char> text) {
     return text.size() > 2 && text[0] == Char('%') && hexDigit(text[1]) >= 0 && hexDigit(text[2]) >= 0;
 }
 
-/// Appends the characters from `from` to `to`; none of them reads as everything up to a zero or the end.
+/// Appends the characters from `from` to `to`; an empty run counts as everything up to a zero or the end.
 template <class String, class Char>
 void addLiteral(String& out, std::basic_string_view<Char> text, std::uint64_t from, std::uint64_t to) {
     std::basic_string_view<Char> run = text.substr(from, to - from);
-    // kept path-04: a run of no characters is a source of length 0, which is measured.
+    // kept path-04: an empty run is a source of length 0, and a length of 0 is measured.
     if (run.empty()) run = text.substr(from, detail::textLengthUpTo(text.data() + from, text.size() - from));
     if (!run.empty()) out.add(run.data(), run.size());
 }

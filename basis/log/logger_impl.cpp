@@ -98,7 +98,7 @@ void LoggerImpl::append(char const* text, std::uint64_t size) {
     std::uint64_t const room = BLOCK_SIZE - current_->used;
     std::uint64_t const here = room <= size ? room : size;
     std::memcpy(current_->data + current_->used, text, here);
-    // The end of the process may stop this thread anywhere; whatever `used` counts is there then.
+    // The end of the process may stop this thread anywhere; the bytes that `used` counts must exist by then.
     std::atomic_signal_fence(std::memory_order_release);
     current_->used += here;
     if (room > size) return;
@@ -106,7 +106,7 @@ void LoggerImpl::append(char const* text, std::uint64_t size) {
     if (current_ != nullptr) append(text + here, size - here);
 }
 
-/// Begins a buffer of the present session, or leaves none current where memory is short.
+/// Begins a buffer of the current session; if memory is short, there is no current buffer.
 void LoggerImpl::newBuffer() {
     current_ = makeBuffer();
     if (current_ != nullptr) buffers_.append(current_);
@@ -149,10 +149,10 @@ std::uint32_t LoggerImpl::tick(AlertTimer::Alert const& alert) {
 bool LoggerImpl::writeWhatIsDue() {
     std::lock_guard const held(lock_);
     bool const ends = closing_;
-    // kept log-01: nothing keeps back the current buffer of a closed logger, so it is always the next to be written.
+    // kept log-01: nothing delays the current buffer of a closed logger, so it is always the next to be written.
     for (Buffer* buffer = buffers_.first(); buffer != nullptr && !mustWait(buffer);) {
         awaitWriter();
-        // What cannot be written is lost.
+        // Text that cannot be written is lost.
         writeOut(*buffer);
         // Lines may have come meanwhile, this may have become or ceased to be the current buffer, and be written by
         // `flush`.
@@ -208,13 +208,13 @@ std::uint64_t LoggerImpl::unwritten() const {
 
 /// Whether the buffer is still being filled.
 bool LoggerImpl::mustWait(Buffer const* buffer) const {
-    // The count wraps; the difference does not mind.
+    // The count wraps; the difference is correct all the same.
     return buffer == current_ && !closing_ && xos_MsCount() - lastWrite_ < PERIOD_MS;
 }
 
 /// Releases the lock while it writes.
 /// \pre no other thread writes
-// kept log-02: also where there is nothing to write.
+// kept log-02: even if there is nothing to write.
 bool LoggerImpl::writeOut(Buffer& buffer) {
     char const* const text = buffer.data + buffer.flushed;
     std::uint64_t const size = buffer.used - buffer.flushed;
@@ -231,7 +231,7 @@ bool LoggerImpl::writeOut(Buffer& buffer) {
     return isWritten;
 }
 
-// Text that a thread was writing may be written twice: better so than never.
+// Text that a thread was writing may be written twice, which is better than never.
 void LoggerImpl::writeRest(void (*write)(char const* path, char const* text, std::uint64_t size)) const {
     for (Buffer const* buffer = buffers_.first(); buffer != nullptr; buffer = buffer->next) {
         std::uint64_t const from = buffer == claim_.buffer ? claim_.from : buffer->flushed;

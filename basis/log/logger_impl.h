@@ -29,25 +29,25 @@ struct LoggerLinks {
 class LoggerImpl final : public LoggerLinks, public Logger {
 public:
     static constexpr std::size_t BLOCK_SIZE = 4096;
-    /// Milliseconds between looks at what there is to write, and of silence before a block is written that is not full.
+    /// Milliseconds between checks for text to write, and of silence before an incomplete block is written.
     static constexpr std::uint32_t PERIOD_MS = 8192;
     /// Bytes that `out` needs behind a line's terminator, whose place the line feed takes.
     static constexpr std::size_t RESERVED = 1;
 
     /// Starts a logger with its alert and its folders.
-    /// \return it ends itself, some time after `close`; null where memory is short or no alert is to be had
+    /// \return a logger that deletes itself some time after `close`; null if memory is short or no alert can be made
     static LoggerImpl* start(char const* name);
 
     void newSession() override;
     void out(char* line) override;
-    /// The same of a line whose terminator is known.
+    /// The same for a line whose terminator is known.
     void out(char* line, char* end);
     void close() override;
-    /// What has not been written is lost.
+    /// Unwritten text is lost.
     ~LoggerImpl() override;
 
-    /// Writes out what there is at the time of the call.
-    /// \return false: the rest of it is kept, and the last error says why
+    /// Writes the text that exists at the time of the call.
+    /// \return false if not all of it was written; the rest is kept, and the last error says why
     bool flush();
 
     /// Hands over the text that has not been written, without a lock.
@@ -55,7 +55,7 @@ public:
     void writeRest(void (*write)(char const* path, char const* text, std::uint64_t size)) const;
 
     std::uint32_t alertId() const { return alertId_; }
-    /// A logger in the copy of the process that made it: its lines are the original's to write.
+    /// Tells whether this is a copy in a forked process; the original process writes its lines.
     bool isCopy() const { return isCopy_; }
     void becomeCopy() { isCopy_ = true; }
 
@@ -101,7 +101,7 @@ private:
     std::uint32_t lastWrite_ = 0;
     Claim claim_;
     bool isCopy_ = false;
-    /// As it was made at the start, for the end of the process, when nobody can be asked for it.
+    /// As it was made at the start. At the end of the process it cannot be requested any more.
     FPath folder_;
 };
 

@@ -20,13 +20,13 @@ bool isValue(Blob const& blob, RecordBytes bytes) {
     return blob.size() == bytes.size && (bytes.size == 0 || std::memcmp(blob.val(), bytes.place, bytes.size) == 0);
 }
 
-/// The size of a file as the system gives it; 0 where it gives none.
+/// The size of a file according to the system; 0 if the system does not report one.
 std::uint64_t sizeOf(char const* path) {
     xos_Stat status{};
     return systemCalls.statusOfTarget(path, status) ? static_cast<std::uint64_t>(status.st_size_) : 0;
 }
 
-/// Whether the records are the whole file. A failing read looks like the file's end, so its size is asked for too.
+/// Tells whether the records are the whole file. A failed read looks like the end of the file, so this checks the size.
 bool isWhole(RecordReader const& records, char const* path) {
     return records.position() == records.arrived() && records.arrived() >= sizeOf(path);
 }
@@ -82,7 +82,7 @@ void Dict<K, V>::set(K const& key, V const& value) {
     if (entry == nullptr) {
         this->insertFront(new typename SngList<Entry>::Unit{nullptr, Entry(key, value)});
     } else if (entry->value == value) {
-        // kept dict-01: callers that store the same again and again do not write the file for it.
+        // kept dict-01: callers that store the same value repeatedly do not write the file because of it.
         modified_ = false;
     } else {
         entry->set(value);
@@ -108,7 +108,7 @@ void Dict<K, V>::clean() {
 
 template <class K, class V>
 void Dict<K, V>::intersect(Dict const& other) {
-    // kept dict-02: what is left is a view for the moment, and the file keeps the rest.
+    // kept dict-02: the remaining entries are a temporary view; the file keeps the others.
     for (auto at = this->begin(); at != this->end();) {
         if (other.find(at->key) == nullptr) {
             this->remove(at);

@@ -8,7 +8,7 @@
 
 namespace ZOR_Basis {
 
-/// The scope runs also where the semaphore cannot be taken; then it is not given back either.
+/// If the semaphore cannot be taken, the scope runs all the same, and the semaphore is not given back.
 class HeldSemaphore {
 public:
     explicit HeldSemaphore(xos_Sem semaphore) : semaphore_(semaphore), taken_(xos_SemTake(semaphore) == 0) {}

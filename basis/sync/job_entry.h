@@ -30,7 +30,7 @@ public:
     using MTQ_Dat::Task;
 };
 
-/// At an entry, between the one before it and it, or nowhere. One word, so that it can be read while others change it.
+/// A position at an entry, just before an entry, or nowhere. It is one word, so it can be read while others change it.
 class JobCursor {
 public:
     void moveTo(JobEntry* entry) { place_.store(wordOf(entry), std::memory_order_release); }

@@ -20,7 +20,7 @@ MTQ_Dat::~MTQ_Dat() {
     if (ownsArgument_) delete static_cast<MTQ_Arg*>(argument_);
 }
 
-// kept queue-03: the queue, which counts, does not hear of it.
+// kept queue-03: the queue, which counts its jobs, is not informed.
 bool MTQ_Dat::start() {
     starting_.store(true, std::memory_order_relaxed);
     started_.store(true, std::memory_order_release);
@@ -29,7 +29,7 @@ bool MTQ_Dat::start() {
     bool const made = task != NO_TASK;
     task_.store(task, std::memory_order_relaxed);
     if (!made) finished_.store(true, std::memory_order_release);
-    // The last look at the record, which may be dropped from now on.
+    // The last access to the record, which may be dropped from now on.
     starting_.store(false, std::memory_order_release);
     return made;
 }

@@ -8,7 +8,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// Between looks at the running jobs, where their signal cannot be waited for.
+/// The pause between checks of the running jobs if their signal cannot be awaited.
 constexpr std::uint32_t LOOK_AGAIN_MS = 1;
 
 /// What the task of a job does. \param job  an `MTQ_Dat`
@@ -103,7 +103,7 @@ void MTQ_Impl::done(MTQ_Dat& job) {
         if (!job.result()) failed_.store(true, std::memory_order_release);
         auto& entry = static_cast<JobEntry&>(job);
         if (entry.removesWhenDone()) drop(&entry);
-        // Last, as `wait` returns as soon as it reads 0, without the mutex.
+        // The last step, because `wait` reads this without the mutex and returns at 0.
         running_.fetch_sub(1, std::memory_order_release);
     }
     xos_SemGive(completion_);

@@ -30,7 +30,7 @@ public:
     MTQ_Dat* current() override { return cursor_.entry(); }
     void done(MTQ_Dat& job) override;
 
-    /// Runs a job from its function's call to the last that it has to do with the queue. On the job's task.
+    /// Runs a job from the call of its function to its last access to the queue, on the job's task.
     void run(JobEntry& job);
 
     std::int32_t running() const { return running_.load(std::memory_order_acquire); }

@@ -18,7 +18,7 @@ public:
     bool give(std::uint64_t key) override;
 
     std::uint64_t bucketCount() const { return count_; }
-    /// The bucket of a key; null where there was no memory for the table.
+    /// The bucket of a key; null if memory was short when the table was made.
     SemSynList* bucketOf(std::uint64_t key) const { return buckets_ != nullptr ? &buckets_[key % count_] : nullptr; }
 
     /// The buckets for a number of keys.

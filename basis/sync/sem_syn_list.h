@@ -14,13 +14,13 @@ namespace ZOR_Basis {
 
 class MemMgr;
 
-/// Buckets stand side by side in a table; each has its cache lines to itself.
+/// Buckets stand side by side in a table, each on cache lines of its own.
 class alignas(64) SemSynList {
 public:
     SemSynList();
     SemSynList(SemSynList const&) = delete;
     SemSynList& operator=(SemSynList const&) = delete;
-    // Not virtual: nobody deletes a bucket by another type.
+    // Not virtual: a bucket is never deleted through another type.
     ~SemSynList();
 
     virtual bool take(std::uint64_t key);
@@ -32,7 +32,7 @@ public:
     bool isConsistent() const;
 
 private:
-    /// Atomic is what is read without the list mutex.
+    /// The atomic members are read without the list mutex.
     struct Entry {
         std::atomic<Entry*> previous;
         std::atomic<Entry*> next;
@@ -56,9 +56,9 @@ private:
     std::atomic<Entry*> last_{nullptr};
     std::uint64_t count_ = 0;
     MemMgr* entryMemory_ = nullptr;
-    /// Entries without users, kept for the next key: a search that comes too late may still read them.
+    /// Entries without users, kept for the next key because a concurrent search may still read them.
     Entry* spare_ = nullptr;
-    /// Tells a search that links have changed meanwhile.
+    /// Detects that links have changed during a search.
     mutable SequenceLock links_;
 };
 

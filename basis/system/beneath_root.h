@@ -9,7 +9,7 @@
 
 namespace ZOR_Basis {
 
-/// Absolute also where the root is the whole file system, whose path has no text.
+/// Absolute even if the root is the whole file system, whose path is the empty text.
 inline FPath beneathRoot(RootFolder::Root const& root, char const* name) {
     FPath path(root.text);
     if (root.isFileSystem) path = "/";

@@ -50,7 +50,7 @@ bool isSame(Blob const& a, Str const& b) {
     return a.size() == b.size() && (b.empty() || std::memcmp(a.val(), b, b.size()) == 0);
 }
 
-/// Finds the entry of which one name is given, and gives the other one.
+/// Finds an entry by one of its names and returns the other.
 bool translate(Str const& given, BufStr<255>& domain, Blob Entry::*from, Blob Entry::*to) {
     RegistryKey const key(HKEY_LOCAL_MACHINE, DOMAIN_CACHE);
     if (!key.isOpen()) return false;
@@ -59,7 +59,7 @@ bool translate(Str const& given, BufStr<255>& domain, Blob Entry::*from, Blob En
     entry.fullName.alloc(VALUE_ROOM, DISCARDING_BYTES);
     DWORD type = REG_NONE;
     for (DWORD index = 0; read(key, index, entry, type); ++index) {
-        // kept sys-04: compared byte by byte, as the names are handed on to where case may matter.
+        // kept sys-04: compared byte by byte, because the names go on to services for which case may matter.
         if (!isText(type) || !isSame(entry.*from, given)) continue;
         setBounded(domain, (entry.*to).val(), (entry.*to).size());
         return true;

@@ -17,7 +17,7 @@ namespace {
 
 constexpr std::uint64_t LEAST_PATH_ROOM = 256;
 
-/// "P:\" or what else stands in its place.
+/// "P:\", or whatever replaces it.
 constexpr std::uint64_t DRIVE_LENGTH = 3;
 
 bool isLocalKind(UINT kind) { return kind == DRIVE_FIXED || kind == DRIVE_CDROM || kind == DRIVE_RAMDISK; }
@@ -41,7 +41,7 @@ char letterOf(BufStr<255> const& path) {
     return static_cast<char>(std::toupper(static_cast<unsigned char>(path.first())));
 }
 
-/// Puts what stands for the drive in its place.
+/// Replaces the drive by what stands for it.
 void unmapTo(char const* remote, BufStr<255> const& path, FPath& unc) {
     // kept sys-06: what stands before the path on the drive is three characters wide, slash or not.
     char const* rest = path.c_str() + std::min(DRIVE_LENGTH, path.size());

@@ -1,5 +1,5 @@
 /// \file
-/// As whom a thread acts: its effective user and group, and its supplementary groups.
+/// The identity of a thread: its effective user and group, and its supplementary groups.
 
 #ifndef BASIS_SYSTEM_IDENTITY_POSIX_H
 #define BASIS_SYSTEM_IDENTITY_POSIX_H
@@ -15,8 +15,8 @@ namespace ZOR_Basis {
 
 class Identity {
 public:
-    /// That of the calling thread, and that of an account.
-    /// \return whether the system told
+    /// Get the identity of the calling thread, and that of an account.
+    /// \return whether the system knows it
     bool readOwn();
     bool read(Account const& account);
 

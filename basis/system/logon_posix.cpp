@@ -20,7 +20,7 @@ namespace {
 
 constexpr char SERVICE[] = "zor_basis";
 
-/// Always a user: who cannot be read is not logged on.
+/// Always names a user: one that cannot be read is not logged on.
 class PosixHdl final : public SysHdl {
 public:
     explicit PosixHdl(Account const& account) : valid_(identity_.read(account)) {}
@@ -55,7 +55,7 @@ int converse(int n, pam_message const** messages, pam_response** out, void* pass
         release(answers, n);
         return PAM_BUF_ERR;
     }
-    // Modules that only tell something may want no answers.
+    // Modules that only display a message may expect no answer.
     if (out != nullptr) {
         *out = answers;
     } else {
@@ -84,7 +84,7 @@ public:
             if (result_ == PAM_SUCCESS) result_ = pam_acct_mgmt(handle_, PAM_SILENT);
             if (result_ == PAM_SUCCESS) return true;
         }
-        // The modules have codes of their own, none of which says more.
+        // The codes of the modules say no more than this.
         return refuse(result_ == PAM_BUF_ERR ? Reason::NO_MEMORY : Reason::LOGON_REFUSED);
     }
 

@@ -35,8 +35,8 @@ void load() {
         readKeys(group);
         cfg_GroupDelete(group, 0);
     } else {
-        // kept flat-05: an installation without a configuration accepts every kind; a configured one those that it
-        // names.
+        // kept flat-05: an installation without a configuration accepts every kind; a configured one accepts the kinds
+        // that it names.
         on |= ALL;
     }
     loaded = true;

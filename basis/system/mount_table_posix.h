@@ -20,14 +20,14 @@ struct Mount {
 FPath absolutePath(Str const& path);
 
 /// The mount on which an absolute path lies: the one with the longest directory, of several the last.
-/// \return false where the table cannot be read or has no such mount
+/// \return false if the table cannot be read or has no such mount
 bool findMount(FPath const& path, Mount& mount);
 
 /// Whether a kind of file system has its data on a disk or in the memory of this machine.
 bool isLocalKind(Str const& kind);
 
 /// The network path of a mounted share: "//server/share".
-/// \return false for what is no share
+/// \return false if it is not a share
 bool networkPath(Mount const& mount, FPath& path);
 
 } // namespace ZOR_Basis

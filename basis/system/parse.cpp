@@ -37,7 +37,7 @@ ZB_Parse::Line ZB_Parse::readLine(int maximum) {
     skipBlanks();
     std::int32_t const limit = std::max(0, std::min(maximum, size_ - position_));
     if (limit == 0) return {"", 0};
-    // kept parse-01: the zero stays where it is, as line ends do, and is no blank to skip.
+    // kept parse-01: like a line end, the zero is not consumed, and it is not a blank to skip.
     Line const line{data_ + position_, lengthOfLine(data_ + position_, static_cast<std::uint64_t>(limit))};
     position_ += static_cast<std::int32_t>(line.size);
     return line;

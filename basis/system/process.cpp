@@ -24,7 +24,7 @@ void* resolve(char const* name) {
 } // namespace
 
 bool Process::Create(char const* application, unsigned long* processId, char const* commandLine, int* exitCode) {
-    // kept process-01: callers look at the code whether they have waited or not.
+    // kept process-01: callers read the code whether they have waited or not.
     if (exitCode != nullptr) *exitCode = 0;
     if (application == nullptr && detail::isNothing(commandLine)) return refuse(Reason::BAD_ARGUMENT);
     return ProcessImpl::create(application, processId, commandLine, exitCode);

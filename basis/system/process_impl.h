@@ -1,5 +1,5 @@
 /// \file
-/// What `Process` asks of the system: process_win.cpp, process_posix.cpp.
+/// The system calls of `Process`: process_win.cpp, process_posix.cpp.
 
 #ifndef BASIS_SYSTEM_PROCESS_IMPL_H
 #define BASIS_SYSTEM_PROCESS_IMPL_H

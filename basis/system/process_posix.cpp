@@ -38,7 +38,7 @@ constexpr bool ALONG_THE_PATH = true;
 constexpr bool AS_NAMED = false;
 constexpr std::size_t MOST_UNAWAITED = 4096;
 
-/// Takes what is left of an ended child from the system. \return false: it is no child of ours, or no longer
+/// Collects an ended child from the system. \return false if it is not, or no longer, a child of this process
 bool takeEnd(idtype_t kind, int process, int flags, siginfo_t& end) {
     while (processCalls.waitFor(kind, static_cast<id_t>(process), &end, WEXITED | flags) != 0) {
         if (errno != EINTR) return false;
@@ -76,7 +76,7 @@ public:
 
     bool start(char const* program, bool search, char* const* words, pid_t& child) const {
         auto const spawn = search ? processCalls.spawnFromPath : processCalls.spawn;
-        // Told by their results alone.
+        // These report failure by their results only.
         int const error =
             error_ != 0 ? error_ : spawn(&child, OsPath(program), &actions_, &attributes_, words, environ);
         if (error != 0) errno = error;
@@ -110,7 +110,7 @@ public:
         return ready > 0;
     }
 
-    /// What is left of an ended child would stay in the system.
+    /// Collects an ended child, which would otherwise remain in the process table.
     void takeLeftovers() const {
         siginfo_t end{};
         takeEnd(P_PIDFD, descriptor_, WNOHANG, end);
@@ -131,7 +131,7 @@ bool start(char const* application, char const* commandLine, pid_t& child) {
         char* const words[] = {const_cast<char*>(application), nullptr};
         return settings.start(application, AS_NAMED, words, child);
     }
-    // Blanks before the name of a program that is searched for are no empty name.
+    // Blanks before the name of a program do not make an empty name.
     if (application == nullptr) commandLine += std::strspn(commandLine, " \t");
     CommandLine const line(commandLine);
     if (line.words() == nullptr) return refuse(Reason::NO_MEMORY);
@@ -139,7 +139,7 @@ bool start(char const* application, char const* commandLine, pid_t& child) {
                                   : settings.start(line.words()[0], ALONG_THE_PATH, line.words(), child);
 }
 
-/// \param take  takes what is left of the child then; else that stays for the application, which made it
+/// \param take  collects the child afterwards; otherwise that is left to the application, which made it
 bool awaitEnd(pid_t process, bool take) {
     OpenProcess const open(process);
     if (!open.isOpen()) {

@@ -29,8 +29,8 @@ private:
     HANDLE const handle_;
 };
 
-/// Runs a call on a process that was to be opened. What could not be is a handle that the call refuses; why it could
-/// not be is what callers want to know.
+/// Runs a call on a process that was opened. If opening failed, the call refuses the handle; callers need the reason of
+/// the failed opening.
 template <class Call>
 bool onOpened(Handle const& process, Call call) {
     LastError const opening;

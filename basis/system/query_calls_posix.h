@@ -1,5 +1,5 @@
 /// \file
-/// What the system queries ask of Linux. Everything goes through one table, so that tests can make each call fail.
+/// The Linux calls of the system queries, in one table, so that tests can make each call fail.
 
 #ifndef BASIS_SYSTEM_QUERY_CALLS_POSIX_H
 #define BASIS_SYSTEM_QUERY_CALLS_POSIX_H

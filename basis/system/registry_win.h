@@ -13,15 +13,15 @@
 
 namespace ZOR_Basis {
 
-/// Bytes with which a value is asked for.
+/// The size of the first buffer for a value, in bytes.
 inline constexpr std::uint64_t VALUE_ROOM = 512;
 
-/// Makes the result of a call of the registry, which comes without, the last error if it is one.
-/// \return whether it is none
+/// Makes the result of a registry call the last error if the call failed; these calls do not set it themselves.
+/// \return whether the call succeeded
 bool told(LSTATUS result);
 
-/// Makes room for what did not fit: as much as was reported, or twice as much where that is no more. The old bytes go.
-/// \return false where that is more than any entry of the registry has
+/// Enlarges the buffer to the reported size, or to twice its size if the report is no larger. The bytes are lost.
+/// \return false if no entry of the registry can be so large
 bool growBuffer(Blob& buffer, std::uint64_t reported);
 
 /// Whether values of a type are texts.
@@ -41,10 +41,10 @@ public:
     enum Growth { FIXED, ONCE };
     /// Reads a text. The size of the buffer becomes that of the value, in which the text may end earlier or lack its
     /// terminator.
-    /// \param growth  whether a text longer than the buffer is asked for again
+    /// \param growth  decides whether a text longer than the buffer is read again into a larger one
     bool read(char const* value, Blob& buffer, Growth growth) const;
     /// The same with a buffer of its own.
-    /// \return false, with `out` as it was, where there is no such text
+    /// \return false if there is no such text; `out` is then unchanged
     template <std::uint64_t N>
     bool read(char const* value, BufStr<N>& out) const {
         Blob buffer;

@@ -20,15 +20,15 @@ namespace ZOR_Basis {
 template <std::size_t MOST, auto GIVE_UP>
 class Unawaited {
 public:
-    /// A child that there is no room for, as all older ones still run, is not given up later.
+    /// If all older children still run and there is no room for this one, it is never collected.
     void add(pid_t child) {
         std::lock_guard const lock(mutex_);
         if (size_ == MOST) giveUpOlderHalf();
         if (size_ < MOST) children_[size_++] = child;
     }
 
-    /// From now on the child is the caller's to await.
-    /// \return false: it is none of these
+    /// Leaves it to the caller to await the child.
+    /// \return false if it is not among these
     bool remove(pid_t child) {
         std::lock_guard const lock(mutex_);
         auto* const end = children_.data() + size_;

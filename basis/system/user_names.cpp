@@ -1,4 +1,4 @@
-// What is in a qualified user name and in the name of a domain.
+// The parts of qualified user names and of names of domains.
 
 #include "zor_basis/system/sys.h"
 
@@ -29,7 +29,7 @@ bool Sys::ParseUser(Str const& full, BufStr<15>& user, BufStr<15>& domain) {
         setPart(user, separator + 1, end);
         return true;
     }
-    // kept sys-03: callers set the domain that shall hold without one in the text.
+    // kept sys-03: callers preset the domain that applies if the text has none.
     user = text;
     return false;
 }

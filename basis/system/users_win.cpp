@@ -60,7 +60,7 @@ bool Sys::DefaultLogin(BufStr<15>& login) {
     RegistryKey const key(HKEY_LOCAL_MACHINE, "SOFTWARE\\Microsoft\\Windows NT\\CurrentVersion\\Winlogon");
     if (!key.read("DefaultUserName", login)) return false;
     BufStr<15> domain;
-    // kept sys-02: what counts is that the domain is there.
+    // kept sys-02: only the existence of the domain value counts.
     if (key.read("DefaultDomainName", domain)) login.add("@").add(domain);
     return true;
 }

@@ -20,13 +20,13 @@ constexpr int NAMED_MUTEX = 264;
 constexpr char SHARED_FOLDER[] = "vdp_tmp";
 constexpr int CLEARS_THE_FOLDER = 1;
 
-/// What all processes of a user take turns by.
+/// The mutex by which all processes of a user take turns.
 xos_Sem mutexOfAllProcesses() {
     static constinit std::uint32_t word = 0;
     return xos_SemNamedMutexCreate(NAMED_MUTEX, 0, 0, &word);
 }
 
-/// Guards what the names are made of while `Init` changes it. Never held over a call of the platform layer.
+/// Guards the parts of the names while `Init` changes them. Never held during a call of the platform layer.
 NeverDestroyed<std::mutex> parts;
 
 NeverDestroyed<FPath> commonFolder;
@@ -53,7 +53,7 @@ constinit std::atomic<std::int32_t> VDPTempDir::_Level{0};
 
 void VDPTempDir::Init(int n) {
     if (_Sem != 0 && (n == 0 || _Level > 0)) return;
-    // `_Sem` is not taken here: a `Create` that tries in vain keeps it, and would stop the user's other processes.
+    // `_Sem` is not taken here: a `Create` that keeps failing holds it and would block the user's other processes.
     HeldSemaphore const all(mutexOfAllProcesses());
     // kept temp-01: folders that jobs have already stay beneath the root.
     if (_Level > 0 || (n == 0 && _GlbTmp.some())) return;
@@ -75,7 +75,7 @@ void VDPTempDir::choose(int n) {
     if (n > 0) _ExtRip << n;
 }
 
-/// What `Init` would have done.
+/// Does what `Init` would have done.
 void VDPTempDir::prepare() {
     HeldSemaphore const all(mutexOfAllProcesses());
     if (_Level <= 0 && _GlbTmp.empty()) choose(0);
@@ -92,14 +92,14 @@ void VDPTempDir::nextPath(FPath& path) {
 void VDPTempDir::Create(FPath& path) {
     if (_Sem == 0) prepare();
     HeldSemaphore const naming(_Sem);
-    // kept temp-03: a job cannot go on without its folder, and a root that is full or away comes back.
+    // kept temp-03: a job cannot continue without its folder, and a root that is full or missing becomes usable again.
     do { nextPath(path); } while (!becomesDirectory(path));
 }
 
 FPath const& VDPTempDir::Root() { return _GlbTmp; }
 
 VDPTempDir::~VDPTempDir() {
-    // kept temp-04: the second of two copies finds nothing any more.
+    // kept temp-04: the second of two copies finds nothing left to remove.
     if (deletes_ && FStat::isDir(path_)) xos_DirRemove(path_, REMOVE_ALWAYS | RECURSIVE);
 }
 

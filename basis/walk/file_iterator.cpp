@@ -9,28 +9,28 @@
 namespace ZOR_Basis {
 namespace {
 
-/// What a listing of the platform layer is asked for.
+/// The kinds of entries that a listing of the platform layer can select.
 enum Kind : int { EVERYTHING = 0, DIRECTORIES = 1, FILES = 2 };
 
-// kept walk-01: callers that count and copy say LOOK_ALL for folders, those that list say it for everything.
+// kept walk-01: callers that count and copy use LOOK_ALL for folders; callers that list use it for everything.
 constexpr Kind WALKED[] = {DIRECTORIES, FILES, DIRECTORIES, EVERYTHING};
 constexpr Kind LISTED[] = {EVERYTHING, FILES, DIRECTORIES, EVERYTHING};
 
 Kind kindOf(Kind const (&table)[4], LookForType type) { return table[type & LOOK_BOTH]; }
 
 bool isPassedOver(char const* name) {
-    // kept walk-03: what another system leaves beside the files of a job is no part of it.
+    // kept walk-03: the folder that another system leaves beside the files of a job does not belong to it.
     return xos_StrCmp(name, "__MACOS") == 0;
 }
 
 FileEntry entryOf(FPath const& dir, char const* name, bool platformFallback) {
     FStat const status(FPath(dir, name), platformFallback);
-    // kept walk-02: visitors handle two kinds, and removing or copying a tree is what suits the rest.
+    // kept walk-02: visitors distinguish two kinds, and every other kind is removed and copied like a tree.
     if (status.isFile()) return {FStat::ST_FILE, dir, name, status.size(), status.modified()};
     return {FStat::ST_DIR, dir, name, 0, status.modified()};
 }
 
-/// The result of a ride: that of the last entry, and with it the reason of its failure.
+/// The result of one pass: that of the last entry, with the reason if it failed.
 class LastResult {
 public:
     LastResult& operator=(bool result) {
@@ -39,7 +39,7 @@ public:
         return *this;
     }
     operator bool() const { return result_; }
-    /// What a ride returns once the listing is over, which has last errors of its own.
+    /// The result of the pass after the listing has ended, which sets last errors of its own.
     bool told() const {
         if (!result_) why_.restore();
         return result_;
@@ -108,7 +108,7 @@ bool FileIterator::doIt(Str const& path, LookForType type, FileVisitor* visitor,
 }
 
 bool FileIterator::shallowIteration(FileVisitor* visitor, bool stopOnFalse) {
-    // kept walk-06: folders come and go under a walk, and one that has gone has nothing to offer.
+    // kept walk-06: folders come and go during a walk, and a folder that is gone contains nothing.
     if (!open(WITH_WILDCARD, IN_ANY_CASE)) return true;
     bool const result = shallowRide(visitor, stopOnFalse);
     finish();
@@ -116,7 +116,7 @@ bool FileIterator::shallowIteration(FileVisitor* visitor, bool stopOnFalse) {
 }
 
 bool FileIterator::deepIteration(FileVisitor* visitor, bool stopOnFalse) {
-    // kept walk-04: a wildcard is for the files that are wanted, which lie in folders of any name.
+    // kept walk-04: a wildcard selects files, and these lie in folders of any name.
     if (!open(WITHOUT_WILDCARD, IN_EXACT_CASE)) return true;
     bool const result = deepRide(visitor, stopOnFalse);
     finish();
@@ -131,7 +131,7 @@ bool FileIterator::shallowRide(FileVisitor* visitor, bool stopOnFalse) {
         if (isPassedOver(name)) continue;
         FileEntry entry = entryOf(path_, name, !crypted_);
         if (condition_ != nullptr && !condition_->acceptEntry(&entry)) continue;
-        // kept walk-05: who wants to know of each failure stops on it, or counts in the visitor.
+        // kept walk-05: a caller that needs every failure stops at the first one or counts them in its visitor.
         result = visitor->perform(&entry);
     }
     return result.told();

@@ -14,7 +14,7 @@ void FindFileVisit::searchName(Str const& name) {
 }
 
 void FindFileVisit::searchExt(Str const& ext) {
-    // kept walk-09: extensions are told without their dot, and one that has it names files with two.
+    // kept walk-09: extensions are given without their dot; one that has it finds names with two dots.
     key_ = ".";
     key_.add(ext);
     key_.toLower();

@@ -7,7 +7,7 @@ namespace ZOR_Basis {
 
 bool zbLinkOrCopy(char const* src, char const* dst, bool overwrite) {
     if (Dir::Exist(dst)) {
-        // kept walk-10: jobs that share a resource all ask for it, and the first has brought it.
+        // kept walk-10: all jobs that share a resource request it, and the first of them has brought it.
         if (!overwrite) return true;
         // A directory stays, and then neither a link nor a copy can be made.
         removeFile(dst);

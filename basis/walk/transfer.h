@@ -17,7 +17,7 @@ struct Transfer {
     FPath destination;
 };
 
-/// Whether an entry lies in the target already, by the text of its directory.
+/// Tells whether an entry is already in the target, by the text of its directory.
 bool isAtTarget(FileEntry const& entry, FPath const& target);
 
 } // namespace ZOR_Basis

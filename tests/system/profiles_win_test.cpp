@@ -5,6 +5,7 @@
 #include "basis/system/profiles_win.h"
 #include "tests/support/table.h"
 #include "tests/system/registry_scratch_win.h"
+#include "tests/system/system_says_win.h"
 #include "tests/system/wanted_room_win.h"
 
 #include <cstring>

@@ -4,9 +4,7 @@
 
 #include "tests/support/table.h"
 #include "tests/system/registry_scratch_win.h"
-
-#include <cstring>
-#include <map>
+#include "tests/system/system_says_win.h"
 
 using namespace ZOR_Basis;
 
@@ -14,27 +12,6 @@ namespace {
 
 struct UsersOfTheRegistryWin : RegistryScratch {};
 struct DomainsOfTheRegistryWin : RegistryScratch {};
-
-/// What the system says of the thread's user and of the computer; null makes the call fail.
-char const* threadUser = nullptr;
-std::map<int, char const*> computerNames;
-
-BOOL give(char const* text, char* buffer, DWORD* n) {
-    if (text == nullptr) return FALSE;
-    std::size_t const length = std::strlen(text);
-    if (*n <= length) {
-        *n = static_cast<DWORD>(length + 1);
-        SetLastError(ERROR_MORE_DATA);
-        return FALSE;
-    }
-    std::strcpy(buffer, text);
-    *n = static_cast<DWORD>(length);
-    return TRUE;
-}
-BOOL WINAPI userName(char* buffer, DWORD* n) { return give(threadUser, buffer, n); }
-BOOL WINAPI computerName(COMPUTER_NAME_FORMAT format, char* buffer, DWORD* n) {
-    return give(computerNames[format], buffer, n);
-}
 
 std::string currentUser(bool& known) {
     BufStr<15> user("before");
