@@ -4,6 +4,7 @@
 #include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cstdio>
 #include <cstdlib>

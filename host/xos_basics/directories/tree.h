@@ -19,7 +19,7 @@ bool removeDirectory(char const* path, bool recursive);
 /// Where nothing was, the copy appears when it is complete; in a directory that is there already, its files do.
 bool copyDirectory(char const* dst, char const* src, bool overwrite, bool recursive);
 
-/// Renames a directory, or a link to one, within one file system.
+/// Renames anything but a regular file within one file system.
 /// \param overwrite  a directory in the way is removed, if the move
 ///     succeeds
 bool moveDirectory(char const* dst, char const* src, bool overwrite);

@@ -15,8 +15,6 @@
 
 namespace {
 
-void doNothing(void*) {}
-
 struct HostCalls : RecordedCalls {};
 
 TEST_F(HostCalls, counts_calls_that_fail_and_calls_with_bad_arguments) {

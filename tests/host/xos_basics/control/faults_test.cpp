@@ -20,8 +20,6 @@
 
 namespace {
 
-void doNothing(void*) {}
-
 std::uint32_t onceAMinute(HQ_Basis::AlertTimer::Alert const&) { return 60'000; }
 
 struct HostFaults : RecordedCalls {};

@@ -21,6 +21,9 @@ protected:
     ~RecordedCalls() override { xos_HostFailClear(); }
 };
 
+/// The entry of a task.
+inline void doNothing(void*) {}
+
 inline std::string lastCall(char const* function) {
     char const* const text = xos_HostLastCall(function);
     return text == nullptr ? "no call" : text;
