@@ -61,7 +61,7 @@ CallRecord* lastRecordOf(Function function, ThreadCalls& mine) {
 void noteCall(Function function, ThreadCalls& mine, std::uint64_t const* arguments, std::size_t count) {
     std::string_view const kinds = factsOf(function).kinds;
     CallRecord& record = mine.records[indexOf(function)];
-    beginCall(function, record);
+    std::uint64_t const begun = beginCall(function, record);
     for (std::size_t i = 0; i < std::min(count, kinds.size()); ++i) {
         if (kinds[i] == 't') {
             record.addText(i, reinterpret_cast<char const*>(arguments[i]));
@@ -69,7 +69,7 @@ void noteCall(Function function, ThreadCalls& mine, std::uint64_t const* argumen
             record.addWord(i, arguments[i]);
         }
     }
-    endCall(function, record, mine);
+    endCall(function, record, mine, begun);
 }
 
 } // namespace

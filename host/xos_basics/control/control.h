@@ -90,12 +90,15 @@ inline bool failsOnDemand(Function function) {
     return faults[indexOf(function)].load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
 }
 
-HOST_INLINE void beginCall(Function function, CallRecord& record) {
+/// \return the sequence number for `endCall`
+HOST_INLINE std::uint64_t beginCall(Function function, CallRecord& record) {
     if (factsOf(function).hasTexts) {
         record.textMutex.lock();
         record.texts.clear();
     }
-    record.sequence.store(record.sequence.load(std::memory_order_relaxed) + 1, std::memory_order_relaxed);
+    std::uint64_t const begun = record.sequence.load(std::memory_order_relaxed) + 1;
+    record.sequence.store(begun, std::memory_order_relaxed);
+    return begun;
 }
 
 template <class Argument>
@@ -111,8 +114,8 @@ HOST_INLINE void noteArgument(CallRecord& record, std::size_t index, Argument co
     }
 }
 
-HOST_INLINE void endCall(Function function, CallRecord& record, ThreadCalls& mine) {
-    record.sequence.store(record.sequence.load(std::memory_order_relaxed) + 1, std::memory_order_release);
+HOST_INLINE void endCall(Function function, CallRecord& record, ThreadCalls& mine, std::uint64_t begun) {
+    record.sequence.store(begun + 1, std::memory_order_release);
     if (factsOf(function).hasTexts) record.textMutex.unlock();
     std::atomic<ThreadCalls*>& last = registry.lastCaller[indexOf(function)];
     bool const isQuick = (factsOf(function).traits & IS_QUICK) != 0;
@@ -127,10 +130,10 @@ HOST_INLINE bool failsNow(Function function, Arguments const&... arguments) {
     static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
     if (ThreadCalls* const mine = threadCalls()) {
         CallRecord& record = mine->records[indexOf(function)];
-        beginCall(function, record);
+        std::uint64_t const begun = beginCall(function, record);
         std::size_t index = 0;
         (noteArgument(record, index++, arguments), ...);
-        endCall(function, record, *mine);
+        endCall(function, record, *mine, begun);
     }
     return failsOnDemand(function);
 }
