@@ -2,12 +2,9 @@
 
 #include "tests/log/driven_logger.h"
 
-#include <gmock/gmock.h>
-
 #include <cstring>
 
 using namespace ZOR_Basis;
-using testing::ElementsAre;
 
 namespace {
 
@@ -85,7 +82,7 @@ TEST_F(LoggerImplFaults, ends_with_its_alert_at_the_tick_after_closing_when_it_n
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 1u);
     EXPECT_EQ(xos_HostLastCall("HQ_Basis::AlertTimer::Delete"), std::to_string(id));
     EXPECT_EQ(xos_HostAlertFire(id), -1);
-    EXPECT_THAT(opened, ElementsAre());
+    EXPECT_TRUE(opened.empty());
 }
 
 TEST_F(LoggerImplFaults, deletes_an_alert_that_outlived_it_when_it_comes_again) {
@@ -101,7 +98,7 @@ TEST_F(LoggerImplFaults, deletes_an_alert_that_outlived_it_when_it_comes_again) 
     successor.newSession();
     EXPECT_EQ(xos_HostAlertFire(id), 0);
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 1u);
-    EXPECT_THAT(opened, ElementsAre());
+    EXPECT_TRUE(opened.empty());
     EXPECT_EQ(xos_HostLastCall("HQ_Basis::AlertTimer::Delete"), std::to_string(id));
     EXPECT_EQ(xos_HostAlertFire(id), -1);
     tick(successor);
