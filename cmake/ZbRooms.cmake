@@ -53,17 +53,21 @@ function(zb_optimised_tests)
 endfunction()
 
 # zb_joined_tests(<room> <files>): compiles the test files of one room together, some at a time, if ZB_JOINED_TESTS is
-# on. Those of one system stand alone: they define what the system's headers declare.
+# on. Those of one system keep to themselves: they include the system's headers.
 function(zb_joined_tests room)
   set(most 8)
+  set(own ${ARGN})
+  list(FILTER own INCLUDE REGEX "_(posix|win)_test")
   list(FILTER ARGN EXCLUDE REGEX "_(posix|win)_test")
-  set(count 0)
-  foreach(file IN LISTS ARGN)
-    math(EXPR group "${count} / ${most}")
-    math(EXPR count "${count} + 1")
-    set_source_files_properties(${CMAKE_CURRENT_SOURCE_DIR}/${file}
-      DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
-      PROPERTIES UNITY_GROUP ${room}_${group})
+  foreach(kind IN ITEMS ARGN own)
+    set(count 0)
+    foreach(file IN LISTS ${kind})
+      math(EXPR group "${count} / ${most}")
+      math(EXPR count "${count} + 1")
+      set_source_files_properties(${CMAKE_CURRENT_SOURCE_DIR}/${file}
+        DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
+        PROPERTIES UNITY_GROUP ${room}_${kind}_${group})
+    endforeach()
   endforeach()
 endfunction()
 

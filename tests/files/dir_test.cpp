@@ -3,7 +3,7 @@
 #include <zor_basis/files/f_stat.h>
 #include <zor_basis/files/wc_path.h>
 
-#include "tests/support/scratch.h"
+#include "tests/files/last_call.h"
 #include "tests/support/table.h"
 #include "xos_host.h"
 
@@ -25,15 +25,7 @@ struct DirOnDisk : testing::Test {
     static std::string quoted(std::string const& text) { return "\"" + text + "\""; }
     static std::basic_string<WChar> wide(std::string const& ascii) { return {ascii.begin(), ascii.end()}; }
 
-    /// The last call of a function, without the scratch folder's path.
-    std::string last(char const* function) const {
-        char const* const call = xos_HostLastCall(function);
-        if (call == nullptr) return "none";
-        std::string text = call;
-        std::string const own = scratch.path() + "/";
-        for (std::size_t i = text.find(own); i != std::string::npos; i = text.find(own)) text.erase(i, own.size());
-        return text;
-    }
+    std::string last(char const* function) const { return lastCallIn(scratch, function); }
 
     Scratch scratch;
 };

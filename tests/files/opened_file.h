@@ -6,8 +6,7 @@
 #define TESTS_FILES_OPENED_FILE_H
 
 #include "basis/files/system_calls.h"
-#include "tests/support/scratch.h"
-#include "xos_host.h"
+#include "tests/files/last_call.h"
 
 #include <zor_basis/files/file.h>
 
@@ -70,15 +69,7 @@ struct CallsOfFiles : testing::Test {
     }
 
     std::string at(std::string const& name) const { return scratch / name; }
-    /// The last call of a function, without the scratch folder's path.
-    std::string last(char const* function) const {
-        char const* const call = xos_HostLastCall(function);
-        if (call == nullptr) return "none";
-        std::string text = call;
-        std::string const own = scratch.path() + "/";
-        for (std::size_t i = text.find(own); i != std::string::npos; i = text.find(own)) text.erase(i, own.size());
-        return text;
-    }
+    std::string last(char const* function) const { return lastCallIn(scratch, function); }
     static std::basic_string<ZOR_Basis::WChar> wide(std::string const& ascii) { return {ascii.begin(), ascii.end()}; }
 
     Scratch scratch;

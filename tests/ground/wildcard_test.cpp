@@ -1,6 +1,7 @@
 #include "basis/ground/wildcard.h"
 
 #include "tests/support/random_steps.h"
+#include "tests/support/reference_wildcard.h"
 #include "tests/support/table.h"
 
 #include "zor_basis/wide_char.h"
@@ -16,33 +17,6 @@ using ZOR_Basis::ExactCase;
 using ZOR_Basis::matchesWildcard;
 
 namespace {
-
-bool isSlash(char c) { return c == '/' || c == '\\'; }
-
-/// The rule as documented, by trying all possibilities.
-template <class Case>
-bool literally(char const* pattern, char const* name) {
-    while (*name != '\0') {
-        if (isSlash(*pattern) && isSlash(*name)) {
-            while (isSlash(*pattern)) ++pattern;
-            while (isSlash(*name)) ++name;
-        } else if (*pattern == '?' || Case::fold(*pattern) == Case::fold(*name)) {
-            ++pattern;
-            ++name;
-        } else if (*pattern != '*') {
-            return false;
-        } else if (pattern[1] == '\0') {
-            return true;
-        } else {
-            for (; *name != '\0'; ++name) {
-                if (literally<Case>(pattern + 1, name)) return true;
-            }
-            return false;
-        }
-    }
-    while (*pattern == '*') ++pattern;
-    return *pattern == '\0';
-}
 
 std::basic_string<ZOR_Basis::WChar> widened(std::string const& text) { return {text.begin(), text.end()}; }
 

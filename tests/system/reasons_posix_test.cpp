@@ -264,10 +264,10 @@ TEST(ReasonsPosix, of_what_only_linux_has_or_tells) {
 
 namespace {
 
-std::string configuration;
+std::string services;
 
-int startConfigured(char const* service, char const* user, pam_conv const* conversation, pam_handle_t** handle) {
-    return pam_start_confdir(service, user, conversation, configuration.c_str(), handle);
+int startWithServices(char const* service, char const* user, pam_conv const* conversation, pam_handle_t** handle) {
+    return pam_start_confdir(service, user, conversation, services.c_str(), handle);
 }
 int lackMemory(char const*, char const*, pam_conv const*, pam_handle_t**) { return PAM_BUF_ERR; }
 
@@ -318,8 +318,8 @@ bool refuseUser(uid_t) {
 
 struct ReasonsOfLogonPosix : QueryCallsTest {
     ReasonsOfLogonPosix() {
-        configuration = rules.path();
-        queryCalls.pamStart = startConfigured;
+        services = rules.path();
+        queryCalls.pamStart = startWithServices;
         queryCalls.userByName = oneAccount;
         queryCalls.groupsOf = oneGroup;
         admitWith("auth required pam_permit.so\naccount required pam_permit.so\n");
@@ -360,7 +360,7 @@ TEST_F(ReasonsOfLogonPosix, are_the_refusal_or_what_the_system_says) {
                 ENOENT,
                 0,
                 [this](auto&) {
-                    queryCalls.pamStart = startConfigured;
+                    queryCalls.pamStart = startWithServices;
                     admitWith("auth required pam_permit.so\naccount required pam_permit.so\n");
                     queryCalls.userByName = findNoName;
                     return logsOn();

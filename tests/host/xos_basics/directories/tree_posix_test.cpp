@@ -1,6 +1,7 @@
 // What only Linux can show of trees: links, permissions, special entries.
 
 #include "basis/platform/xos_basics.h"
+#include "tests/host/support/entry_posix.h"
 #include "tests/host/support/status.h"
 #include "tests/support/scratch.h"
 
@@ -12,14 +13,6 @@
 #include <unistd.h>
 
 namespace {
-
-mode_t permissionsOf(std::string const& path) {
-    struct stat status {};
-    ::lstat(path.c_str(), &status);
-    return status.st_mode & 07777;
-}
-
-std::string linkTarget(std::string const& path) { return std::filesystem::read_symlink(path).string(); }
 
 int removeTree(std::string const& path, std::uint32_t flags = 0x600) { return xos_DirRemove(path.c_str(), flags); }
 

@@ -1,6 +1,7 @@
 // What only Linux can show of whole files: links, permissions, names of any bytes, holes, other file systems.
 
 #include "basis/platform/xos_basics.h"
+#include "tests/host/support/entry_posix.h"
 #include "tests/host/support/status.h"
 #include "tests/support/scratch.h"
 #include "tests/support/skip.h"
@@ -14,14 +15,6 @@
 #include <unistd.h>
 
 namespace {
-
-mode_t permissionsOf(std::string const& path) {
-    struct stat status {};
-    ::lstat(path.c_str(), &status);
-    return status.st_mode & 07777;
-}
-
-std::string linkTarget(std::string const& path) { return std::filesystem::read_symlink(path).string(); }
 
 /// Makes what the current user makes carry fewer permissions than files ask for.
 struct Umask {
