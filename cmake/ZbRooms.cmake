@@ -25,8 +25,8 @@ endfunction()
 function(zb_tests room)
   cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
   zb_optimised_tests(${ARG_LONG_RUNS})
-  zb_joined_tests(${room} ${ARG_EXPORTED})
-  zb_joined_tests(${room} ${ARG_INTERNAL})
+  zb_joined_tests(${room}_exported ${ARG_EXPORTED})
+  zb_joined_tests(${room}_internal ${ARG_INTERNAL})
   set(own_files ${ARG_INTERNAL})
   if(ZB_SANITIZE)
     list(APPEND own_files ${ARG_EXPORTED})
@@ -52,21 +52,24 @@ function(zb_optimised_tests)
   endif()
 endfunction()
 
-# zb_joined_tests(<room> <files>): compiles the test files of one room together, some at a time, if ZB_JOINED_TESTS is
-# on. Those of one system keep to themselves: they include the system's headers.
-function(zb_joined_tests room)
+# zb_joined_tests(<name> <files>): compiles test files of the calling folder together, some at a time, if
+# ZB_JOINED_TESTS is on. Those that include Linux's headers keep to themselves; those for Windows stand alone, as they
+# replace the same calls.
+function(zb_joined_tests name)
   set(most 8)
-  set(own ${ARGN})
-  list(FILTER own INCLUDE REGEX "_(posix|win)_test")
-  list(FILTER ARGN EXCLUDE REGEX "_(posix|win)_test")
-  foreach(kind IN ITEMS ARGN own)
+  list(FILTER ARGN EXCLUDE REGEX "_win_test")
+  set(portable ${ARGN})
+  set(posix ${ARGN})
+  list(FILTER portable EXCLUDE REGEX "_posix_test")
+  list(FILTER posix INCLUDE REGEX "_posix_test")
+  foreach(kind IN ITEMS portable posix)
     set(count 0)
     foreach(file IN LISTS ${kind})
       math(EXPR group "${count} / ${most}")
       math(EXPR count "${count} + 1")
       set_source_files_properties(${CMAKE_CURRENT_SOURCE_DIR}/${file}
         DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
-        PROPERTIES UNITY_GROUP ${room}_${kind}_${group})
+        PROPERTIES UNITY_GROUP ${name}_${kind}_${group})
     endforeach()
   endforeach()
 endfunction()
