@@ -6,16 +6,16 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <vector>
 
 using namespace ZOR_Basis;
 
 namespace {
 
-/// A registry is never destroyed.
+/// A registry is never destroyed, and neither is the list that holds them.
 TimerMgrMgr& newRegistry() {
-    static PtrArray<TimerMgrMgr> registries(8);
-    registries.insertBack(new TimerMgrMgr);
-    return *registries[registries.size() - 1];
+    static auto* const registries = new std::vector<TimerMgrMgr*>;
+    return *registries->emplace_back(new TimerMgrMgr);
 }
 
 } // namespace
