@@ -1,8 +1,8 @@
 # How a room (one folder of basis/ or host/) adds its sources, and how its tests become test programs.
 
-# zb_room(<target> SOURCES <files> TWINS <stems>): adds sources of the calling folder to a target.
+# zb_files(<variable> <folder> SOURCES <files> TWINS <stems>): the paths of sources in a folder.
 # A twin `x` stands for x_win.cpp on Windows and x_posix.cpp elsewhere.
-function(zb_room target)
+function(zb_files variable folder)
   cmake_parse_arguments(ARG "" "" "SOURCES;TWINS" ${ARGN})
   set(files ${ARG_SOURCES})
   foreach(stem IN LISTS ARG_TWINS)
@@ -12,7 +12,13 @@ function(zb_room target)
       list(APPEND files ${stem}_posix.cpp)
     endif()
   endforeach()
-  list(TRANSFORM files PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
+  list(TRANSFORM files PREPEND ${folder}/)
+  set(${variable} ${files} PARENT_SCOPE)
+endfunction()
+
+# zb_room(<target> SOURCES <files> TWINS <stems>): adds sources of the calling folder to a target.
+function(zb_room target)
+  zb_files(files ${CMAKE_CURRENT_SOURCE_DIR} ${ARGN})
   target_sources(${target} PRIVATE ${files})
 endfunction()
 
