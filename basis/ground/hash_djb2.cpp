@@ -1,5 +1,4 @@
-#include "basis/ground/hash_djb2.h"
-
+#include "basis/ground/processor.h"
 #include "basis/ground/wide_loads.h"
 #include "zor_basis/ground/hashing.h"
 
@@ -121,8 +120,6 @@ ZB_SSSE3 std::uint64_t hashBySsse3(char const* text, __m128i bytes) { return has
 
 } // namespace
 
-std::uint64_t hashDjb2ByMultiplication(char const* text) { return hashOf<ByMultiplication>(text, loadText(text)); }
-
 std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
     if (text == nullptr) [[unlikely]]
         return START;
@@ -130,7 +127,7 @@ std::uint64_t hashDjb2(char const* text, std::uint64_t) noexcept {
     unsigned const zeros = zerosIn(bytes) & ((2U << SHORT) - 1);
     if (zeros != 0) [[likely]]
         return hashOfShort(bytes, static_cast<unsigned>(std::countr_zero(zeros)));
-    return ZB_HAS_SSSE3 ? hashBySsse3(text, bytes) : hashDjb2ByMultiplication(text);
+    return detail::canUse(detail::Vectors::SSSE3) ? hashBySsse3(text, bytes) : hashOf<ByMultiplication>(text, bytes);
 }
 
 } // namespace ZOR_Basis

@@ -1,5 +1,6 @@
 #include "zor_basis/text/word_ops.h"
 
+#include "basis/ground/processor.h"
 #include "basis/text/text_pair.h"
 #include "basis/text/wide_text_pair.h"
 
@@ -37,17 +38,28 @@ int compareTextsUpTo(char const* a, char const* b, std::uint64_t limit) noexcept
 
 namespace {
 
+ZB_INLINE bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+#if ZB_WIDE_VECTOR_TEXT
+    if (canUse(Vectors::AVX2)) [[likely]]
+        return sameLongByWide(a, b, length);
+#endif
+    return sameLongByNarrow(a, b, length);
+}
+
+ZB_INLINE int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+#if ZB_WIDE_VECTOR_TEXT
+    if (canUse(Vectors::AVX2)) [[likely]]
+        return orderOfLongByWide(a, b, length);
+#endif
+    return orderOfLongByNarrow(a, b, length);
+}
+
 template <class Text>
 ZB_INLINE bool same(char const* a, char const* b, std::uint64_t length) noexcept {
-    if (length > 64) [[unlikely]] {
-#if ZB_WIDE_VECTOR_TEXT
-        if (ZB_HAS_AVX512) [[likely]]
-            return askInWideRuns<Text, AreSame>(a, b, length);
-#endif
-        return sameLongTexts<Text>(a, b, length);
-    }
     if (!Text::readable(a, b, length)) [[unlikely]]
         return sameByRuntime(a, b, length);
+    if (length > 64) [[unlikely]]
+        return sameLongTexts(a, b, length);
     if (length > 16) [[likely]]
         return sameMediumTexts(a, b, length);
     return length == 0 || sameShortTexts(a, b, length);
@@ -56,21 +68,12 @@ ZB_INLINE bool same(char const* a, char const* b, std::uint64_t length) noexcept
 /// The order of texts of which one is likely to end at the length.
 template <class Text>
 ZB_INLINE int order(char const* a, char const* b, std::uint64_t length) noexcept {
-    if (length > 64) [[unlikely]] {
-#if ZB_WIDE_VECTOR_TEXT
-        if (ZB_HAS_AVX512) [[likely]]
-            return askInWideRuns<Text, OrderOf>(a, b, length);
-#endif
-        return orderOfLongTexts<Text>(a, b, length);
-    }
     if (length < 4 || !Text::readable(a, b, length)) [[unlikely]]
         return orderByRuntime(a, b);
+    if (length > 64) [[unlikely]]
+        return orderOfLongTexts(a, b, length);
     if (length <= 16) [[unlikely]]
         return orderOfShortTexts(a, b, length);
-#if ZB_WIDE_VECTOR_TEXT
-    if (ZB_HAS_AVX512) [[likely]]
-        return orderInOneRun(a, b, length);
-#endif
     return orderOfMediumTexts(a, b, length);
 }
 

@@ -1,3 +1,4 @@
+#include "basis/ground/processor.h"
 #include "basis/text/vector_text.h"
 #include "zor_basis/text/char_ops.h"
 #include "zor_basis/text/word_ops.h"
@@ -145,7 +146,7 @@ ZB_INLINE void copyOf(char* target, char const* source, std::uint64_t length) no
         if (copyShort(target, source, length)) return;
     } else {
 #if ZB_WIDE_VECTOR_TEXT
-        if (ZB_HAS_AVX2) [[likely]]
+        if (canUse(Vectors::AVX2)) [[likely]]
             return copyLong<Text>(target, source, length);
 #endif
     }

@@ -163,29 +163,68 @@ ZB_INLINE int orderOfMediumTexts(char const* a, char const* b, std::uint64_t len
     return place == length ? orderAtTheEnd(a + length, b + length) : orderAt(a, b, place);
 }
 
-/// How many bytes can be passed over, as two texts are the same in them, may be read and do not end; at least 1 stays.
-template <class Text>
-std::uint64_t sameFront(char const* a, char const* b, std::uint64_t length) noexcept {
-    constexpr std::uint64_t Run = 64;
-    std::uint64_t done = 0;
-    for (; length - done > Run && Text::readable(a + done, b + done, Run); done += Run) {
-        MediumTexts const texts(a + done, b + done, Run);
-        if (!texts.same() || texts.haveZero()) break;
+/// 64 bytes of two texts side by side. A byte of `open` is zero where the texts differ or end.
+struct NarrowRun {
+    NarrowRun(char const* a, char const* b) noexcept {
+        for (int i = 0; i < 4; ++i) {
+            __m128i const bytes = load16(a + 16 * i);
+            open[i] = _mm_min_epu8(bytes, _mm_cmpeq_epi8(bytes, load16(b + 16 * i)));
+        }
     }
-    return done;
+    __m128i least() const noexcept {
+        return _mm_min_epu8(_mm_min_epu8(open[0], open[1]), _mm_min_epu8(open[2], open[3]));
+    }
+    bool isDecided() const noexcept { return hasZero(least()); }
+    bool isDecidedWith(NarrowRun const& next) const noexcept { return hasZero(_mm_min_epu8(least(), next.least())); }
+    std::uint64_t firstPlace() const noexcept {
+        std::uint64_t const low = zerosIn(open[0]) | zerosIn(open[1]) << 16;
+        std::uint64_t const high = zerosIn(open[2]) | zerosIn(open[3]) << 16;
+        return static_cast<std::uint64_t>(std::countr_zero(low | high << 32));
+    }
+
+    __m128i open[4];
+};
+
+/// The first place at which two texts of more than 64 bytes differ or end; where there is none, the length. Texts that
+/// differ mostly do so early, so their first 64 bytes come alone. Then two runs at a time begin where vectors of the
+/// first text do not cross a line of the cache; the last ones overlap those before.
+template <class Run>
+ZB_INLINE std::uint64_t firstDecided(char const* a, char const* b, std::uint64_t length) noexcept {
+    constexpr std::uint64_t RUN = 64;
+    constexpr std::uint64_t VECTOR = 32;
+    Run const front(a, b);
+    if (front.isDecided()) return front.firstPlace();
+    std::uint64_t at = RUN - reinterpret_cast<std::uintptr_t>(a) % VECTOR;
+    for (; length - at > RUN; at += 2 * RUN) {
+        at = std::min(at, length - 2 * RUN);
+        Run const first(a + at, b + at);
+        Run const second(a + at + RUN, b + at + RUN);
+        if (first.isDecidedWith(second))
+            return first.isDecided() ? at + first.firstPlace() : at + RUN + second.firstPlace();
+        if (length - at == 2 * RUN) return length;
+    }
+    Run const back(a + length - RUN, b + length - RUN);
+    return back.isDecided() ? length - RUN + back.firstPlace() : length;
 }
 
-/// More than 64 bytes, on every processor.
-template <class Text>
-ZB_COLD bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
-    std::uint64_t const front = sameFront<Text>(a, b, length);
-    return sameByRuntime(a + front, b + front, length - front);
+template <class Run>
+ZB_INLINE bool sameLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const place = firstDecided<Run>(a, b, length);
+    return place == length || a[place] == b[place];
 }
 
-template <class Text>
-ZB_COLD int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
-    std::uint64_t const front = sameFront<Text>(a, b, length);
-    return orderByRuntime(a + front, b + front);
+template <class Run>
+ZB_INLINE int orderOfLongTexts(char const* a, char const* b, std::uint64_t length) noexcept {
+    std::uint64_t const place = firstDecided<Run>(a, b, length);
+    return place == length ? orderAtTheEnd(a + length, b + length) : orderAt(a, b, place);
+}
+
+/// More than 64 bytes that may be read, on every processor.
+ZB_COLD inline bool sameLongByNarrow(char const* a, char const* b, std::uint64_t length) noexcept {
+    return sameLongTexts<NarrowRun>(a, b, length);
+}
+ZB_COLD inline int orderOfLongByNarrow(char const* a, char const* b, std::uint64_t length) noexcept {
+    return orderOfLongTexts<NarrowRun>(a, b, length);
 }
 
 #endif

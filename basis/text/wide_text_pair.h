@@ -1,105 +1,48 @@
 /// \file
-/// Two narrow texts side by side in vectors of 64 bytes, for processors with AVX-512BW.
+/// Two narrow texts of more than 64 bytes side by side in vectors of 32 bytes, for processors with AVX2.
 
 #ifndef BASIS_TEXT_WIDE_TEXT_PAIR_H
 #define BASIS_TEXT_WIDE_TEXT_PAIR_H
 
 #include "basis/text/text_pair.h"
 
+#include <bit>
 #include <cstdint>
 
 #if ZB_WIDE_VECTOR_TEXT
 
 namespace ZOR_Basis::detail {
 
-using WidePlaces = Places<std::uint64_t>;
+/// See `NarrowRun`.
+struct WideRun {
+    ZB_AVX2 WideRun(char const* a, char const* b) noexcept : low(openIn(a, b)), high(openIn(a + 32, b + 32)) {}
 
-ZB_AVX512 ZB_INLINE WidePlaces placesOf(__m512i a, __m512i b) noexcept {
-    std::uint64_t const different = _mm512_cmpneq_epi8_mask(a, b);
-    return {different, different | zerosIn(a)};
-}
-
-/// Of 64 bytes.
-ZB_AVX512 ZB_INLINE WidePlaces widePlaces(char const* a, char const* b) noexcept {
-    return placesOf(load64(a), load64(b));
-}
-
-/// Of 1 to 64 bytes, behind which both texts look as if they ended.
-ZB_AVX512 ZB_INLINE WidePlaces widePlaces(char const* a, char const* b, std::uint64_t length) noexcept {
-    return placesOf(loadFirst(a, length), loadFirst(b, length));
-}
-
-/// What two texts are asked: whether they are the same, or for their order. `at` answers where they differ or end.
-struct AreSame {
-    using Answer = bool;
-    static bool at(char const*, char const*, WidePlaces const& places) noexcept { return places.same(); }
-    static bool atTheEnd(char const*, char const*) noexcept { return true; }
-    static bool byRuntime(char const* a, char const* b, std::uint64_t length) noexcept {
-        return sameByRuntime(a, b, length);
+    ZB_AVX2 __m256i least() const noexcept { return _mm256_min_epu8(low, high); }
+    ZB_AVX2 bool isDecided() const noexcept { return hasZero(least()); }
+    ZB_AVX2 bool isDecidedWith(WideRun const& next) const noexcept {
+        return hasZero(_mm256_min_epu8(least(), next.least()));
     }
-};
-struct OrderOf {
-    using Answer = int;
-    static int at(char const* a, char const* b, WidePlaces const& places) noexcept {
-        return orderAt(a, b, places.first());
+    ZB_AVX2 std::uint64_t firstPlace() const noexcept {
+        return static_cast<std::uint64_t>(std::countr_zero(zerosIn(low) | std::uint64_t{zerosIn(high)} << 32));
     }
-    static int atTheEnd(char const* a, char const* b) noexcept { return orderAtTheEnd(a, b); }
-    static int byRuntime(char const* a, char const* b, std::uint64_t) noexcept { return orderByRuntime(a, b); }
-};
 
-/// Two texts of more than 64 bytes. They go in runs of 64, of which the last begins in the one before, with a branch
-/// for each: texts that differ mostly do so early.
-template <class Text, class Question>
-class WideRuns {
-public:
-    ZB_AVX512 ZB_INLINE WideRuns(char const* a, char const* b, std::uint64_t length) noexcept
-        : a_(a), b_(b), length_(length) {}
-
-    /// Whether there is an answer within the length.
-    ZB_AVX512 ZB_INLINE bool areDecided() noexcept {
-        if (isDecidedAt(0)) return true;
-        if (length_ > 128) {
-            if (isDecidedAt(64)) return true;
-            for (std::uint64_t done = 128; length_ - done > 128; done += 64) {
-                if (isDecidedAt(done)) return true;
-            }
-            if (isDecidedAt(length_ - 128)) return true;
-        }
-        return isDecidedAt(length_ - 64);
-    }
-    typename Question::Answer answer() const noexcept { return answer_; }
+    __m256i low;
+    __m256i high;
 
 private:
-    ZB_AVX512 ZB_INLINE bool isDecidedAt(std::uint64_t run) noexcept {
-        char const* const a = a_ + run;
-        char const* const b = b_ + run;
-        if (!Text::readable(a, b, 64)) {
-            answer_ = Question::byRuntime(a_, b_, length_);
-            return true;
-        }
-        WidePlaces const places = widePlaces(a, b);
-        if (places.decided == 0) return false;
-        answer_ = Question::at(a, b, places);
-        return true;
+    ZB_AVX2 static __m256i openIn(char const* a, char const* b) noexcept {
+        __m256i bytes = load32(a);
+        ZB_ONE_LOAD(bytes);
+        return _mm256_min_epu8(bytes, _mm256_cmpeq_epi8(bytes, load32(b)));
     }
-
-    char const* a_;
-    char const* b_;
-    std::uint64_t length_;
-    typename Question::Answer answer_ = {};
 };
 
-/// More than 64 bytes.
-template <class Text, class Question>
-ZB_AVX512 ZB_COLD typename Question::Answer askInWideRuns(char const* a, char const* b, std::uint64_t length) noexcept {
-    WideRuns<Text, Question> runs(a, b, length);
-    return runs.areDecided() ? runs.answer() : Question::atTheEnd(a + length, b + length);
+/// More than 64 bytes that may be read.
+ZB_AVX2 ZB_COLD inline bool sameLongByWide(char const* a, char const* b, std::uint64_t length) noexcept {
+    return sameLongTexts<WideRun>(a, b, length);
 }
-
-/// 1 to 64 bytes that may be read.
-ZB_AVX512 ZB_COLD inline int orderInOneRun(char const* a, char const* b, std::uint64_t length) noexcept {
-    std::uint64_t const place = widePlaces(a, b, length).first();
-    return place < length ? orderAt(a, b, place) : orderAtTheEnd(a + length, b + length);
+ZB_AVX2 ZB_COLD inline int orderOfLongByWide(char const* a, char const* b, std::uint64_t length) noexcept {
+    return orderOfLongTexts<WideRun>(a, b, length);
 }
 
 } // namespace ZOR_Basis::detail

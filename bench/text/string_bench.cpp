@@ -100,15 +100,23 @@ void append(benchmark::State& state, std::size_t count) {
     }
 }
 
-/// Sixteen pairs, equal texts and texts that differ in one place, the same ones for everybody.
+/// Where the texts of a pair differ.
+enum class Difference { NONE, EARLY, LATE };
+
+std::size_t placeOf(Difference difference, std::size_t pair, std::size_t size) {
+    std::size_t const place = pair % std::min<std::size_t>(size, 4);
+    return difference == Difference::EARLY ? place : size - 1 - place;
+}
+
+/// Sixteen pairs, the same ones for everybody.
 template <class String>
 struct Pairs {
     static constexpr std::size_t COUNT = 16;
-    explicit Pairs(std::size_t size) {
+    Pairs(std::size_t size, Difference difference) {
         for (std::size_t i = 0; i < COUNT; ++i) {
             std::string text = makeText(size);
             left[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
-            if (i % 2 == 1) text[(i * 7) % size] = '!';
+            if (difference != Difference::NONE) text[placeOf(difference, i, size)] = '!';
             right[i] = std::make_unique<String>(Maker<String>::make(text.data(), size));
         }
     }
@@ -117,8 +125,8 @@ struct Pairs {
 };
 
 template <class String, class Compare>
-void compare(benchmark::State& state, std::size_t size, Compare compareOne) {
-    Pairs<String> const pairs(size);
+void compare(benchmark::State& state, std::size_t size, Difference difference, Compare compareOne) {
+    Pairs<String> const pairs(size, difference);
     std::size_t i = 0;
     for (auto _ : state) {
         String const* left = pairs.left[i].get();
@@ -157,16 +165,18 @@ void addAppending(std::string const& row, char const* who, std::size_t count) {
 
 template <class String>
 void addComparing(std::string const& kind, char const* who, std::size_t size) {
-    std::string const suffix = kind + "/" + std::to_string(size) + "B";
-    add("equal/" + suffix, who, [size](benchmark::State& state) {
-        compare<String>(state, size, [](String const& a, String const& b) { return a == b; });
-    });
-    add("compare/" + suffix, who, [size](benchmark::State& state) {
-        compare<String>(state, size, [](String const& a, String const& b) { return a.compare(b); });
-    });
-    add("less/" + suffix, who, [size](benchmark::State& state) {
-        compare<String>(state, size, [](String const& a, String const& b) { return a < b; });
-    });
+    for (auto const& [difference, name] : {std::pair{Difference::NONE, "same"}, std::pair{Difference::EARLY, "early"},
+                                           std::pair{Difference::LATE, "late"}}) {
+        std::string const suffix = kind + "/" + std::to_string(size) + "B-" + name;
+        auto const row = [&, where = difference](std::string const& operation, auto compareOne) {
+            add(operation + suffix, who, [size, where, compareOne](benchmark::State& state) {
+                compare<String>(state, size, where, compareOne);
+            });
+        };
+        row("equal/", [](String const& a, String const& b) { return a == b; });
+        row("compare/", [](String const& a, String const& b) { return a.compare(b); });
+        row("less/", [](String const& a, String const& b) { return a < b; });
+    }
 }
 
 bool registerAll() {
@@ -197,7 +207,7 @@ bool registerAll() {
     addAppending<llvm::SmallString<15>>("append/BufStr15/14", "llvm::SmallString", 14);
     addAppending<llvm::SmallString<255>>("append/BufStr255/200", "llvm::SmallString", 200);
 #endif
-    for (std::size_t size : {5U, 14U, 40U, 200U}) {
+    for (std::size_t size : {5U, 14U, 40U, 100U, 200U, 400U}) {
         std::string const kind = size <= 14 ? "BufStr15" : "BufStr255";
         if (size <= 14) {
             addComparing<BufStr<15>>(kind, "ours", size);

@@ -1,7 +1,8 @@
 // The page behind a text is made unreadable here.
 
-#include "basis/text/text_pair.h"
+#include "tests/support/vectors.h"
 #include "tests/text/last_page_posix.h"
+#include "zor_basis/text/word_ops.h"
 
 #include <gtest/gtest.h>
 
@@ -9,18 +10,26 @@
 
 using namespace ZOR_Basis::detail;
 
-TEST(CompareTextWaysPosix, read_no_page_behind_a_terminator) {
+namespace {
+
+struct CompareTextWaysPosix : EachVectors {};
+
+} // namespace
+
+INSTANTIATE_FOR_EACH_VECTORS(CompareTextWaysPosix);
+
+TEST_P(CompareTextWaysPosix, read_no_page_behind_a_terminator) {
     LastPage first;
     LastPage second;
     for (std::size_t size = 1; size < 300; ++size) {
         std::string const text(size, 'x');
         char const* a = first.textAtTheEnd(text);
         char const* b = second.textAtTheEnd(text);
-        for (std::uint64_t claimed : {size + 70, size + 200}) {
-            ASSERT_TRUE(sameLongTexts<GivenPair>(a, b, claimed)) << size;
-            ASSERT_EQ(orderOfLongTexts<GivenPair>(a, b, claimed), 0) << size;
-            ASSERT_FALSE(sameLongTexts<GivenPair>(a, b + 1, claimed)) << size;
-            ASSERT_GT(orderOfLongTexts<GivenPair>(a, b + 1, claimed), 0) << size;
+        for (std::uint64_t claimed : {size + 1, size + 70, size + 200, size + 5000}) {
+            ASSERT_TRUE(sameTexts(a, b, claimed)) << size;
+            ASSERT_EQ(compareTexts(a, claimed, b, claimed), 0) << size;
+            ASSERT_FALSE(sameTexts(a, b + 1, claimed)) << size;
+            ASSERT_GT(compareTexts(a, claimed, b + 1, claimed), 0) << size;
         }
     }
 }

@@ -1,7 +1,8 @@
-// Runs the code for processors without long vectors on every processor.
+// Compares texts of all lengths by each set of vector instructions.
 
-#include "basis/text/text_pair.h"
+#include "tests/support/vectors.h"
 #include "tests/text/naive_order.h"
+#include "zor_basis/text/word_ops.h"
 
 #include <gtest/gtest.h>
 
@@ -11,16 +12,12 @@ using namespace ZOR_Basis::detail;
 
 namespace {
 
-constexpr std::size_t LONGEST_MEDIUM = 64;
+struct CompareTextWays : EachVectors {};
 
-bool same(std::string const& a, std::string const& b) {
-    return a.size() <= LONGEST_MEDIUM ? sameMediumTexts(a.data(), b.data(), a.size())
-                                      : sameLongTexts<OwnedPair>(a.data(), b.data(), a.size());
-}
+bool same(std::string const& a, std::string const& b) { return sameOwnedTexts(a.data(), b.data(), a.size()); }
 
 int order(std::string const& a, std::string const& b) {
-    return signOf(a.size() <= LONGEST_MEDIUM ? orderOfMediumTexts(a.data(), b.data(), a.size())
-                                             : orderOfLongTexts<OwnedPair>(a.data(), b.data(), a.size()));
+    return signOf(compareOwnedTexts(a.data(), b.data(), a.size()));
 }
 
 std::string makeText(std::size_t size) {
@@ -31,8 +28,10 @@ std::string makeText(std::size_t size) {
 
 } // namespace
 
-TEST(CompareTextWays, find_a_difference_at_every_place) {
-    for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
+INSTANTIATE_FOR_EACH_VECTORS(CompareTextWays);
+
+TEST_P(CompareTextWays, find_a_difference_at_every_place) {
+    for (std::size_t size = 1; size < 300; size += size < 70 ? 1 : 7) {
         std::string const a = makeText(size);
         ASSERT_TRUE(same(a, a)) << size;
         ASSERT_EQ(order(a, a), 0) << size;
@@ -46,8 +45,8 @@ TEST(CompareTextWays, find_a_difference_at_every_place) {
     }
 }
 
-TEST(CompareTextWays, look_no_further_than_a_common_zero) {
-    for (std::size_t size = 17; size < 300; size += size < 70 ? 1 : 7) {
+TEST_P(CompareTextWays, look_no_further_than_a_common_zero) {
+    for (std::size_t size = 1; size < 300; size += size < 70 ? 1 : 7) {
         for (std::size_t zero = 0; zero < size; ++zero) {
             std::string a = makeText(size);
             a[zero] = '\0';
@@ -62,13 +61,11 @@ TEST(CompareTextWays, look_no_further_than_a_common_zero) {
     }
 }
 
-TEST(CompareTextWays, go_on_behind_the_length_for_the_order_only) {
+TEST_P(CompareTextWays, go_on_behind_the_length_for_the_order_only) {
     for (std::size_t size : {17U, 40U, 64U, 65U, 128U, 129U, 200U}) {
         std::string const a = makeText(size) + "1";
         std::string const b = makeText(size) + "2";
-        bool const isLong = size > LONGEST_MEDIUM;
-        EXPECT_TRUE((isLong ? sameLongTexts<OwnedPair> : sameMediumTexts)(a.data(), b.data(), size)) << size;
-        EXPECT_EQ(signOf((isLong ? orderOfLongTexts<OwnedPair> : orderOfMediumTexts)(a.data(), b.data(), size)), -1)
-            << size;
+        EXPECT_TRUE(sameOwnedTexts(a.data(), b.data(), size)) << size;
+        EXPECT_EQ(signOf(compareOwnedTexts(a.data(), b.data(), size)), -1) << size;
     }
 }

@@ -10,7 +10,6 @@
 
 #include <algorithm>
 #include <array>
-#include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
@@ -53,18 +52,6 @@ struct Output {
     std::basic_string<Char> text(std::uint64_t size) const { return {units.data(), size}; }
     std::vector<Char> units;
 };
-
-/// One of the ways in which processors convert.
-template <class Function>
-struct Way {
-    char const* name;
-    Function* convert;
-};
-
-template <class Function>
-void PrintTo(Way<Function> const& way, std::ostream* out) {
-    *out << way.name;
-}
 
 inline std::uint64_t someRoom(Source& source, std::uint64_t needed) {
     std::uint64_t const around = upTo(source, 2 * 20);

@@ -28,16 +28,26 @@
 #endif
 
 /// `ZB_INLINE`: into every caller, also at low optimisation. `ZB_COLD`: never into a caller. `ZB_HIDE(pointer)`: from
-/// here on the compiler does not know what the pointer points to; only where `ZB_CAN_HIDE` is 1.
+/// here on the compiler does not know what the pointer points to; only where `ZB_CAN_HIDE` is 1. `ZB_ONE_LOAD(vector)`:
+/// the compiler keeps what it has loaded, and does not load it again for each use.
 #if defined(__GNUC__)
 #define ZB_INLINE [[gnu::always_inline]] inline
 #define ZB_COLD [[gnu::noinline]]
 #define ZB_CAN_HIDE 1
 #define ZB_HIDE(pointer) __asm__("" : "+r"(pointer))
+#define ZB_ONE_LOAD(vector) __asm__("" : "+x"(vector))
 #else
 #define ZB_INLINE inline
 #define ZB_COLD
 #define ZB_CAN_HIDE 0
+#define ZB_ONE_LOAD(vector)
+#endif
+
+/// Before a variable of the library that other files of it use: it lies at a known distance from their code.
+#if defined(__ELF__)
+#define ZB_HIDDEN [[gnu::visibility("hidden")]]
+#else
+#define ZB_HIDDEN
 #endif
 
 /// Before a function that reads on purpose what no object owns.
@@ -51,17 +61,13 @@
 #if defined(__GNUC__) && ZB_VECTORS
 #define ZB_SSSE3 [[gnu::target("ssse3")]]
 #define ZB_AVX2 [[gnu::target("avx2")]]
-#define ZB_AVX512 [[gnu::target("avx512bw")]]
 #define ZB_HAS_SSSE3 (__builtin_cpu_supports("ssse3") != 0)
 #define ZB_HAS_AVX2 (__builtin_cpu_supports("avx2") != 0)
-#define ZB_HAS_AVX512 (__builtin_cpu_supports("avx512bw") != 0)
 #else
 #define ZB_SSSE3
 #define ZB_AVX2
-#define ZB_AVX512
 #define ZB_HAS_SSSE3 false
 #define ZB_HAS_AVX2 false
-#define ZB_HAS_AVX512 false
 #endif
 
 #endif
