@@ -7,7 +7,7 @@ endif()
 option(ZB_SPLIT_DEBUG_SYMBOLS "Keep debug symbols in a file beside each library" OFF)
 
 # zb_shared_library(<target> IMAGE_BASE <address> DESCRIPTION <text>): settings common to all our shared libraries.
-# The exported names are those that carry an export macro in their headers; on Windows additionally only those of
+# The exported names are those that carry an export macro in their headers; with mingw-w64 those of
 # cmake/exports/<target>.def, on ELF only those that the version script cmake/exports/<target>.map lets through.
 function(zb_shared_library target)
   cmake_parse_arguments(ARG "" "IMAGE_BASE;DESCRIPTION" "" ${ARGN})
@@ -16,10 +16,12 @@ function(zb_shared_library target)
     set(ZB_RC_NAME ${target})
     set(ZB_RC_DESCRIPTION "${ARG_DESCRIPTION}")
     configure_file(${PROJECT_SOURCE_DIR}/cmake/windows/version.rc.in ${CMAKE_CURRENT_BINARY_DIR}/${target}.rc @ONLY)
-    target_sources(${target} PRIVATE ${CMAKE_CURRENT_BINARY_DIR}/${target}.rc ${exports}.def
+    target_sources(${target} PRIVATE ${CMAKE_CURRENT_BINARY_DIR}/${target}.rc
       ${PROJECT_SOURCE_DIR}/cmake/windows/pin_module.cpp)
-    set_target_properties(${target} PROPERTIES PREFIX "" LINK_DEPENDS ${exports}.def)
-    if(MINGW)
+    set_target_properties(${target} PROPERTIES PREFIX "")
+    if(MINGW) # the list contains names as only its compiler writes them
+      target_sources(${target} PRIVATE ${exports}.def)
+      set_target_properties(${target} PROPERTIES LINK_DEPENDS ${exports}.def)
       target_link_options(${target} PRIVATE -Wl,--image-base=${ARG_IMAGE_BASE})
     endif()
   else()

@@ -8,11 +8,12 @@ Benchmarks are named `row/who`, where who is `ours` or a peer. bench/FAMILY/goal
 
 Repetitions of all rows are interleaved; the median counts. Ties by noise: 10 %, rows under 5 ns 30 %, rows that name
 two or more threads 50 %. A row that misses its goal is measured again in two fresh processes, and the median of the
-three ratios counts. Exits with 1 where a goal is missed.
+three ratios counts. Ends with how noisy the run was. Exits with 1 where a goal is missed.
 """
 
 import fnmatch
 import json
+import os
 import re
 import statistics
 import subprocess
@@ -108,7 +109,7 @@ def judge_again(program, rows, goals, ratios):
 
 
 def report(family, rows, goals, ratios):
-    print(f"\n{family}: ns, medians of interleaved repetitions, ± their coefficient of variation")
+    print(f"{family}: ns, medians of interleaved repetitions, ± their coefficient of variation")
     verdicts = []
     for row, times in sorted(rows.items()):
         cells = "  ".join(f"{who} {time:.4g} ±{spread:.0%}" for who, (time, spread) in sorted(times.items()))
@@ -125,6 +126,14 @@ def report(family, rows, goals, ratios):
     return verdicts
 
 
+def noise(spreads):
+    """How much the rows' repetitions varied, in one line."""
+    ordered = sorted(spreads)
+    level = lambda part: f"{ordered[min(int(part * len(ordered)), len(ordered) - 1)]:.0%}"
+    return (f"noise: repetitions vary by {level(0.5)} in the middle row, by more than {level(0.9)} in one row of ten, "
+            f"by {level(1)} at most; {os.getloadavg()[0]:.1f} programs run on {os.cpu_count()} processors")
+
+
 def main():
     folder, families = Path(sys.argv[1]), sys.argv[2:]
     programs = sorted(p for p in folder.glob("bench_*") if p.suffix == "")
@@ -132,14 +141,17 @@ def main():
     if not chosen:
         sys.exit(f"no such family; there are: {' '.join(p.name.removeprefix('bench_') for p in programs)}")
     print(processor())
-    verdicts = []
+    verdicts, spreads = [], []
     for program in chosen:
         family = program.name.removeprefix("bench_")
+        print(f"\nmeasuring {family}", flush=True)
         goals, rows = read_goals(family), measure(program)
         ratios = judge(rows, goals)
         judge_again(program, rows, goals, ratios)
         verdicts += report(family, rows, goals, ratios)
-    print(f"\n{verdicts.count('met')} goals met, {verdicts.count('tie')} ties, {verdicts.count('MISSED')} missed")
+        spreads += [spread for times in rows.values() for _, spread in times.values()]
+    print(f"\n{noise(spreads)}")
+    print(f"{verdicts.count('met')} goals met, {verdicts.count('tie')} ties, {verdicts.count('MISSED')} missed")
     sys.exit(1 if "MISSED" in verdicts else 0)
 
 

@@ -39,6 +39,28 @@
 #define ZB_API_STRAIGHT ZB_API
 #endif
 
+/// Around exported classes whose parts are not exported. Such a part consists of inline functions, so a program takes
+/// nothing of it from the library; MSVC would warn each program of it (C4251, C4275).
+#if defined(_MSC_VER)
+#define ZB_INLINE_PARTS_BEGIN __pragma(warning(push)) __pragma(warning(disable : 4251 4275))
+#define ZB_INLINE_PARTS_END __pragma(warning(pop))
+#else
+#define ZB_INLINE_PARTS_BEGIN
+#define ZB_INLINE_PARTS_END
+#endif
+
+/// Declares two virtual functions of one name, in the order of their slots: MSVC numbers them from the last to the
+/// first, all other compilers from the first to the last.
+#if defined(_MSC_VER)
+#define ZB_OVERLOADED_SLOTS(first, second)                                                                             \
+    second;                                                                                                            \
+    first
+#else
+#define ZB_OVERLOADED_SLOTS(first, second)                                                                             \
+    first;                                                                                                             \
+    second
+#endif
+
 /// C linkage, for functions that C can call.
 #ifdef __cplusplus
 #define ZB_EXTERN_C extern "C"

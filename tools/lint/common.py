@@ -1,7 +1,9 @@
 """What the checkers share: the list of files, running commands, and the OK or FAIL at the end."""
 
+import json
 import subprocess
 import sys
+import threading
 from concurrent.futures import ThreadPoolExecutor
 from pathlib import Path
 
@@ -27,6 +29,21 @@ def in_parallel(function, items):
     """The results of function over items, on two threads, in order."""
     with ThreadPoolExecutor(max_workers=2) as pool:
         return list(pool.map(function, items))
+
+
+class CleanFiles:
+    """The state in which each file was clean, kept in a JSON file from run to run, also of one that is broken off."""
+
+    def __init__(self, path):
+        self.path = path
+        self.known = json.loads(path.read_text()) if path.exists() and "--all" not in sys.argv else {}
+        self.lock = threading.Lock()
+
+    def note(self, name, state):
+        with self.lock:
+            self.known[name] = state
+            self.path.parent.mkdir(parents=True, exist_ok=True)
+            self.path.write_text(json.dumps(self.known))
 
 
 def finish(name, problems, checked):

@@ -8,14 +8,11 @@ command or the checks do; --all reads every file.
 import hashlib
 import json
 import os
-import sys
-import threading
 from pathlib import Path
 
 import common
 
 BUILD = common.ROOT / "build/linux"
-CLEAN = BUILD / "tidy-clean.json"
 ROOMS = ("basis", "host", "examples")
 
 
@@ -47,19 +44,6 @@ def state(path, command, headers):
     return hashlib.sha256(b"\0".join(parts)).hexdigest()
 
 
-class CleanFiles:
-    """The state in which each file was clean, kept from run to run, also of one that is broken off."""
-
-    def __init__(self, known):
-        self.known = known
-        self.lock = threading.Lock()
-
-    def note(self, path, found):
-        with self.lock:
-            self.known[path] = found
-            CLEAN.write_text(json.dumps(self.known))
-
-
 def check(path):
     result = common.run("clang-tidy", "-p", BUILD, "--quiet", "--extra-arg=-Wno-unknown-warning-option", path)
     if result.returncode:
@@ -70,7 +54,7 @@ def check(path):
 
 headers = included()
 states = {path: state(path, command, headers) for path, command in sources().items()}
-clean = CleanFiles({} if "--all" in sys.argv or not CLEAN.exists() else json.loads(CLEAN.read_text()))
+clean = common.CleanFiles(BUILD / "tidy-clean.json")
 changed = sorted(path for path in states if states[path] is None or clean.known.get(path) != states[path])
 problems = [text for text in common.in_parallel(check, changed) if text]
 common.finish("tidy", problems, len(changed))

@@ -58,14 +58,17 @@
 #endif
 
 /// Targets, and whether the processor has them.
-#if defined(__GNUC__) && ZB_VECTORS
+#if (defined(__GNUC__) || defined(__clang__)) && ZB_VECTORS
 #define ZB_SSSE3 [[gnu::target("ssse3")]]
 #define ZB_AVX2 [[gnu::target("avx2")]]
-#define ZB_HAS_SSSE3 (__builtin_cpu_supports("ssse3") != 0)
-#define ZB_HAS_AVX2 (__builtin_cpu_supports("avx2") != 0)
 #else
 #define ZB_SSSE3
 #define ZB_AVX2
+#endif
+#if defined(__GNUC__) && ZB_VECTORS
+#define ZB_HAS_SSSE3 (__builtin_cpu_supports("ssse3") != 0)
+#define ZB_HAS_AVX2 (__builtin_cpu_supports("avx2") != 0)
+#else
 #define ZB_HAS_SSSE3 false
 #define ZB_HAS_AVX2 false
 #endif

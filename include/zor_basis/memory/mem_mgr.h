@@ -31,11 +31,9 @@ public:
     MemMgr(MemMgr const&) = delete;
     MemMgr& operator=(MemMgr const&) = delete;
 
-    virtual void* alloc(std::uint64_t size);
-    /// Allocates one element of the manager's fixed size, if it has one.
-    virtual void* alloc();
-    virtual void free(void* p, std::uint64_t size);
-    virtual void free(void* p);
+    /// Without a size: allocates one element of the manager's fixed size, if it has one.
+    ZB_OVERLOADED_SLOTS(virtual void* alloc(std::uint64_t size), virtual void* alloc());
+    ZB_OVERLOADED_SLOTS(virtual void free(void* p, std::uint64_t size), virtual void free(void* p));
     /// Releases all memory that the manager has allocated, freed by the user or not.
     virtual ~MemMgr();
 

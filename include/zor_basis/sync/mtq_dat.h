@@ -24,6 +24,7 @@ public:
     virtual ~MTQ_Arg();
 };
 
+ZB_INLINE_PARTS_BEGIN
 /// The queue makes and owns it. All queries are allowed while the job runs.
 ///
 /// \thread thread-safe, as long as the queue keeps it
@@ -88,6 +89,7 @@ private:
     std::atomic<bool> starting_{false};
     Task const run_;
 };
+ZB_INLINE_PARTS_END
 
 } // namespace ZOR_Basis
 

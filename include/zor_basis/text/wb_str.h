@@ -29,6 +29,7 @@ namespace ZOR_Basis {
 class WBStr;
 ZB_EXTERN_TEMPLATE detail::InlineText<WBStr, WChar, 255>;
 
+ZB_INLINE_PARTS_BEGIN
 class ZB_API WBStr : public WStr {
     using Text = detail::InlineText<WBStr, WChar, 255>;
     friend Text;
@@ -182,6 +183,7 @@ private:
 
     detail::TextArea<WChar, 255> area_;
 };
+ZB_INLINE_PARTS_END
 
 #if defined(__GNUC__)
 #pragma GCC diagnostic pop

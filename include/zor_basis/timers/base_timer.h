@@ -25,6 +25,7 @@ namespace ZOR_Basis {
 
 class PileTimer;
 
+ZB_INLINE_PARTS_BEGIN
 /// Has the same memory layout as its base, the record.
 class ZB_API BaseTimer : public zbTimerDat {
 public:
@@ -75,6 +76,7 @@ protected:
     /// Ticks per second.
     static std::int64_t _freq;
 };
+ZB_INLINE_PARTS_END
 
 static_assert(sizeof(BaseTimer) == 32 && !std::is_polymorphic_v<BaseTimer>);
 

@@ -51,6 +51,7 @@ private:
 
 } // namespace detail
 
+ZB_INLINE_PARTS_BEGIN
 class ZB_API PileTimer : public BaseTimer {
 public:
     /// \param name  is copied; null counts as the empty name
@@ -136,6 +137,7 @@ protected:
     bool checks_;
     HeapStr name_;
 };
+ZB_INLINE_PARTS_END
 
 } // namespace ZOR_Basis
 

@@ -36,6 +36,7 @@ namespace ZOR_Basis {
 class PileTimer;
 class TimerMgrMgr;
 
+ZB_INLINE_PARTS_BEGIN
 class ZB_API TimerMgr {
 public:
     TimerMgr(TimerMgr const&) = delete;
@@ -168,6 +169,7 @@ private:
 
     std::atomic<bool> active_{false};
 };
+ZB_INLINE_PARTS_END
 
 } // namespace ZOR_Basis
 
