@@ -26,18 +26,19 @@ GOAL = re.compile(r"^(\S+)\s*<=\s*([\d.]+)\s*x\s*(?:min\(([^)]*)\)|(\S+))$")
 SUFFIX = re.compile(r"/(?:manual_time|real_time|process_time|iterations:\d+|threads:\d+|repeats:\d+|min_time:[\d.]+)"
                     r"|/\d+$")
 NANOSECONDS = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}
-LEVELS = ("sse2", "ssse3", "avx2", "avx512bw")
+LEVELS = ("sse2", "ssse3", "avx2")  # those that kernels choose from
+LEVELS_WITH_GOALS = ("ssse3", "avx2")
 FRESH_PROCESSES = 2
 
 
 def processor():
-    """The processor's name and the levels that kernels choose from."""
+    """The processor's name, and those of the levels that it has."""
     facts = {}
     for line in Path("/proc/cpuinfo").read_text().splitlines():
         name, _, value = line.partition(":")
         facts.setdefault(name.strip(), value.strip())
     levels = [level for level in LEVELS if level in facts["flags"].split()]
-    return f"{facts['model name']}, family {facts['cpu family']} model {facts['model']}: {', '.join(levels)}"
+    return f"{facts['model name']}, family {facts['cpu family']} model {facts['model']}", levels
 
 
 def read_goals(family):
@@ -53,15 +54,16 @@ def read_goals(family):
     return goals
 
 
-def measure(program, wanted=()):
+def measure(program, wanted=(), level=None):
     """{row: {who: (median in ns, coefficient of variation)}} of one process; all rows unless some are wanted."""
+    environment = dict(os.environ, BENCH_VECTORS=level) if level else None
     output = program.parent / f"{program.name}.json"
     command = [program, "--benchmark_enable_random_interleaving=true", "--benchmark_repetitions=9",
                "--benchmark_min_time=0.05", "--benchmark_report_aggregates_only=true",
                f"--benchmark_out={output}", "--benchmark_out_format=json"]
     if wanted:
         command.append(f"--benchmark_filter=^({'|'.join(map(re.escape, wanted))})/")
-    subprocess.run([str(c) for c in command], check=True, stdout=subprocess.DEVNULL)
+    subprocess.run([str(c) for c in command], check=True, stdout=subprocess.DEVNULL, env=environment)
     rows = {}
     for entry in json.loads(output.read_text())["benchmarks"]:
         row, who = SUFFIX.sub("", entry["run_name"]).rsplit("/", 1)
@@ -97,19 +99,19 @@ def judge(rows, goals):
             for number, (glob, _, peers) in enumerate(goals) if fnmatch.fnmatchcase(row, glob) and "ours" in times}
 
 
-def judge_again(program, rows, goals, ratios):
+def judge_again(program, rows, goals, ratios, level):
     """Replaces the ratios of missed rows by the median of several processes."""
     missed = [key for key, ratio in ratios.items() if ratio is not None
               and verdict(key[0], ratio, goals[key[1]][1], rows[key[0]]["ours"][0]) == "MISSED"]
     if not missed:
         return
     names = sorted({row for row, _ in missed})
-    runs = [ratios, *(judge(measure(program, names), goals) for _ in range(FRESH_PROCESSES))]
+    runs = [ratios, *(judge(measure(program, names, level), goals) for _ in range(FRESH_PROCESSES))]
     ratios.update({key: statistics.median(run[key] for run in runs) for key in missed})
 
 
-def report(family, rows, goals, ratios):
-    print(f"{family}: ns, medians of interleaved repetitions, ± their coefficient of variation")
+def report(title, rows, goals, ratios):
+    print(f"{title}: ns, medians of interleaved repetitions, ± their coefficient of variation")
     verdicts = []
     for row, times in sorted(rows.items()):
         cells = "  ".join(f"{who} {time:.4g} ±{spread:.0%}" for who, (time, spread) in sorted(times.items()))
@@ -134,21 +136,33 @@ def noise(spreads):
             f"by {level(1)} at most; {os.getloadavg()[0]:.1f} programs run on {os.cpu_count()} processors")
 
 
+def runs_of(programs, levels):
+    """(program, family, level to force or None) of each run."""
+    for program in programs:
+        family = program.name.removeprefix("bench_")
+        yield program, family, None
+        lower = program.with_name(f"levels_{family}")
+        if lower.exists():
+            yield from ((lower, family, level) for level in reversed(levels[:-1]))
+
+
 def main():
     folder, families = Path(sys.argv[1]), sys.argv[2:]
     programs = sorted(p for p in folder.glob("bench_*") if p.suffix == "")
     chosen = [p for p in programs if not families or p.name.removeprefix("bench_") in families]
     if not chosen:
         sys.exit(f"no such family; there are: {' '.join(p.name.removeprefix('bench_') for p in programs)}")
-    print(processor())
+    name, levels = processor()
+    print(f"{name}: {', '.join(levels)}")
     verdicts, spreads = [], []
-    for program in chosen:
-        family = program.name.removeprefix("bench_")
-        print(f"\nmeasuring {family}", flush=True)
-        goals, rows = read_goals(family), measure(program)
+    for program, family, level in runs_of(chosen, levels):
+        title = f"{family} at level {level}" if level else f"{family} at level {levels[-1]}"
+        print(f"\nmeasuring {title}", flush=True)
+        goals = read_goals(family) if level in (None, *LEVELS_WITH_GOALS) else []
+        rows = measure(program, level=level)
         ratios = judge(rows, goals)
-        judge_again(program, rows, goals, ratios)
-        verdicts += report(family, rows, goals, ratios)
+        judge_again(program, rows, goals, ratios, level)
+        verdicts += report(title, rows, goals, ratios)
         spreads += [spread for times in rows.values() for _, spread in times.values()]
     print(f"\n{noise(spreads)}")
     print(f"{verdicts.count('met')} goals met, {verdicts.count('tie')} ties, {verdicts.count('MISSED')} missed")
