@@ -85,8 +85,10 @@ ChildResult run(Child const& child) {
     SetHandleInformation(readEnd, HANDLE_FLAG_INHERIT, 0);
     PROCESS_INFORMATION process{};
     bool const started = start(child, writeEnd, process);
+    DWORD const reason = GetLastError();
     CloseHandle(writeEnd);
     ChildResult result;
+    if (!started) result.output = "not started, error " + std::to_string(reason);
     if (started) {
         result.output = readAll(readEnd);
         WaitForSingleObject(process.hProcess, INFINITE);
