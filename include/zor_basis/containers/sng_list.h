@@ -295,7 +295,7 @@ protected:
     /// @}
 
 private:
-    /// Notes that callers may hold units now. The members that take an iterator to a unit need not: `begin` has done so.
+    /// Notes that callers may hold units now. Members that take an iterator to a unit need not: `begin` has done so.
     Unit* exposed(Unit* unit) const {
         count_.noteExposure();
         return unit;
