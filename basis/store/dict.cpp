@@ -8,6 +8,8 @@
 #include "zor_basis/files/file.h"
 
 #include <cstring>
+#include <new>
+#include <utility>
 
 namespace ZOR_Basis {
 namespace {
@@ -16,8 +18,11 @@ constexpr int LOAD = File::FILE_READ | File::FILE_BINARY | File::FILE_SEQUENTIAL
 constexpr int SAVE = File::FILE_WRITE | File::FILE_TRUNC | File::FILE_BINARY | File::FILE_SEQUENTIAL;
 constexpr int SAVE_BESIDE = SAVE | File::FILE_NOCREATEFLAG;
 
-bool isValue(Blob const& blob, RecordBytes bytes) {
-    return blob.size() == bytes.size && (bytes.size == 0 || std::memcmp(blob.val(), bytes.place, bytes.size) == 0);
+/// Small dictionaries are searched at least as fast as their index.
+constexpr std::uint64_t FEWEST_INDEXED = 16;
+
+bool isSame(Blob const& blob, std::uint64_t size, char const* bytes) {
+    return blob.size() == size && (size == 0 || std::memcmp(blob.val(), bytes, size) == 0);
 }
 
 /// The size of a file according to the system; 0 if the system does not report one.
@@ -31,27 +36,6 @@ bool isWhole(RecordReader const& records, char const* path) {
     return records.position() == records.arrived() && records.arrived() >= sizeOf(path);
 }
 
-/// Puts the records into an empty list.
-void load(RecordReader& records, SngList<DictEntry<Blob, Blob>>& list) {
-    using Entry = DictEntry<Blob, Blob>;
-    using Unit = SngList<Entry>::Unit;
-    Blob const empty;
-    DictIndex index;
-    while (records.next()) {
-        RecordBytes const key = records.key();
-        RecordBytes const value = records.value();
-        Entry* entry = index.find(key);
-        if (entry == nullptr) {
-            // kept dict-03: the steps of storing a key put each before the others.
-            list.insertFront(new Unit{nullptr, Entry(empty)});
-            entry = &list.first()->value;
-            entry->key.copy(key.size, key.place);
-            index.add(entry);
-        }
-        if (!isValue(entry->value, value)) entry->value.copy(value.size, value.place);
-    }
-}
-
 } // namespace
 
 template <class K, class V>
@@ -60,11 +44,53 @@ Dict<K, V>::Dict(Str const& path) : path_(path), modified_(true) {
 }
 
 template <class K, class V>
-typename Dict<K, V>::Entry* Dict<K, V>::find(K const& key) const {
-    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
-        if (unit->value.eq(key)) return &unit->value;
+Dict<K, V>::~Dict() {
+    dropIndex();
+}
+
+template <class K, class V>
+typename Dict<K, V>::Entry* Dict<K, V>::find(std::uint64_t size, char const* key) const {
+    if (index() == nullptr && this->size() >= FEWEST_INDEXED) makeIndex();
+    if (index_ != nullptr) return index_->find(size, key);
+    for (Unit* unit = this->head(); unit != nullptr; unit = unit->next) {
+        if (isSame(unit->value.key, size, key)) return &unit->value;
     }
     return nullptr;
+}
+
+/// The index, if there is one. Ends one that callers may have made wrong.
+template <class K, class V>
+DictIndex* Dict<K, V>::index() const {
+    // Nothing that callers hold leads to a later entry of a list that is empty now.
+    if (this->head() == nullptr) this->unitCount().endExposure();
+    if (this->head() == nullptr || this->unitCount().isExposed) dropIndex();
+    return index_;
+}
+
+template <class K, class V>
+void Dict<K, V>::makeIndex() const {
+    if (this->unitCount().isExposed) return;
+    index_ = new (std::nothrow) DictIndex;
+    for (Unit* unit = this->head(); unit != nullptr && index_ != nullptr; unit = unit->next) {
+        if (!index_->add(&unit->value)) dropIndex();
+    }
+}
+
+template <class K, class V>
+void Dict<K, V>::dropIndex() const {
+    delete std::exchange(index_, nullptr);
+}
+
+template <class K, class V>
+void Dict<K, V>::add(Unit* unit) {
+    this->linkFront(unit);
+    if (index() != nullptr && !index_->add(&unit->value)) dropIndex();
+}
+
+template <class K, class V>
+void Dict<K, V>::drop(Unit* previous, Unit* unit) {
+    if (index() != nullptr) index_->remove(&unit->value);
+    delete this->unlink(previous, unit);
 }
 
 template <class K, class V>
@@ -80,7 +106,7 @@ void Dict<K, V>::set(K const& key, V const& value) {
     modified_ = true;
     Entry* const entry = find(key);
     if (entry == nullptr) {
-        this->insertFront(new typename SngList<Entry>::Unit{nullptr, Entry(key, value)});
+        add(new Unit{nullptr, Entry(key, value)});
     } else if (entry->value == value) {
         // kept dict-01: callers that store the same value repeatedly do not write the file because of it.
         modified_ = false;
@@ -91,17 +117,18 @@ void Dict<K, V>::set(K const& key, V const& value) {
 
 template <class K, class V>
 void Dict<K, V>::rm(K const& key) {
-    for (auto at = this->begin(); at != this->end(); ++at) {
-        if (!at->eq(key)) continue;
-        this->remove(at);
-        modified_ = true;
-        return;
-    }
+    Entry const* const entry = find(key);
+    if (entry == nullptr) return;
+    Unit* previous = nullptr;
+    Unit* unit = this->head();
+    while (&unit->value != entry) previous = std::exchange(unit, unit->next);
+    drop(previous, unit);
+    modified_ = true;
 }
 
 template <class K, class V>
 void Dict<K, V>::clean() {
-    if (this->first() == nullptr) return;
+    if (this->head() == nullptr) return;
     modified_ = true;
     this->clear();
 }
@@ -109,12 +136,34 @@ void Dict<K, V>::clean() {
 template <class K, class V>
 void Dict<K, V>::intersect(Dict const& other) {
     // kept dict-02: the remaining entries are a temporary view; the file keeps the others.
-    for (auto at = this->begin(); at != this->end();) {
-        if (other.find(at->key) == nullptr) {
-            this->remove(at);
+    Unit* previous = nullptr;
+    for (Unit* unit = this->head(); unit != nullptr;) {
+        Unit* const next = unit->next;
+        if (other.find(unit->value.key) == nullptr) {
+            drop(previous, unit);
         } else {
-            ++at;
+            previous = unit;
         }
+        unit = next;
+    }
+}
+
+/// Stores every record, each by the steps of storing a key.
+template <class K, class V>
+void Dict<K, V>::load(RecordReader& records) {
+    K const empty;
+    while (records.next()) {
+        RecordBytes const key = records.key();
+        RecordBytes const value = records.value();
+        Entry* entry = find(key.size, key.place);
+        if (entry == nullptr) {
+            // kept dict-03: a new key goes to the front.
+            Unit* const unit = new Unit{nullptr, Entry(empty)};
+            entry = &unit->value;
+            entry->key.copy(key.size, key.place);
+            add(unit);
+        }
+        if (!isSame(entry->value, value.size, value.place)) entry->value.copy(value.size, value.place);
     }
 }
 
@@ -129,7 +178,7 @@ bool Dict<K, V>::read() {
         return false;
     }
     RecordReader records(*file.ptr());
-    load(records, *this);
+    load(records);
     found_ = isWhole(records, path_) ? DICT_WHOLE : DICT_PART;
     understood_ = records.position();
     modified_ = false;
@@ -139,7 +188,7 @@ bool Dict<K, V>::read() {
 template <class K, class V>
 bool Dict<K, V>::put(IFile& file) const {
     RecordWriter records(file);
-    for (auto* unit = this->first(); unit != nullptr; unit = unit->next) {
+    for (Unit* unit = this->head(); unit != nullptr; unit = unit->next) {
         if (!records.add(unit->value.key) || !records.add(unit->value.value)) return false;
     }
     return records.finish();

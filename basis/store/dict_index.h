@@ -1,40 +1,49 @@
 /// \file
-/// A passing hash table over the units of a list of entries: a file with many keys loads in linear time.
+/// `DictIndex`: a hash table over the entries of a dictionary, so that a key is found without a search of the list.
 
 #ifndef BASIS_STORE_DICT_INDEX_H
 #define BASIS_STORE_DICT_INDEX_H
 
-#include "basis/store/dict_records.h"
 #include "zor_basis/store/dict_entry.h"
 
 #include <cstdint>
-#include <vector>
+#include <cstdlib>
+#include <memory>
 
 namespace ZOR_Basis {
 
+/// Entries are borrowed; their keys are distinct and do not change while they are in the table.
 class DictIndex {
 public:
     using Entry = DictEntry<Blob, Blob>;
 
-    /// The entry of a key; null if it has none yet, and then the caller makes it and calls `add`.
-    Entry* find(RecordBytes key);
-    /// Takes the entry of the key that `find` has just not found.
-    void add(Entry* entry);
+    /// \return null if the table does not have the key
+    Entry* find(std::uint64_t size, char const* key) const;
+    /// \return false, with nothing changed, if memory is short
+    bool add(Entry* entry);
+    /// \pre the table has the entry
+    void remove(Entry const* entry);
 
 private:
-    /// Small, as the table is what the processor's cache has to hold. There are fewer than 2^32 entries in any memory.
+    /// A slot without an entry is free.
     struct Slot {
+        Entry* entry;
         std::uint32_t hash;
-        std::uint32_t number; // of the entry, from 1; 0: free
+    };
+    struct Release {
+        void operator()(Slot* slots) const { std::free(slots); }
     };
 
-    void grow();
-    Slot& freeSlot(std::uint32_t hash);
+    std::uint64_t next(std::uint64_t at) const { return (at + 1) & mask_; }
+    /// How far a slot is behind another one, in the order of a search.
+    std::uint64_t distance(std::uint64_t from, std::uint64_t to) const { return (to - from) & mask_; }
+    void put(Slot slot);
+    bool grow();
 
-    std::vector<Slot> slots_;
-    std::vector<Entry*> entries_;
-    std::uint64_t mask_ = 0;
-    std::uint32_t hash_ = 0; // of the key that was asked for last
+    std::unique_ptr<Slot[], Release> slots_;
+    std::uint64_t mask_ = 0;  // the number of slots, less one
+    std::uint64_t limit_ = 0; // the number of entries that the table may have
+    std::uint64_t count_ = 0;
 };
 
 } // namespace ZOR_Basis

@@ -65,6 +65,15 @@ void saveMap(Map const& map) {
     }
 }
 
+Map loadMap() {
+    std::ifstream file(dictPath(), std::ios::binary);
+    Map loaded;
+    std::string key;
+    std::string value;
+    while (readField(file, key) && readField(file, value)) loaded[key] = value;
+    return loaded;
+}
+
 template <std::int64_t COUNT>
 void saveOurs(benchmark::State& state) {
     Map map;
@@ -111,12 +120,67 @@ void loadStandard(benchmark::State& state) {
     fill(map, COUNT);
     saveMap(map);
     for (auto _ : state) {
-        std::ifstream file(dictPath(), std::ios::binary);
-        Map loaded;
-        std::string key;
+        if (loadMap().size() != map.size()) state.SkipWithError("read");
+    }
+}
+
+constexpr std::int64_t GETS = 100;
+/// Odd, so that the keys asked for are spread over the whole file.
+constexpr std::int64_t GET_STEP = 97;
+
+template <std::int64_t COUNT>
+void loadAndGetOurs(benchmark::State& state) {
+    Map map;
+    fill(map, COUNT);
+    saveMap(map);
+    std::string const path = dictPath();
+    for (auto _ : state) {
+        BlobDict dict{Str(path)};
+        Blob value;
+        for (std::int64_t i = 0; i < GETS; ++i) {
+            std::string const key = keyOf(i * GET_STEP);
+            if (!dict.get(Blob(key.size(), key.data()), value)) state.SkipWithError("get");
+        }
+    }
+}
+
+template <std::int64_t COUNT>
+void loadAndGetStandard(benchmark::State& state) {
+    Map map;
+    fill(map, COUNT);
+    saveMap(map);
+    for (auto _ : state) {
+        Map const loaded = loadMap();
         std::string value;
-        while (readField(file, key) && readField(file, value)) loaded[key] = value;
-        if (loaded.size() != map.size()) state.SkipWithError("read");
+        for (std::int64_t i = 0; i < GETS; ++i) {
+            auto const found = loaded.find(keyOf(i * GET_STEP));
+            if (found == loaded.end()) return state.SkipWithError("get");
+            value = found->second;
+        }
+    }
+}
+
+template <std::int64_t COUNT>
+void setAndSaveOurs(benchmark::State& state) {
+    std::string const path = dictPath();
+    for (auto _ : state) {
+        BlobDict dict;
+        dict.setPath(Str(path));
+        for (std::int64_t i = 0; i < COUNT; ++i) {
+            std::string const key = keyOf(i);
+            std::string const value = valueOf(i);
+            dict.set(Blob(key.size(), key.data()), Blob(value.size(), value.data()));
+        }
+        if (!dict.save()) state.SkipWithError("save");
+    }
+}
+
+template <std::int64_t COUNT>
+void setAndSaveStandard(benchmark::State& state) {
+    for (auto _ : state) {
+        Map map;
+        fill(map, COUNT);
+        saveMap(map);
     }
 }
 
@@ -128,6 +192,10 @@ BENCHMARK(loadOurs<1'000>)->Name("dict/load/1000-records/ours");
 BENCHMARK(loadStandard<1'000>)->Name("dict/load/1000-records/unordered_map");
 BENCHMARK(loadOurs<10'000>)->Name("dict/load/10000-records/ours");
 BENCHMARK(loadStandard<10'000>)->Name("dict/load/10000-records/unordered_map");
+BENCHMARK(loadAndGetOurs<10'000>)->Name("dict/load-and-get/10000-records/ours");
+BENCHMARK(loadAndGetStandard<10'000>)->Name("dict/load-and-get/10000-records/unordered_map");
+BENCHMARK(setAndSaveOurs<10'000>)->Name("dict/set-and-save/10000-records/ours");
+BENCHMARK(setAndSaveStandard<10'000>)->Name("dict/set-and-save/10000-records/unordered_map");
 
 std::string const text(16 * 1024, 'x');
 

@@ -65,9 +65,32 @@ void takeTheirs(benchmark::State& state) {
     }
 }
 
+constexpr std::uint64_t HOT_KEY = 7;
+
+/// What a key guards: the work of a few instructions.
+std::uint64_t guarded = 0;
+
+void takeHotOurs(benchmark::State& state) {
+    for (auto _ : state) {
+        ourSet->take(HOT_KEY);
+        benchmark::DoNotOptimize(++guarded);
+        ourSet->give(HOT_KEY);
+    }
+}
+
+void takeHotTheirs(benchmark::State& state) {
+    for (auto _ : state) {
+        theirMap.take(HOT_KEY);
+        benchmark::DoNotOptimize(++guarded);
+        theirMap.give(HOT_KEY);
+    }
+}
+
 BENCHMARK(takeOurs)->Name("keys-one-thread/ours");
 BENCHMARK(takeTheirs)->Name("keys-one-thread/mutex-map");
 BENCHMARK(takeOurs)->Name("keys-two-threads/ours")->Threads(2)->UseRealTime();
 BENCHMARK(takeTheirs)->Name("keys-two-threads/mutex-map")->Threads(2)->UseRealTime();
+BENCHMARK(takeHotOurs)->Name("hot-key-two-threads/ours")->Threads(2)->UseRealTime();
+BENCHMARK(takeHotTheirs)->Name("hot-key-two-threads/mutex-map")->Threads(2)->UseRealTime();
 
 } // namespace

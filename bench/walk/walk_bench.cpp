@@ -114,7 +114,10 @@ void sizeOurs(benchmark::State& state) {
     for (auto _ : state) expect(state, FileSizeVisitor::Get(Str(sourceTree()), true) > 0);
 }
 void sizeProgram(benchmark::State& state) {
-    for (auto _ : state) expect(state, run({"du", "-s", sourceTree().c_str()}));
+    for (auto _ : state) expect(state, run({"du", "-s", "--apparent-size", sourceTree().c_str()}));
+}
+void sizeProcess(benchmark::State& state) {
+    for (auto _ : state) expect(state, run({TREE_SIZE_PROGRAM, sourceTree().c_str()}));
 }
 
 // ---- the whole job --------------------------------------------------------------------------------------------------
@@ -200,6 +203,8 @@ BENCHMARK(countOurs)->Name("count_folder/ours")->UseRealTime();
 BENCHMARK(countFilesystem)->Name("count_folder/filesystem")->UseRealTime();
 BENCHMARK(sizeOurs)->Name("tree_size/ours")->UseRealTime();
 BENCHMARK(sizeProgram)->Name("tree_size/du")->UseRealTime();
+BENCHMARK(sizeProcess)->Name("tree_size_process/ours")->UseRealTime();
+BENCHMARK(sizeProgram)->Name("tree_size_process/du")->UseRealTime();
 BENCHMARK(jobCopyOurs)->Name("job_copy/ours")->UseManualTime()->Iterations(1);
 BENCHMARK(jobCopyFilesystem)->Name("job_copy/filesystem")->UseManualTime()->Iterations(1);
 BENCHMARK(jobCopyProgram)->Name("job_copy/cp")->UseManualTime()->Iterations(1);

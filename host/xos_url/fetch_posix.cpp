@@ -1,30 +1,43 @@
 // The sibling is fetch_win.cpp.
 
+#include "host/xos_url/curl_library_posix.h"
 #include "host/xos_url/fetch.h"
 #include "host/xos_url/reason.h"
 
 #include <cerrno>
-#include <curl/curl.h>
-#include <memory>
 #include <string_view>
 
 namespace host {
 
 namespace {
 
-struct Cleanup {
-    void operator()(CURL* handle) const {
+/// One transfer.
+class Handle {
+public:
+    explicit Handle(CurlLibrary const& curl) : curl_(curl), handle_(curl.easyInit()) {}
+    Handle(Handle const&) = delete;
+    Handle& operator=(Handle const&) = delete;
+    ~Handle() {
         KeepReason const keep;
-        curl_easy_cleanup(handle);
+        curl_.easyCleanup(handle_);
     }
+
+    bool isMade() const { return handle_ != nullptr; }
+    template <class Value>
+    bool set(CURLoption option, Value value) const {
+        return curl_.easySetopt(handle_, option, value) == CURLE_OK;
+    }
+    long number(CURLINFO which) const {
+        long number = 0;
+        curl_.easyGetinfo(handle_, which, &number);
+        return number;
+    }
+    CURLcode perform() const { return curl_.easyPerform(handle_); }
+
+private:
+    CurlLibrary const& curl_;
+    CURL* handle_;
 };
-
-using Handle = std::unique_ptr<CURL, Cleanup>;
-
-bool isReady() {
-    static bool const ready = curl_global_init(CURL_GLOBAL_DEFAULT) == CURLE_OK;
-    return ready;
-}
 
 struct Body {
     BodySink& sink;
@@ -52,41 +65,31 @@ std::size_t watchHead(char* line, std::size_t unit, std::size_t count, void* has
     return text.size();
 }
 
-template <class Value>
-bool set(Handle const& handle, CURLoption option, Value value) {
-    return curl_easy_setopt(handle.get(), option, value) == CURLE_OK;
-}
-
 bool setCredentials(Handle const& handle, FetchRequest const& request) {
     if (request.user == nullptr) return true;
-    return set(handle, CURLOPT_USERNAME, request.user) &&
-           set(handle, CURLOPT_PASSWORD, request.password == nullptr ? "" : request.password);
+    return handle.set(CURLOPT_USERNAME, request.user) &&
+           handle.set(CURLOPT_PASSWORD, request.password == nullptr ? "" : request.password);
 }
 
 bool prepare(Handle const& handle, FetchRequest const& request, Body& body, bool& hasHead) {
-    return set(handle, CURLOPT_URL, request.url.c_str()) && set(handle, CURLOPT_NOSIGNAL, 1L) &&
-           set(handle, CURLOPT_PROTOCOLS_STR, "http,https") && set(handle, CURLOPT_REDIR_PROTOCOLS_STR, "http,https") &&
-           set(handle, CURLOPT_FOLLOWLOCATION, 1L) && set(handle, CURLOPT_MAXREDIRS, long{MOST_REDIRECTS}) &&
-           set(handle, CURLOPT_FAILONERROR, 1L) &&
-           set(handle, CURLOPT_CONNECTTIMEOUT, static_cast<long>(request.connectSeconds)) &&
-           set(handle, CURLOPT_LOW_SPEED_LIMIT, 1L) &&
-           set(handle, CURLOPT_LOW_SPEED_TIME, static_cast<long>(request.stallSeconds)) &&
-           set(handle, CURLOPT_HTTPAUTH, static_cast<long>(CURLAUTH_ANY)) &&
-           set(handle, CURLOPT_WRITEFUNCTION, takeBody) && set(handle, CURLOPT_WRITEDATA, &body) &&
-           set(handle, CURLOPT_HEADERFUNCTION, watchHead) && set(handle, CURLOPT_HEADERDATA, &hasHead) &&
+    return handle.set(CURLOPT_URL, request.url.c_str()) && handle.set(CURLOPT_NOSIGNAL, 1L) &&
+           handle.set(CURLOPT_PROTOCOLS_STR, "http,https") && handle.set(CURLOPT_REDIR_PROTOCOLS_STR, "http,https") &&
+           handle.set(CURLOPT_FOLLOWLOCATION, 1L) && handle.set(CURLOPT_MAXREDIRS, long{MOST_REDIRECTS}) &&
+           handle.set(CURLOPT_FAILONERROR, 1L) &&
+           handle.set(CURLOPT_CONNECTTIMEOUT, static_cast<long>(request.connectSeconds)) &&
+           handle.set(CURLOPT_LOW_SPEED_LIMIT, 1L) &&
+           handle.set(CURLOPT_LOW_SPEED_TIME, static_cast<long>(request.stallSeconds)) &&
+           handle.set(CURLOPT_HTTPAUTH, static_cast<long>(CURLAUTH_ANY)) &&
+           handle.set(CURLOPT_WRITEFUNCTION, takeBody) && handle.set(CURLOPT_WRITEDATA, &body) &&
+           handle.set(CURLOPT_HEADERFUNCTION, watchHead) && handle.set(CURLOPT_HEADERDATA, &hasHead) &&
            setCredentials(handle, request);
 }
 
-long statusOf(Handle const& handle) {
-    long status = 0;
-    curl_easy_getinfo(handle.get(), CURLINFO_RESPONSE_CODE, &status);
-    return status;
-}
+long statusOf(Handle const& handle) { return handle.number(CURLINFO_RESPONSE_CODE); }
 
 /// The error with which connecting failed.
 int connectError(Handle const& handle) {
-    long error = 0;
-    curl_easy_getinfo(handle.get(), CURLINFO_OS_ERRNO, &error);
+    long const error = handle.number(CURLINFO_OS_ERRNO);
     return error != 0 ? static_cast<int>(error) : ECONNREFUSED;
 }
 
@@ -129,7 +132,7 @@ bool isGoodAnswer(long status) { return status >= 200 && status < 300; }
 bool perform(Handle const& handle, FetchRequest const& request, Body& body) {
     bool hasHead = false;
     if (!prepare(handle, request, body, hasHead)) return failFor(Reason::BAD_ARGUMENT);
-    CURLcode const code = curl_easy_perform(handle.get());
+    CURLcode const code = handle.perform();
     if (code != CURLE_OK) return failForCode(code, handle, body);
     if (!hasHead) return failFor(Reason::BAD_ANSWER);
     return isGoodAnswer(statusOf(handle)) || failForStatus(statusOf(handle));
@@ -138,9 +141,14 @@ bool perform(Handle const& handle, FetchRequest const& request, Body& body) {
 } // namespace
 
 bool fetch(FetchRequest const& request, BodySink& sink) {
-    Handle const handle{isReady() ? curl_easy_init() : nullptr};
+    CurlLibrary const* const curl = curlLibrary();
+    if (curl == nullptr) {
+        errno = ELIBACC;
+        return false;
+    }
+    Handle const handle{*curl};
     Body body{sink};
-    if (handle != nullptr) return perform(handle, request, body);
+    if (handle.isMade()) return perform(handle, request, body);
     errno = ENOMEM;
     return false;
 }

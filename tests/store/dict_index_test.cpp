@@ -1,10 +1,15 @@
-// Keys that a file holds once, twice, and in great numbers.
+// The table of keys, and keys that a file holds once, twice, and in great numbers.
+
+#include "basis/store/dict_index.h"
 
 #include "tests/store/stored_dict.h"
+#include "tests/support/random_steps.h"
 
 #include <gtest/gtest.h>
 
 #include <chrono>
+#include <map>
+#include <memory>
 
 using namespace ZOR_Basis;
 
@@ -13,6 +18,51 @@ namespace {
 struct DictIndexOfKeys : StoredDict {};
 
 } // namespace
+
+TEST(DictIndex, breathes) {
+    DictIndex index;
+    BlobEntry entry(blob("key"));
+    EXPECT_EQ(index.find(3, "key"), nullptr);
+    EXPECT_TRUE(index.add(&entry));
+    EXPECT_EQ(index.find(3, "key"), &entry);
+    EXPECT_EQ(index.find(3, "kex"), nullptr);
+    EXPECT_EQ(index.find(0, nullptr), nullptr);
+    index.remove(&entry);
+    EXPECT_EQ(index.find(3, "key"), nullptr);
+}
+
+TEST(DictIndex, finds_keys_of_every_length_by_every_byte) {
+    std::string const bytes(40, 'x');
+    DictIndex index;
+    std::vector<std::unique_ptr<BlobEntry>> entries;
+    auto const add = [&](std::string const& key) {
+        entries.push_back(std::make_unique<BlobEntry>(blob(key)));
+        ASSERT_TRUE(index.add(entries.back().get()));
+    };
+    for (std::size_t n = 0; n <= bytes.size(); ++n) {
+        add(bytes.substr(0, n));
+        for (std::size_t i = 0; i < n; ++i) add(bytes.substr(0, i) + "y" + bytes.substr(0, n - i - 1));
+    }
+    for (auto const& entry : entries) EXPECT_EQ(index.find(entry->key.size(), entry->key.val()), entry.get());
+}
+
+TEST(DictIndex, behaves_as_a_map) {
+    auto random = randomSource();
+    DictIndex index;
+    std::map<std::string, std::unique_ptr<BlobEntry>> model;
+    for (std::uint64_t left = randomSteps(100'000); left > 0; --left) {
+        std::string const key = std::to_string(random() % 300);
+        auto const known = model.find(key);
+        ASSERT_EQ(index.find(key.size(), key.data()), known != model.end() ? known->second.get() : nullptr) << key;
+        if (known == model.end()) {
+            BlobEntry* const entry = model.emplace(key, new BlobEntry(blob(key))).first->second.get();
+            ASSERT_TRUE(index.add(entry));
+        } else {
+            index.remove(known->second.get());
+            model.erase(known);
+        }
+    }
+}
 
 TEST_F(DictIndexOfKeys, Kept_dict_03_reverses_the_order_with_every_load) {
     put(path, fileOf({{"A", "1"}, {"B", "2"}, {"C", "3"}}));

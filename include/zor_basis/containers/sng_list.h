@@ -29,6 +29,18 @@
 
 namespace ZOR_Basis {
 
+namespace detail {
+
+/// The number of units of a list. For some types of value it also notes that units are exposed: callers may hold
+/// pointers to them, through which they can change values and links unnoticed.
+template <class T>
+struct UnitCount {
+    std::uint64_t number = 0;
+    void noteExposure() const {}
+};
+
+} // namespace detail
+
 template <class T>
 class SngList {
 public:
@@ -107,7 +119,7 @@ public:
     SngList() = default;
     /// Adopts a chain without changing it.
     /// \pre `count` units lead from `first` to `last`, whose link is null
-    SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_(count) {}
+    SngList(Unit* first, Unit* last, std::uint64_t count) : first_(first), last_(last), count_{count} {}
     /// Copies the values in their order.
     SngList(SngList const& other) : SngList() {
         for (Unit* unit = other.first_; unit != nullptr; unit = unit->next) insertBack(unit->value);
@@ -135,34 +147,29 @@ public:
     void clear() {
         while (first_ != nullptr) delete std::exchange(first_, first_->next);
         last_ = nullptr;
-        count_ = 0;
+        count_.number = 0;
     }
 
     /// The first and the last unit; null in an empty list.
-    Unit* first() const { return first_; }
-    Unit* last() const { return last_; }
-    std::uint64_t size() const { return count_; }
-    bool empty() const { return count_ == 0; }
-    iterator begin() { return {first_, nullptr}; }
+    Unit* first() const { return exposed(first_); }
+    Unit* last() const { return exposed(last_); }
+    std::uint64_t size() const { return count_.number; }
+    bool empty() const { return count_.number == 0; }
+    iterator begin() { return {exposed(first_), nullptr}; }
     iterator end() { return {}; }
-    const_iterator begin() const { return const_iterator(first_); }
+    const_iterator begin() const { return const_iterator(exposed(first_)); }
     const_iterator end() const { return {}; }
     const_iterator cbegin() const { return begin(); }
     const_iterator cend() const { return end(); }
 
     void insertFront(T const& value) { insertFront(new Unit{nullptr, value}); }
-    void insertFront(Unit* unit) {
-        unit->next = first_;
-        first_ = unit;
-        if (last_ == nullptr) last_ = unit;
-        ++count_;
-    }
+    void insertFront(Unit* unit) { linkFront(exposed(unit)); }
     void insertBack(T const& value) { insertBack(new Unit{nullptr, value}); }
     void insertBack(Unit* unit) {
         unit->next = nullptr;
-        (last_ != nullptr ? last_->next : first_) = unit;
+        (last_ != nullptr ? last_->next : first_) = exposed(unit);
         last_ = unit;
-        ++count_;
+        ++count_.number;
     }
 
     /// Inserts after the iterator's unit; appends at the end of the list and for an iterator without a unit.
@@ -204,7 +211,7 @@ public:
     void removeFirst() { delete takeFirst(); }
     Unit* takeFirst() {
         if (first_ == nullptr) return nullptr;
-        Unit* const taken = unlink(nullptr, first_);
+        Unit* const taken = exposed(unlink(nullptr, first_));
         taken->next = nullptr;
         return taken;
     }
@@ -225,8 +232,8 @@ public:
     ///     before the second, so two equal ones change places
     /// \cost n log n comparisons, and during the call one pointer per unit, if memory allows
     void sort(bool ascending) {
-        if (count_ < 2) return;
-        if (count_ == 2) {
+        if (size() < 2) return;
+        if (size() == 2) {
             // kept list-01: two units are compared once, and one that is not less goes behind.
             if (!comp(first_, last_, ascending)) reverse();
         } else if (!sortGathered(ascending)) {
@@ -250,9 +257,9 @@ public:
         }
         *link = mine != nullptr ? mine : theirs;
         if (theirs != nullptr) last_ = other.last_;
-        count_ += other.count_;
+        count_.number += std::exchange(other.count_.number, 0);
         other.first_ = other.last_ = nullptr;
-        other.count_ = 0;
+        exposed(first_);
     }
 
     /// Tells whether a comes strictly before b.
@@ -263,35 +270,55 @@ public:
     bool isConsistent() const {
         std::uint64_t units = 0;
         Unit const* tail = nullptr;
-        for (Unit const* unit = first_; unit != nullptr && units <= count_; unit = unit->next, ++units) tail = unit;
-        return units == count_ && tail == last_;
+        for (Unit const* unit = first_; unit != nullptr && units <= size(); unit = unit->next, ++units) tail = unit;
+        return units == size() && tail == last_;
     }
 
+protected:
+    /// \name For a derived class that keeps account of its units: none of these exposes them
+    /// @{
+    Unit* head() const { return first_; }
+    detail::UnitCount<T> const& unitCount() const { return count_; }
+    void linkFront(Unit* unit) {
+        unit->next = first_;
+        first_ = unit;
+        if (last_ == nullptr) last_ = unit;
+        ++count_.number;
+    }
+    /// \param previous  is null for the first unit
+    Unit* unlink(Unit* previous, Unit* unit) {
+        (previous != nullptr ? previous->next : first_) = unit->next;
+        if (unit == last_) last_ = previous;
+        --count_.number;
+        return unit;
+    }
+    /// @}
+
 private:
+    /// Notes that callers may hold units now. Members that take an iterator to a unit need not: `begin` has done so.
+    Unit* exposed(Unit* unit) const {
+        count_.noteExposure();
+        return unit;
+    }
+
     void swap(SngList& other) noexcept {
         std::swap(first_, other.first_);
         std::swap(last_, other.last_);
-        std::swap(count_, other.count_);
+        std::swap(count_.number, other.count_.number);
+        exposed(first_);
     }
 
     /// Inserts a unit after one that is not the last.
     void link(Unit* unit, Unit* previous) {
         unit->next = previous->next;
         previous->next = unit;
-        ++count_;
-    }
-
-    Unit* unlink(Unit* previous, Unit* unit) {
-        (previous != nullptr ? previous->next : first_) = unit->next;
-        if (unit == last_) last_ = previous;
-        --count_;
-        return unit;
+        ++count_.number;
     }
 
     /// Sorts an array of pointers to the units and links the units again, which is faster than following links.
     /// \return false, with nothing changed, if memory for the array is short
     bool sortGathered(bool ascending) {
-        Unit** const units = static_cast<Unit**>(std::malloc(count_ * sizeof(Unit*)));
+        Unit** const units = static_cast<Unit**>(std::malloc(size() * sizeof(Unit*)));
         if (units == nullptr) return false;
         Unit** end = units;
         for (Unit* unit = first_; unit != nullptr; unit = unit->next) *end++ = unit;
@@ -309,12 +336,12 @@ private:
     }
 
     void sortLinked(bool ascending) {
-        if (count_ < 2) return;
+        if (size() < 2) return;
         Unit* cut = first_;
-        for (std::uint64_t i = 1; i < count_ / 2; ++i) cut = cut->next;
-        SngList front(first_, cut, count_ / 2);
+        for (std::uint64_t i = 1; i < size() / 2; ++i) cut = cut->next;
+        SngList front(first_, cut, size() / 2);
         first_ = std::exchange(cut->next, nullptr);
-        count_ -= front.count_;
+        count_.number -= front.size();
         front.sortLinked(ascending);
         sortLinked(ascending);
         merge(front, ascending);
@@ -322,7 +349,7 @@ private:
 
     Unit* first_ = nullptr;
     Unit* last_ = nullptr;
-    std::uint64_t count_ = 0;
+    detail::UnitCount<T> count_;
 };
 
 } // namespace ZOR_Basis

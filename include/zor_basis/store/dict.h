@@ -1,9 +1,9 @@
 /// \file
 /// `Dict<Blob, Blob>`: a small dictionary of byte strings, stored in one file.
 ///
-/// In memory it is a list of entries with distinct keys, the newest at the front; every look-up searches the list. The
-/// file contains only the entries, each a key and a value in the stored form of a `Blob`, so appending one file to
-/// another joins them. Only `save` and `write` change the file; the destructor does not.
+/// In memory it is a list of entries with distinct keys, the newest at the front. The file contains only the entries,
+/// each a key and a value in the stored form of a `Blob`, so appending one file to another joins them. Only `save` and
+/// `write` change the file; the destructor does not.
 ///
 /// Save with `save`: whatever happens meanwhile, the file is then either the old one or the complete new one. `write`
 /// truncates the file first and then fills it. If the disk is full, or the process ends in between, the old entries are
@@ -24,6 +24,10 @@
 /// The members of the list are also available. `write` does not notice changes made through them, and keys must stay
 /// distinct.
 ///
+/// An index finds the keys of all but small dictionaries. It cannot notice changes made through pointers and iterators
+/// into the list: once a caller has asked for one (`first`, `last`, `begin`, a `for` loop) or has changed the list
+/// itself, look-ups search the list from its front, until the dictionary has been empty again.
+///
 /// \error when the system causes a false, 0 or null, the last error says why (docs/reasons.md)
 /// \thread one thread at a time
 
@@ -40,7 +44,9 @@
 
 namespace ZOR_Basis {
 
+class DictIndex;
 class IFile;
+class RecordReader;
 
 /// The result of the last reading of a dictionary's file.
 enum DictFile : int {
@@ -62,19 +68,22 @@ public:
     /// \error if the file cannot be opened the dictionary is empty, and the next `write` makes the file
     Dict(Str const& path);
     /// Saves nothing.
-    ~Dict() = default;
+    ~Dict();
 
     /// Sets another file; nothing is read or written.
     void setPath(Str const& path) { path_ = path; }
 
     /// \param out  receives the value; unchanged if there is none
+    /// \cost a look-up in the index, or a search of the list, whose time grows with the number of entries
     bool get(K const& key, V& out) const;
     /// Stores a value. A new key comes first in the list; an existing key keeps its place.
     /// \kept dict-01: storing a value that the key already has makes the dictionary count as saved, even if earlier
     ///     changes are not saved, and `write` then writes nothing. A caller that needs them in the file must call
     ///     `save`, or call `write` before
+    /// \cost as `get`
     void set(K const& key, V const& value);
     /// Removes a key. A missing key changes nothing and requires no saving.
+    /// \cost a search of the list; as `get` for a missing key
     void rm(K const& key);
     /// Removes all entries, if there are any.
     void clean();
@@ -116,13 +125,23 @@ private:
     Dict(Dict const&) : SngList<Entry>() {}
     Dict& operator=(Dict const&) { return *this; }
 
-    Entry* find(K const& key) const;
+    using Unit = typename SngList<Entry>::Unit;
+
+    Entry* find(std::uint64_t size, char const* key) const;
+    Entry* find(K const& key) const { return find(key.size(), key.val()); }
+    void add(Unit* unit);
+    void drop(Unit* previous, Unit* unit);
+    void load(RecordReader& records);
     bool put(IFile& file) const;
+    DictIndex* index() const;
+    void makeIndex() const;
+    void dropIndex() const;
 
     FPath path_;
     bool modified_ = false;
     DictFile found_ = DICT_NOT_READ;
     std::uint64_t understood_ = 0;
+    mutable DictIndex* index_ = nullptr; // owned; null: there is none yet
 };
 
 ZB_EXTERN_TEMPLATE Dict<Blob, Blob>;

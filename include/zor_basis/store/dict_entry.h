@@ -6,7 +6,10 @@
 #ifndef ZOR_BASIS_STORE_DICT_ENTRY_H
 #define ZOR_BASIS_STORE_DICT_ENTRY_H
 
+#include "zor_basis/containers/sng_list.h"
 #include "zor_basis/store/blob.h"
+
+#include <cstdint>
 
 namespace ZOR_Basis {
 
@@ -37,6 +40,16 @@ public:
 };
 
 static_assert(sizeof(DictEntry<Blob, Blob>) == 2 * sizeof(Blob));
+
+/// A dictionary has to know when others may have changed its entries.
+template <class K, class V>
+struct detail::UnitCount<DictEntry<K, V>> {
+    std::uint64_t number = 0;
+    mutable bool isExposed = false;
+
+    void noteExposure() const { isExposed = true; }
+    void endExposure() const { isExposed = false; }
+};
 
 } // namespace ZOR_Basis
 
