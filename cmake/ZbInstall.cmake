@@ -1,4 +1,5 @@
-# The installed package: libraries, public headers, split debug symbols, and what find_package(zor_basis) reads.
+# What is installed, by component: library, development (headers, links, and what find_package and pkg-config read),
+# tools, symbols, documentation.
 
 include(CMakePackageConfigHelpers)
 
@@ -6,28 +7,77 @@ set(zb_package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/zor_basis)
 set(zb_libraries zor_basis xos_basics xos_url hq_basis)
 
 install(TARGETS ${zb_libraries} EXPORT zor_basis
-  RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR}
-  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
-  ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR})
+  RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT library
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT library NAMELINK_COMPONENT development
+  ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT development)
 if(MINGW)
   # With -static the linker takes -lNAME from libNAME.a alone, and an import library serves as one.
   foreach(library IN LISTS zb_libraries)
-    install(FILES $<TARGET_LINKER_FILE:${library}> DESTINATION ${CMAKE_INSTALL_LIBDIR} RENAME lib${library}.a)
+    install(FILES $<TARGET_LINKER_FILE:${library}> DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT development
+      RENAME lib${library}.a)
   endforeach()
+  include(ZbMsvcImports)
 endif()
-install(EXPORT zor_basis NAMESPACE zor_basis:: DESTINATION ${zb_package_dir})
-install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} FILES_MATCHING PATTERN "*.h")
-install(FILES ${PROJECT_SOURCE_DIR}/host/include/xos_host.h DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
+install(EXPORT zor_basis NAMESPACE zor_basis:: DESTINATION ${zb_package_dir} COMPONENT development)
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} COMPONENT development
+  FILES_MATCHING PATTERN "*.h")
+install(FILES ${PROJECT_SOURCE_DIR}/host/include/xos_host.h DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
+  COMPONENT development)
 
+# find_package. Before version 1.0 a new minor version may break what was built for an older one.
+set(zb_compatible SameMajorVersion)
+if(PROJECT_VERSION_MAJOR EQUAL 0)
+  set(zb_compatible SameMinorVersion)
+endif()
+list(JOIN ZB_COMPONENTS " " ZB_COMPONENTS)
 configure_package_config_file(${PROJECT_SOURCE_DIR}/cmake/zor_basisConfig.cmake.in
-  ${PROJECT_BINARY_DIR}/zor_basisConfig.cmake INSTALL_DESTINATION ${zb_package_dir})
-write_basic_package_version_file(${PROJECT_BINARY_DIR}/zor_basisConfigVersion.cmake COMPATIBILITY SameMajorVersion)
+  ${PROJECT_BINARY_DIR}/zor_basisConfig.cmake INSTALL_DESTINATION ${zb_package_dir}
+  NO_SET_AND_CHECK_MACRO NO_CHECK_REQUIRED_COMPONENTS_MACRO)
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/zor_basisConfigVersion.cmake COMPATIBILITY ${zb_compatible})
 install(FILES ${PROJECT_BINARY_DIR}/zor_basisConfig.cmake ${PROJECT_BINARY_DIR}/zor_basisConfigVersion.cmake
-  DESTINATION ${zb_package_dir})
+  DESTINATION ${zb_package_dir} COMPONENT development)
 
+# pkg-config. Its files find the prefix from their own place, so that the prefix may be moved.
+file(RELATIVE_PATH ZB_PC_PREFIX ${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig ${CMAKE_INSTALL_PREFIX})
+string(REGEX REPLACE "/$" "" ZB_PC_PREFIX "${ZB_PC_PREFIX}")
+foreach(file IN ITEMS zor_basis.pc xos_host.pc)
+  configure_file(${PROJECT_SOURCE_DIR}/cmake/package/${file}.in ${PROJECT_BINARY_DIR}/${file} @ONLY)
+  install(FILES ${PROJECT_BINARY_DIR}/${file} DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
+endforeach()
+
+set(zb_programs ${zb_libraries})
+if(TARGET zor_basis_demo)
+  if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+    set_target_properties(zor_basis_demo PROPERTIES INSTALL_RPATH "") # the loader knows the system's libraries
+  else()
+    set_target_properties(zor_basis_demo PROPERTIES INSTALL_RPATH "$ORIGIN/../${CMAKE_INSTALL_LIBDIR}")
+  endif()
+  install(TARGETS zor_basis_demo RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
+  list(APPEND zb_programs zor_basis_demo)
+endif()
+
+# Symbols lie where the debugger looks for them: those of the system below /usr/lib/debug by build id, others beside
+# the file.
 if(ZB_SPLIT_DEBUG_SYMBOLS)
-  foreach(library IN LISTS zb_libraries)
-    install(FILES $<TARGET_FILE:${library}>.debug DESTINATION
-      $<IF:$<PLATFORM_ID:Windows>,${CMAKE_INSTALL_BINDIR},${CMAKE_INSTALL_LIBDIR}>)
+  foreach(program IN LISTS zb_programs)
+    get_target_property(type ${program} TYPE)
+    set(folder ${CMAKE_INSTALL_BINDIR})
+    if(NOT WIN32 AND type STREQUAL "SHARED_LIBRARY")
+      set(folder ${CMAKE_INSTALL_LIBDIR})
+    endif()
+    if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+      install(CODE "
+        set(READELF \"${CMAKE_READELF}\")
+        set(PROGRAM \"$<TARGET_FILE:${program}>\")
+        include(\"${PROJECT_SOURCE_DIR}/cmake/package/install_by_build_id.cmake\")" COMPONENT symbols)
+    else()
+      install(FILES $<TARGET_FILE:${program}>.debug DESTINATION ${folder} COMPONENT symbols)
+    endif()
   endforeach()
 endif()
+
+set(zb_doc_dir ${CMAKE_INSTALL_DATAROOTDIR}/doc/libzor-basis-doc)
+install(FILES ${PROJECT_SOURCE_DIR}/README.md ${PROJECT_SOURCE_DIR}/CHANGELOG.md
+  DESTINATION ${zb_doc_dir} COMPONENT documentation)
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/docs ${PROJECT_SOURCE_DIR}/examples
+  DESTINATION ${zb_doc_dir} COMPONENT documentation PATTERN CMakeLists.txt EXCLUDE)

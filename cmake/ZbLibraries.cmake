@@ -6,11 +6,15 @@ endif()
 
 option(ZB_SPLIT_DEBUG_SYMBOLS "Keep debug symbols in a file beside each library" OFF)
 
+# The folder of include/zor_basis that a component of find_package names; all of them are the one library.
+set(ZB_COMPONENTS text containers memory sync files store walk timers log system crypto flat)
+
 # zb_shared_library(<target> IMAGE_BASE <address> DESCRIPTION <text>): settings common to all our shared libraries.
 # The exported names are those that carry an export macro in their headers; with mingw-w64 those of
 # cmake/exports/<target>.def, on ELF only those that the version script cmake/exports/<target>.map lets through.
 function(zb_shared_library target)
   cmake_parse_arguments(ARG "" "IMAGE_BASE;DESCRIPTION" "" ${ARGN})
+  add_library(zor_basis::${target} ALIAS ${target})
   set(exports ${PROJECT_SOURCE_DIR}/cmake/exports/${target})
   if(WIN32)
     set(ZB_RC_NAME ${target})
@@ -32,6 +36,12 @@ function(zb_shared_library target)
     endif()
     set_target_properties(${target} PROPERTIES LINK_DEPENDS ${exports}.map)
   endif()
+  zb_split_symbols(${target})
+endfunction()
+
+# zb_split_symbols(<target>): with ZB_SPLIT_DEBUG_SYMBOLS, moves what the debugger reads into <file>.debug beside the
+# file. Build id and debug link lead the debugger there.
+function(zb_split_symbols target)
   if(ZB_SPLIT_DEBUG_SYMBOLS)
     # -p: objcopy otherwise puts the present time into a PE file.
     add_custom_command(TARGET ${target} POST_BUILD

@@ -80,11 +80,11 @@ function(zb_joined_tests name)
   endforeach()
 endfunction()
 
-# zb_quickly_compiled(<target>): optimises nothing. Tests take longer to compile than to run; what they test is
-# optimised.
+# zb_quickly_compiled(<target>): optimises nothing, and in release builds describes only lines to the debugger. Tests
+# take longer to compile than to run; what they test is optimised and described in full.
 function(zb_quickly_compiled target)
   if(NOT MSVC)
-    target_compile_options(${target} PRIVATE -O0)
+    target_compile_options(${target} PRIVATE -O0 $<$<CONFIG:Release>:-g1>)
   endif()
 endfunction()
 

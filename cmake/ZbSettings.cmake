@@ -1,5 +1,17 @@
 # What holds for every target of the project: language, warnings, sanitizers, reproducible output.
 
+# Without a build type nothing would be optimised, and nobody would notice until they measure.
+get_property(zb_several_build_types GLOBAL PROPERTY GENERATOR_IS_MULTI_CONFIG)
+if(PROJECT_IS_TOP_LEVEL AND NOT CMAKE_BUILD_TYPE AND NOT zb_several_build_types)
+  message(STATUS "zor_basis: no build type was given, so it is RelWithDebInfo")
+  set(CMAKE_BUILD_TYPE RelWithDebInfo CACHE STRING "Debug, Release, RelWithDebInfo or MinSizeRel" FORCE)
+endif()
+
+if(DEFINED BUILD_SHARED_LIBS AND NOT BUILD_SHARED_LIBS)
+  message(FATAL_ERROR "zor_basis is a shared library only, because the modules of a process share its registries, and "
+    "the server's platform modules replace its own at load time. Set BUILD_SHARED_LIBS to ON, or leave it undefined.")
+endif()
+
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
@@ -12,10 +24,16 @@ set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
 set(CMAKE_INSTALL_RPATH "$ORIGIN")
 
-# Every program and library lands in one folder, so that Windows finds the DLLs beside the programs.
-set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
-set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
-set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+# Every program and library lands in one folder, so that Windows finds the DLLs beside the programs. A parent project
+# may name other folders for all.
+foreach(kind IN ITEMS RUNTIME LIBRARY ARCHIVE)
+  if(NOT CMAKE_${kind}_OUTPUT_DIRECTORY)
+    set(CMAKE_${kind}_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+    if(kind STREQUAL "RUNTIME")
+      set(CMAKE_${kind}_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
+    endif()
+  endif()
+endforeach()
 
 find_package(Threads REQUIRED)
 
@@ -26,6 +44,9 @@ endif()
 if(ZB_SANITIZE)
   add_compile_options(-fsanitize=${ZB_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
   add_link_options(-fsanitize=${ZB_SANITIZE})
+endif()
+if(NOT MSVC)
+  add_link_options(-Wl,--build-id=sha1)
 endif()
 if(WIN32)
   add_compile_definitions(_WIN32_WINNT=0x0A00)

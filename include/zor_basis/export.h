@@ -4,9 +4,20 @@
 /// `ZB_API` precedes every exported class and function. On ELF it gives default visibility. With mingw-w64 it is empty,
 /// because the library's committed export list decides what is exported. With MSVC it imports, unless `ZB_BUILDING`
 /// (the library itself) or `ZB_STATIC` (its objects linked into a program) is defined.
+///
+/// In C++ all headers require C++20.
 
 #ifndef ZOR_BASIS_EXPORT_H
 #define ZOR_BASIS_EXPORT_H
+
+#if defined(_MSVC_LANG)
+#define ZB_CXX_VERSION _MSVC_LANG
+#elif defined(__cplusplus)
+#define ZB_CXX_VERSION __cplusplus
+#endif
+#if defined(ZB_CXX_VERSION) && ZB_CXX_VERSION < 202002L
+#error "zor_basis requires C++20: compile with -std=c++20 (MSVC: /std:c++20)"
+#endif
 
 #if defined(_MSC_VER)
 #if defined(ZB_BUILDING)

@@ -1,5 +1,8 @@
 #!/usr/bin/env python3
-"""Every public header compiles alone and twice, with each compiler; headers that say "Valid C" also compile as C."""
+"""Every public header compiles alone and twice, with each compiler; headers that say "Valid C" also compile as C. In
+C++17 a header that does not compile names C++20 first."""
+
+import re
 
 import common
 
@@ -37,9 +40,19 @@ def check(job):
     return [] if result.returncode == 0 else [f"{path} with {compiler[0]}:\n{result.stderr}"]
 
 
+def check_older(job):
+    path, compiler = job
+    command = [compiler[0], "-std=c++17", "-Wfatal-errors", *INCLUDES, "-fsyntax-only", "-x", "c++", "-"]
+    result = common.run(*command, input=f'#include "{name(path)}"\n')
+    first = re.search("error: .*", result.stderr)
+    return [] if not first or "C++20" in first[0] else [f"{path} with {compiler[0]}, C++17: {first[0]}"]
+
+
 public = [h for h in headers if "windows_api" not in str(h)]
 jobs = [(h, c, "c++") for h in public for c in CXX] + [(h, c, "c") for h in public if is_valid_c(h) for c in C]
-problems = [line for found in common.in_parallel(check, jobs) for line in found]
+older = [(h, c) for h in public if not is_valid_c(h) for c in CXX]
+problems = [line for found in common.in_parallel(check, jobs) + common.in_parallel(check_older, older)
+            for line in found]
 if not any(is_valid_c(h) and h.name == "flat.h" for h in public):
     problems.append("include/zor_basis/flat.h does not say that it is valid C")
-common.finish("headers", problems, len(jobs))
+common.finish("headers", problems, len(jobs) + len(older))

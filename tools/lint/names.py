@@ -8,7 +8,7 @@ import common
 
 COLUMNS = 120
 # Data, made by programs or by the systems they are to be compared with.
-DATA = (".inc", ".bin", ".png", ".def", ".map", ".txt")
+DATA = (".inc", ".bin", ".png", ".def", ".map", ".txt", ".gz")
 # Names that the interface gives.
 GIVEN = {"Binary", "Continue", "Mutex", "SizeWChar", "StopOnError", "_CurName", "_ExtRip", "_GlbTmp", "_Level", "_Sem",
          "_freq", "slashBad", "slashGood"}

@@ -20,6 +20,8 @@
 #ifndef ZOR_BASIS_CONTAINERS_SNG_LIST_H
 #define ZOR_BASIS_CONTAINERS_SNG_LIST_H
 
+#include "zor_basis/export.h"
+
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>

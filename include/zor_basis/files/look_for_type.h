@@ -4,6 +4,8 @@
 #ifndef ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
 #define ZOR_BASIS_FILES_LOOK_FOR_TYPE_H
 
+#include "zor_basis/export.h"
+
 #include <cstdint>
 
 namespace ZOR_Basis {

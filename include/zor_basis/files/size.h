@@ -4,6 +4,8 @@
 #ifndef ZOR_BASIS_FILES_SIZE_H
 #define ZOR_BASIS_FILES_SIZE_H
 
+#include "zor_basis/export.h"
+
 #include <concepts>
 #include <cstdint>
 #include <functional>

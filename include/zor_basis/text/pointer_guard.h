@@ -7,6 +7,8 @@
 #ifndef ZOR_BASIS_TEXT_POINTER_GUARD_H
 #define ZOR_BASIS_TEXT_POINTER_GUARD_H
 
+#include "zor_basis/export.h"
+
 #include <compare>
 #include <type_traits>
 
