@@ -31,7 +31,7 @@ public:
         --count_;
     }
 
-    /// \return the first node, which is no longer in the list; null without any
+    /// \return the first node, which is no longer in the list; null if there was none
     Node* takeFirst() {
         Node* const node = first_;
         if (node == nullptr) return nullptr;

@@ -7,7 +7,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// The service counts with 32 bits.
+/// The service takes lengths of 32 bits.
 constexpr std::uint64_t LARGEST_PIECE = std::uint64_t{1} << 30;
 
 bool exportTo(Blob& out, CryptService::Handle key) {

@@ -10,11 +10,11 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr std::uint64_t MOST = std::numeric_limits<std::uint32_t>::max();
-/// The service counts with 32 bits.
+/// The service takes lengths of 32 bits.
 constexpr std::uint64_t LARGEST_ENCRYPTED = MOST - MOST % CRYPT_BLOCK;
 constexpr std::uint64_t LARGEST_PLAIN = LARGEST_ENCRYPTED - 1;
 
-/// Makes room in `out` and brings the message there, unless it is there already.
+/// Makes room in `out` and copies the message into it, unless it is there already.
 bool bring(Blob const& in, Blob& out, std::uint64_t room) {
     bool const inPlace = &in == &out;
     out.alloc(room, inPlace);
@@ -34,7 +34,7 @@ CrKeyWin::~CrKeyWin() {
 bool CrKeyWin::encrypt(Blob const& in, Blob& out) {
     if (in.size() > LARGEST_PLAIN) return false;
     std::uint32_t n = static_cast<std::uint32_t>(in.size());
-    // Where the service does not tell, the call below fails for want of room, if there is none.
+    // If the service does not tell the length, the call below fails when there is too little room.
     cryptService.encrypt(key_, nullptr, n, 0);
     if (!bring(in, out, n) || out.buf() == nullptr) return false;
     n = static_cast<std::uint32_t>(out.size());

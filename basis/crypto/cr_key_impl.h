@@ -11,7 +11,7 @@ namespace ZOR_Basis {
 
 class CrKeyWin final : public CrKey {
 public:
-    /// Derives the key of what a hash holds.
+    /// Derives the key from a hash.
     CrKeyWin(CryptService::Handle provider, CryptService::Handle hash) {
         cryptService.deriveKey(provider, hash, NOT_EXPORTABLE, key_);
     }

@@ -10,10 +10,10 @@
 namespace ZOR_Basis {
 namespace {
 
-/// Says why, where a debugger finds it.
+/// Reports the reason to a debugger.
 void describeFailure() {
     BufStr<255> text("CryptWin(): CryptAcquireContext() failed. Error: ");
-    // kept crypto-03: callers probe for the service, so a missing one is no news for a log.
+    // kept crypto-03: callers probe for the service, so a missing one is not logged.
     text << cryptService.lastError();
 }
 
@@ -24,7 +24,7 @@ void describeFailure() {
 Crypt::~Crypt() = default;
 
 Crypt* Crypt::make(char const*) {
-    // kept crypto-01: whatever the name, it is this one.
+    // kept crypto-01: the name is ignored; it is always this provider.
     return new (std::nothrow) CryptWin;
 }
 

@@ -20,10 +20,10 @@ using Handle = CryptService::Handle;
 
 static_assert(CRYPT_BLOCK == ARCTWO_BLOCK_SIZE);
 
-/// There is nothing to be had or to be kept for a provider.
+/// A provider has no state.
 constexpr Handle PROVIDER = 1;
 
-/// The whole digest makes the key.
+/// The key is the whole digest.
 constexpr std::uint32_t KEY_LENGTH = MD5_DIGEST_SIZE;
 
 struct Hash {
@@ -133,7 +133,7 @@ bool encrypt(Handle handle, char* data, std::uint32_t& n, std::uint32_t room) {
     return true;
 }
 
-/// Whether a message ends in 1 to 8 bytes that say how many they are.
+/// Whether a message ends in 1 to 8 bytes of padding, each of which is their number.
 bool endsInPadding(std::uint8_t const* bytes, std::uint32_t n) {
     std::uint8_t const padding = bytes[n - 1];
     if (padding == 0 || padding > CRYPT_BLOCK) return false;

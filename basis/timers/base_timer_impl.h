@@ -8,7 +8,7 @@
 
 namespace ZOR_Basis {
 
-/// The ticks per second of an answer, after a complaint if they are not known.
+/// Extracts the ticks per second from an answer; complains if they are unknown.
 std::int64_t checkedFrequency(PerformanceCounter::Frequency const& answer);
 
 } // namespace ZOR_Basis

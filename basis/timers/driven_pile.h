@@ -9,9 +9,9 @@
 
 namespace ZOR_Basis {
 
-/// None while its manager is inactive.
+/// Null while its manager is inactive.
 inline PileTimer* drivenPile(PileTimer* pile, TimerMgr const* manager) {
-    // kept timers-12: the answer of this moment is all that a scope timer keeps.
+    // kept timers-12: a scope timer keeps what it is told at this moment, and nothing else.
     return manager == nullptr || manager->active() ? pile : nullptr;
 }
 

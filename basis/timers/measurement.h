@@ -10,7 +10,7 @@
 namespace ZOR_Basis::Measurement {
 
 inline void suspend(zbTimerDat& record) {
-    // kept timers-02: whether the timer runs is not asked.
+    // kept timers-02: this does not check whether the timer runs.
     if (record.suspendStart == 0) record.suspendStart = PerformanceCounter::now();
 }
 
@@ -25,7 +25,7 @@ inline void resume(zbTimerDat& record) {
     record.suspendStart = 0;
 }
 
-/// Ends the measurement and its suspension at one reading; the record keeps them.
+/// Ends the measurement, and an open suspension, at the same reading of the counter.
 inline void finish(zbTimerDat& record) {
     record.stop = PerformanceCounter::now();
     if (record.suspendStart <= 0) return;

@@ -51,7 +51,7 @@ void PileTimer::resume() {
 }
 
 void PileTimer::stop() {
-    // kept timers-04: "start()" it says.
+    // kept timers-04: the message says "start()".
     if (checks_ && !started()) complain(LINE_STOP, "PileTimer::start() : not started");
     BaseTimer::stop(this);
 }

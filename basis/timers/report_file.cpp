@@ -11,7 +11,7 @@
 namespace ZOR_Basis {
 namespace {
 
-// kept timers-08: a report appends to what a report of the same second left.
+// kept timers-08: a report is appended to an earlier one of the same second.
 constexpr int MODE = File::FILE_WRITE | File::FILE_APPEND | File::FILE_SEQUENTIAL | File::FILE_PLATFORM_EXTRA;
 static_assert(MODE == 0x226);
 
@@ -43,7 +43,7 @@ ReportFile::ReportFile(FPath const& folder, Str const& manager, std::int32_t rip
     line_ << seconds << "_" << manager << "_" << rip << ".timer";
     FPath path(folder);
     path.add(line_);
-    // The folder was made with the registry. A server that cleans up its root takes it away again.
+    // The folder was made with the registry. A server that cleans up its root may have removed it since.
     Dir::New(folder.c_str(), WITHOUT_PARENTS);
     if (!file_.open(path.c_str(), MODE, WITHOUT_CREATE_FLAG)) complainOf(path);
     writeHead(seconds);

@@ -1,5 +1,5 @@
 /// \file
-/// How one timer's row of a report looks.
+/// The layout of one timer's row in a report.
 
 #ifndef BASIS_TIMERS_REPORT_ROW_H
 #define BASIS_TIMERS_REPORT_ROW_H
@@ -18,7 +18,7 @@ struct Values {
     std::int64_t suspendTotal = 0, suspendMaximum = 0;
 };
 
-/// Ticks in another unit, cut towards zero. Only a result beyond 64 bits overflows, and then it wraps.
+/// Converts ticks to another unit, rounding towards zero. Only a result beyond 64 bits overflows; it wraps.
 std::int64_t convert(std::int64_t ticks, int unitsPerSecond, std::int64_t frequency);
 
 /// Names for `terminating`.

@@ -10,7 +10,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// Memory that runs short ends the program, here and below.
+/// Lack of memory ends the program, here and below.
 TimerMgrImpl* makeManager(char const* name, std::uint64_t maxId) noexcept { return new TimerMgrImpl(name, maxId); }
 TimerMgrMgr* makeRegistry() noexcept { return new TimerMgrMgr; }
 

@@ -11,7 +11,7 @@
 namespace ZOR_Basis {
 namespace {
 
-/// Memory that runs short ends the program.
+/// Lack of memory ends the program.
 PileTimer* makeTimer(char const* name, bool forThreads) noexcept {
     if (forThreads) return new PileTimerMT(name, WITH_CHECKS);
     return new PileTimer(name, WITH_CHECKS);
@@ -57,7 +57,7 @@ PileTimer* TimerMgrImpl::getTimer(std::uint64_t id) { return timers_.find(id); }
 
 void TimerMgrImpl::resetTimers(bool print) {
     HeldSemaphore const held(lock_);
-    // kept timers-10: what cannot be written is cleared all the same.
+    // kept timers-10: timers that cannot be written are cleared, too.
     if (!print) return forEach([](PileTimer& timer) { timer.reset(); });
     TimerMgrMgr const& registry = *TimerMgr::Mgr();
     ReportFile report(registry.dir(), name_, registry.rip());

@@ -24,7 +24,7 @@ public:
     TimerMgrMgr& operator=(TimerMgrMgr const&) = delete;
 
     void add(TimerMgrImpl* manager);
-    /// The first manager, in the order of their making, that `fits`; null if none does.
+    /// The first manager, in creation order, for which `fits` is true; null if there is none.
     template <class Fits>
     TimerMgrImpl* find(Fits fits) const {
         HeldSemaphore const held(lock_);

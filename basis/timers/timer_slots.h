@@ -19,7 +19,7 @@ class TimerSlots final : public PtrArray<PileTimer> {
 public:
     using PtrArray::PtrArray;
 
-    /// What was written to the timer before comes with it.
+    /// Everything written to the timer before is visible to whoever reads the slot.
     void put(PileTimer* timer, std::uint64_t id) {
         if (id < count_) {
             std::atomic_ref(slots_[id]).store(timer, std::memory_order_release);
@@ -28,7 +28,7 @@ public:
         }
     }
 
-    /// \return null at the size and beyond, too
+    /// \return also null at an index of the size or more
     PileTimer* find(std::uint64_t id) const {
         return id < count_ ? std::atomic_ref(slots_[id]).load(std::memory_order_acquire) : nullptr;
     }
