@@ -46,13 +46,13 @@ extern "C" __attribute__((visibility("default"))) void* dlopen(char const* name,
     return next(name, mode);
 }
 
-TEST(HostCurlLibrary, is_loaded_when_it_is_needed_and_asked_for_again_if_it_was_missing) {
+TEST(HostCurlLibraryPosix, is_loaded_when_it_is_needed_and_asked_for_again_if_it_was_missing) {
     // In a process of its own, as this one may have loaded it already.
     GTEST_FLAG_SET(death_test_style, "threadsafe");
     EXPECT_EXIT(std::exit(firstFetches()), testing::ExitedWithCode(0), "");
 }
 
-TEST(HostCurlLibrary, is_loaded_once_for_all_threads) {
+TEST(HostCurlLibraryPosix, is_loaded_once_for_all_threads) {
     host::CurlLibrary const* seen[8] = {};
     std::thread threads[8];
     for (int i = 0; i < 8; ++i) threads[i] = std::thread([&seen, i] { seen[i] = host::curlLibrary(); });
