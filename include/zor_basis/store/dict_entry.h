@@ -41,15 +41,19 @@ public:
 
 static_assert(sizeof(DictEntry<Blob, Blob>) == 2 * sizeof(Blob));
 
+namespace detail {
+
 /// A dictionary has to know when others may have changed its entries.
 template <class K, class V>
-struct detail::UnitCount<DictEntry<K, V>> {
+struct UnitCount<DictEntry<K, V>> {
     std::uint64_t number = 0;
     mutable bool isExposed = false;
 
     void noteExposure() const { isExposed = true; }
     void endExposure() const { isExposed = false; }
 };
+
+} // namespace detail
 
 } // namespace ZOR_Basis
 
