@@ -25,8 +25,8 @@ endfunction()
 
 set(zb_library libzor-basis${PROJECT_VERSION_MAJOR})
 set(zb_same_version "${PROJECT_VERSION}-${CPACK_DEBIAN_PACKAGE_RELEASE}")
-# libcurl is loaded by name, which dpkg-shlibdeps cannot see.
-zb_debian_package(library ${zb_library} SECTION libs DEPENDS "libcurl4 | libcurl4t64"
+# libcurl is loaded by name when it is first needed, so dpkg-shlibdeps does not see it.
+zb_debian_package(library ${zb_library} SECTION libs DEPENDS "libcurl4 (>= 7.85) | libcurl4t64"
   DESCRIPTION "Strings with inline buffers, wide text, containers, paths, files, tree walks,
 timers, locks, a job queue, logs, processes and cryptography, and the
 stand-alone platform layer that they run on without a print server.")

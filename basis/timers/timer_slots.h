@@ -19,7 +19,7 @@ class TimerSlots final : public PtrArray<PileTimer> {
 public:
     using PtrArray::PtrArray;
 
-    /// Everything written to the timer before is visible to whoever reads the slot.
+    /// Everything written to the timer before is visible to a thread that reads the slot.
     void put(PileTimer* timer, std::uint64_t id) {
         if (id < count_) {
             std::atomic_ref(slots_[id]).store(timer, std::memory_order_release);

@@ -1,5 +1,5 @@
-// The main function of benchmarks that hold the library's objects: kernels use no vectors above those that BENCH_VECTORS
-// names, one of sse2, ssse3 and avx2.
+// The main function of benchmarks that hold the library's objects: kernels use no vectors above those that the variable
+// BENCH_VECTORS names, one of sse2, ssse3 and avx2.
 
 #include "basis/ground/processor.h"
 

@@ -31,7 +31,7 @@ CLASSES = ("class_type", "structure_type", "union_type")
 PARTS = ("member", "inheritance", "subprogram")
 # A class that a public header defines.
 DEFINITION = re.compile(
-    r"^(?:template <[^>]*>\n)?(?:requires.*\) )?(?:class|struct)(?: ZB_API)? (?!std\b)(\w+)[^;{]*\{", re.M)
+    r"^(?:template <[^>]*>\n)?(?:requires.*\) )?(?:class|struct)(?: ZB_API)? (?!\w+::)(\w+)[^;{]*\{", re.M)
 
 
 class Entry:
