@@ -14,7 +14,7 @@ import common
 
 BUILD = common.ROOT / "build/linux"
 ROOMS = ("basis", "host", "examples")
-# The analyzer stops at a third of its usual number of steps. It takes new lines first; what is left repeats them mostly.
+# The analyzer stops at a third of its usual number of steps. It takes new lines first; the rest mostly repeats them.
 OPTIONS = ["--quiet", "--extra-arg=-Wno-unknown-warning-option", "--extra-arg=-Xclang", "--extra-arg=-analyzer-config",
            "--extra-arg=-Xclang", "--extra-arg=max-nodes=75000"]
 
