@@ -22,14 +22,14 @@ function(zb_room target)
   target_sources(${target} PRIVATE ${files})
 endfunction()
 
-# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LONG_RUNS <files>] [LIBRARIES <targets>] [TIMEOUT <s>] [THREADED]):
-# a room's tests.
+# zb_tests(<room> EXPORTED <files> INTERNAL <files> [LONG_RUNS <files>] [LIBRARIES <targets>] [RUNS <s>] [TIMEOUT <s>]
+# [THREADED]): a room's tests.
 # The EXPORTED ones use nothing but the public headers and go into exported_tests, which links the shared library. The
 # INTERNAL ones make the program <room>_tests, which holds the library's objects and may see internal headers. Under a
 # sanitizer all of them do. LONG_RUNS are those of both that run longer than they compile. THREADED marks a program that
 # the thread sanitizer shall watch.
 function(zb_tests room)
-  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "RUNS;TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
   zb_optimised_tests(${ARG_LONG_RUNS})
   zb_joined_tests(${room}_exported ${ARG_EXPORTED})
   zb_joined_tests(${room}_internal ${ARG_INTERNAL})
@@ -46,7 +46,7 @@ function(zb_tests room)
   if(ARG_THREADED)
     set(threaded THREADED)
   endif()
-  zb_test_program(${room}_tests TIMEOUT ${ARG_TIMEOUT} ${threaded})
+  zb_test_program(${room}_tests RUNS ${ARG_RUNS} TIMEOUT ${ARG_TIMEOUT} ${threaded})
 endfunction()
 
 # zb_optimised_tests(<files>): excepts files of the calling folder from `zb_quickly_compiled`.
@@ -88,16 +88,28 @@ function(zb_quickly_compiled target)
   endif()
 endfunction()
 
-# zb_test_program(<target> [ARGUMENTS <words>] [TIMEOUT <s>] [THREADED]): registers one test program, run as a whole.
+# zb_quickly_linked(<target>): links a program that is only tested with lld, if there is one. The linker of mingw-w64
+# needs half a minute for the largest.
+function(zb_quickly_linked target)
+  if(MINGW AND ZB_QUICK_LINKER)
+    set_target_properties(${target} PROPERTIES RULE_LAUNCH_LINK ${PROJECT_SOURCE_DIR}/cmake/windows/link-quickly)
+  endif()
+endfunction()
+
+# zb_test_program(<target> [ARGUMENTS <words>] [RUNS <s>] [TIMEOUT <s>] [THREADED]): registers one test program, run as
+# a whole. RUNS says for how long, where that is long.
 function(zb_test_program target)
-  cmake_parse_arguments(ARG "THREADED" "TIMEOUT" "ARGUMENTS" ${ARGN})
+  cmake_parse_arguments(ARG "THREADED" "RUNS;TIMEOUT" "ARGUMENTS" ${ARGN})
   if(NOT ARG_TIMEOUT)
     set(ARG_TIMEOUT 600)
   endif()
   add_test(NAME ${target} COMMAND ${target} ${ARG_ARGUMENTS})
-  # The largest programs start first, so that all processors are done at about the same time.
+  # The longest runs start first, then the largest programs, so that all processors are done at about the same time.
   get_target_property(files ${target} SOURCES)
   list(LENGTH files cost)
+  if(ARG_RUNS)
+    math(EXPR cost "1000 + ${ARG_RUNS}")
+  endif()
   set_tests_properties(${target} PROPERTIES TIMEOUT ${ARG_TIMEOUT} COST ${cost})
   if(ARG_THREADED)
     set_tests_properties(${target} PROPERTIES LABELS threads)
@@ -109,6 +121,7 @@ function(zb_test_program target)
   get_target_property(libraries ${target} LINK_LIBRARIES)
   if("zb_test_support" IN_LIST libraries)
     zb_quickly_compiled(${target})
+    zb_quickly_linked(${target})
     if(ZB_JOINED_TESTS)
       set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
       if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")

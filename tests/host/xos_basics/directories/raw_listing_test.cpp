@@ -135,10 +135,11 @@ TEST(HostListing, has_nothing_on_no_handle) {
 TEST(HostListing, gives_every_name_of_a_large_folder_once) {
     Scratch const scratch;
     Names all;
-    for (int i = 0; i < 5'000; ++i) { all.insert("entry with a fairly long name number " + std::to_string(i)); }
+    // Several times what one call of the system returns. Under Wine the time grows with the square.
+    for (int i = 0; i < 1'500; ++i) { all.insert("entry with a fairly long name number " + std::to_string(i)); }
     for (std::string const& name : all) { put(scratch / name, ""); }
     EXPECT_EQ(listed(scratch.path()), all);
-    EXPECT_EQ(listed(scratch.path(), "*99", FILES).size(), 50U);
+    EXPECT_EQ(listed(scratch.path(), "*99", FILES).size(), 15U);
 }
 
 TEST(HostListing, keeps_a_name_until_the_next_call_on_its_handle) {

@@ -1,6 +1,7 @@
 // Removal while somebody exchanges directories for links that lead out of the tree.
 
 #include "basis/platform/xos_basics.h"
+#include "tests/support/memory_folder_posix.h"
 #include "tests/support/random_steps.h"
 #include "tests/support/scratch.h"
 
@@ -60,13 +61,13 @@ void makeTree(std::string const& top) {
 
 TEST(HostRemovalPosix, never_touches_anything_outside_whatever_is_exchanged) {
     // In memory, where the exchanges come thick and fast.
-    Scratch const scratch{::access("/dev/shm", W_OK) == 0 ? "/dev/shm" : std::filesystem::temp_directory_path()};
+    Scratch const scratch{memoryFolder()};
     makeTree(scratch / "outside");
     for (char const* name : {"a", "a/b", "x", "d"}) { makeFolder(scratch / (std::string{"outside/"} + name)); }
     Names const before = scratch.content("outside");
     Swapper swapper{scratch / "top", scratch / "outside"};
     int removed = 0;
-    int const rounds = static_cast<int>(randomSteps(10'000));
+    int const rounds = static_cast<int>(randomSteps(4'000));
     for (int round = 0; round < rounds; ++round) {
         // Made under another name, as making it could follow the links.
         makeTree(scratch / "new");

@@ -1,6 +1,7 @@
 // Trees deeper than any path can say, with few descriptors.
 
 #include "basis/platform/xos_basics.h"
+#include "tests/support/memory_folder_posix.h"
 #include "tests/support/scratch.h"
 
 #include <gtest/gtest.h>
@@ -12,7 +13,7 @@
 
 namespace {
 
-constexpr int LEVELS = 5'000;
+constexpr int LEVELS = 2'500; // two bytes of a path each, and a path has at most 4,096
 
 struct DescriptorLimit {
     explicit DescriptorLimit(rlim_t most) {
@@ -57,7 +58,7 @@ int depthOf(std::string const& top) {
 } // namespace
 
 TEST(HostDeepTreePosix, is_copied_moved_and_removed) {
-    Scratch const scratch;
+    Scratch const scratch{memoryFolder()};
     ASSERT_TRUE(makeDeep(scratch / "deep"));
     {
         DescriptorLimit const limit{100};
@@ -72,7 +73,7 @@ TEST(HostDeepTreePosix, is_copied_moved_and_removed) {
 }
 
 TEST(HostDeepTreePosix, leaves_nothing_when_its_copy_fails_at_the_bottom) {
-    Scratch const scratch;
+    Scratch const scratch{memoryFolder()};
     ASSERT_TRUE(makeDeep(scratch / "deep"));
     makeFolder(scratch / "to");
     put(scratch / "to/f", "");

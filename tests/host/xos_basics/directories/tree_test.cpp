@@ -134,7 +134,7 @@ TEST(HostDirectoryRemove, removes_many_entries_and_levels) {
     std::string folder = scratch / "top";
     for (int level = 0; level < 60; ++level) {
         makeFolder(folder);
-        for (int i = 0; i < 10; ++i) { put(folder + "/file" + std::to_string(i), "x"); }
+        for (int i = 0; i < 4; ++i) { put(folder + "/file" + std::to_string(i), "x"); }
         makeFolder(folder + "/side/more");
         folder += "/n";
     }
@@ -352,7 +352,7 @@ TEST(HostDirectoryMove, onto_itself_loses_nothing) {
 
 TEST(HostDirectoryCopy, gives_what_it_was_given_for_random_trees) {
     std::mt19937_64 random = randomSource();
-    std::uint64_t const trees = randomSteps(6);
+    std::uint64_t const trees = randomSteps(3);
     for (std::uint64_t tree = 0; tree < trees; ++tree) {
         SCOPED_TRACE(tree);
         Scratch const scratch;
