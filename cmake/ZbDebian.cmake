@@ -19,8 +19,10 @@ function(zb_debian_package component package)
   set(CPACK_DEBIAN_${name}_PACKAGE_SECTION ${ARG_SECTION} PARENT_SCOPE)
   set(CPACK_DEBIAN_${name}_PACKAGE_DEPENDS "${ARG_DEPENDS}" PARENT_SCOPE)
   set(CPACK_COMPONENT_${name}_DESCRIPTION "${ARG_DESCRIPTION}" PARENT_SCOPE)
-  install(FILES ${PROJECT_SOURCE_DIR}/cmake/package/copyright ${PROJECT_BINARY_DIR}/changelog.Debian.gz
-    DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/doc/${package} COMPONENT ${component})
+  if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+    install(FILES ${PROJECT_SOURCE_DIR}/cmake/package/copyright ${PROJECT_BINARY_DIR}/changelog.Debian.gz
+      DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/doc/${package} COMPONENT ${component})
+  endif()
 endfunction()
 
 set(zb_library libzor-basis${PROJECT_VERSION_MAJOR})
