@@ -165,8 +165,8 @@ struct Taken {
 };
 
 /// Converts the first `count` units of a block, the others being zeros; of eight not a pair's first half at the end.
-ZB_SSSE3 inline Taken storeUtf8(__m128i block, Lengths const& lengths, unsigned bitsOfLengths, unsigned count,
-                                char* out) {
+ZB_SSSE3 ZB_INLINE Taken storeUtf8(__m128i block, Lengths const& lengths, unsigned bitsOfLengths, unsigned count,
+                                   char* out) {
     if (areAllOneOrTwo(bitsOfLengths)) {
         std::uint64_t const behind = BLOCK_UNITS - count;
         return {count, storeShort(block, lengths, bitsOfLengths & 0xFF, out) - behind};

@@ -177,8 +177,13 @@ ZB_SSSE3 ZB_INLINE bool takeBlocks(Progress& progress) {
         __m128i const block = load16(progress.text);
         Lengths const lengths(block);
         unsigned const bits = lengths.bits();
-        isAsciiNext = areAllOne(bits) && std::min(progress.left(), progress.room()) >= ASCII_STEP;
-        if (isAsciiNext || !takeBlock(progress, block, lengths, bits, BLOCK_UNITS)) break;
+        if (areAllOneOrTwo(bits) && !areAllOne(bits) && progress.room() >= BLOCK_BYTES) {
+            // As `takeBlock` does, but a loop of this alone is a third faster.
+            progress.advance(BLOCK_UNITS, storeShort(block, lengths, bits & 0xFF, progress.out));
+        } else {
+            isAsciiNext = areAllOne(bits) && std::min(progress.left(), progress.room()) >= ASCII_STEP;
+            if (isAsciiNext || !takeBlock(progress, block, lengths, bits, BLOCK_UNITS)) break;
+        }
         zeros = _mm_or_si128(zeros, zeroUnits(block));
     }
     progress.hasZero |= bitsOf(zeros) != 0;
