@@ -61,7 +61,7 @@ inline Places<std::uint32_t> placesOf(__m128i a, __m128i b) noexcept {
 /// How much of two texts may be read before anything is known about their bytes.
 struct GivenPair {
     static bool readable(char const* a, char const* b, std::uint64_t length) noexcept {
-        return inOnePage(a, length) && inOnePage(b, length);
+        return length <= PAGE_BYTES && inOnePage(a, length) && inOnePage(b, length);
     }
 };
 struct OwnedPair {

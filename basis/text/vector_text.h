@@ -28,7 +28,7 @@ namespace ZOR_Basis::detail {
 
 constexpr std::uint64_t PAGE_BYTES = 4096;
 
-/// Whether so many bytes surely lie in the page of the first one. Never for null.
+/// Whether so many bytes, at most a page, surely lie in the page of the first one. Never for null.
 inline bool inOnePage(void const* text, std::uint64_t length) noexcept {
     return length < PAGE_BYTES &&
            ((reinterpret_cast<std::uintptr_t>(text) - 1) & (PAGE_BYTES - 1)) < PAGE_BYTES - length;
