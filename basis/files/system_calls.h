@@ -26,10 +26,6 @@ enum SystemError : std::uint32_t {
 };
 
 struct SystemCalls {
-    /// A folder whose entries can be examined by their names alone.
-    using Folder = std::int64_t;
-    static constexpr Folder NO_FOLDER = -1;
-
     /// Status by a narrow path; on Linux of a link itself.
     /// \return whether there is an entry
     bool (*status)(char const* path, xos_Stat& record);
@@ -37,12 +33,6 @@ struct SystemCalls {
     bool (*statusOfTarget)(char const* path, xos_Stat& record);
     /// Status by a wide path, following links.
     bool (*statusWide)(WChar const* path, xos_Stat& record);
-    /// \return NO_FOLDER also where the system has no such thing
-    Folder (*openFolder)(char const* path);
-    /// The status that `status` gives for an entry of an open folder.
-    /// \return false also where only `status` can tell
-    bool (*statusIn)(Folder folder, char const* name, xos_Stat& record);
-    void (*closeFolder)(Folder folder);
     bool (*makeDirectoryWide)(WChar const* path);
     /// The streams of the runtime library; the mode is text that they understand.
     std::FILE* (*openStream)(char const* path, char const* mode);

@@ -4,15 +4,11 @@
 
 #include "basis/files/os_path_posix.h"
 
-#include <fcntl.h>
-#include <limits.h>
 #include <sys/stat.h>
 #include <time.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
-#include <cstring>
 #include <limits>
 
 namespace ZOR_Basis {
@@ -62,23 +58,6 @@ bool statusWide(WChar const* path, xos_Stat& record) {
     return true;
 }
 
-/// Not one so deep that the path of an entry might be longer than the system takes.
-SystemCalls::Folder openFolder(char const* path) {
-    if (std::strlen(path) + 1 + NAME_MAX >= PATH_MAX) return SystemCalls::NO_FOLDER;
-    return open(OsPath(path), O_PATH | O_DIRECTORY | O_CLOEXEC);
-}
-
-bool statusIn(SystemCalls::Folder folder, char const* name, xos_Stat& record) {
-    // A backslash in a name is a slash for the library, and the path leads elsewhere.
-    if (std::strchr(name, '\\') != nullptr) return false;
-    struct stat found;
-    if (fstatat(static_cast<int>(folder), name, &found, AT_SYMLINK_NOFOLLOW) != 0) return false;
-    copyRecord(found, record);
-    return true;
-}
-
-void closeFolder(SystemCalls::Folder folder) { close(static_cast<int>(folder)); }
-
 bool makeDirectoryWide(WChar const* path) { return mkdir(OsPath(path), 0777) == 0; }
 
 std::FILE* openStream(char const* path, char const* mode) { return std::fopen(OsPath(path), mode); }
@@ -126,7 +105,7 @@ std::uint64_t tick() {
 
 } // namespace
 
-SystemCalls systemCalls{status,     statusOfTarget, statusWide, openFolder, statusIn, closeFolder, makeDirectoryWide,
-                        openStream, openStreamWide, lastError,  sleepMs,    tick};
+SystemCalls systemCalls{status,    statusOfTarget, statusWide, makeDirectoryWide, openStream, openStreamWide,
+                        lastError, sleepMs,        tick};
 
 } // namespace ZOR_Basis

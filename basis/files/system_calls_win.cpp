@@ -51,10 +51,6 @@ bool statusWide(wchar_t const* path, xos_Stat& record) {
     return true;
 }
 
-SystemCalls::Folder openFolder(char const*) { return SystemCalls::NO_FOLDER; }
-bool statusIn(SystemCalls::Folder, char const*, xos_Stat&) { return false; }
-void closeFolder(SystemCalls::Folder) {}
-
 bool makeDirectoryWide(wchar_t const* path) {
     return told([=] { return _wmkdir(path) == 0; });
 }
@@ -77,7 +73,7 @@ std::uint64_t tick() { return GetTickCount64(); }
 
 } // namespace
 
-SystemCalls systemCalls{status,     status,         statusWide, openFolder, statusIn, closeFolder, makeDirectoryWide,
-                        openStream, openStreamWide, lastError,  sleepMs,    tick};
+SystemCalls systemCalls{status,    status,  statusWide, makeDirectoryWide, openStream, openStreamWide,
+                        lastError, sleepMs, tick};
 
 } // namespace ZOR_Basis

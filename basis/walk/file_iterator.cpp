@@ -4,7 +4,6 @@
 #include "basis/files/platform_flags.h"
 #include "basis/ground/choices.h"
 #include "basis/platform/xos_basics.h"
-#include "basis/walk/passed_over.h"
 #include "zor_basis/files/f_stat.h"
 
 namespace ZOR_Basis {
@@ -18,6 +17,11 @@ constexpr Kind WALKED[] = {DIRECTORIES, FILES, DIRECTORIES, EVERYTHING};
 constexpr Kind LISTED[] = {EVERYTHING, FILES, DIRECTORIES, EVERYTHING};
 
 Kind kindOf(Kind const (&table)[4], LookForType type) { return table[type & LOOK_BOTH]; }
+
+bool isPassedOver(char const* name) {
+    // kept walk-03: the folder that another system leaves beside the files of a job does not belong to it.
+    return xos_StrCmp(name, "__MACOS") == 0;
+}
 
 FileEntry entryOf(FPath const& dir, char const* name, bool platformFallback) {
     FStat const status(FPath(dir, name), platformFallback);
