@@ -16,10 +16,42 @@ function(zb_files variable folder)
   set(${variable} ${files} PARENT_SCOPE)
 endfunction()
 
-# zb_room(<target> SOURCES <files> TWINS <stems>): adds sources of the calling folder to a target.
+# zb_room(<target> SOURCES <files> TWINS <stems> [ALONE <files>]): adds sources of the calling folder to a target. Those
+# after ALONE are never compiled together with others.
 function(zb_room target)
-  zb_files(files ${CMAKE_CURRENT_SOURCE_DIR} ${ARGN})
+  cmake_parse_arguments(ARG "" "" "ALONE" ${ARGN})
+  zb_files(files ${CMAKE_CURRENT_SOURCE_DIR} ${ARG_UNPARSED_ARGUMENTS})
   target_sources(${target} PRIVATE ${files})
+  if(ARG_ALONE)
+    zb_files(alone ${CMAKE_CURRENT_SOURCE_DIR} SOURCES ${ARG_ALONE})
+    target_sources(${target} PRIVATE ${alone})
+  endif()
+  if(ZB_JOINED)
+    file(RELATIVE_PATH name ${PROJECT_SOURCE_DIR} ${CMAKE_CURRENT_SOURCE_DIR})
+    string(MAKE_C_IDENTIFIER ${name} name)
+    get_target_property(folder ${target} SOURCE_DIR)
+    zb_joined(${name} FOLDERS ${folder} FILES ${files})
+    set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
+  endif()
+endfunction()
+
+# zb_joined(<name> FOLDERS <folders> FILES <files>): has targets of the given folders that join files compile these
+# files together, some at a time. Those that include the system's headers keep to themselves.
+function(zb_joined name)
+  cmake_parse_arguments(ARG "" "" "FOLDERS;FILES" ${ARGN})
+  set(most 8)
+  set(portable ${ARG_FILES})
+  set(system ${ARG_FILES})
+  list(FILTER portable EXCLUDE REGEX "_(posix|win)[._]")
+  list(FILTER system INCLUDE REGEX "_(posix|win)[._]")
+  foreach(kind IN ITEMS portable system)
+    set(count 0)
+    foreach(file IN LISTS ${kind})
+      math(EXPR group "${count} / ${most}")
+      math(EXPR count "${count} + 1")
+      set_source_files_properties(${file} DIRECTORY ${ARG_FOLDERS} PROPERTIES UNITY_GROUP ${name}_${kind}_${group})
+    endforeach()
+  endforeach()
 endfunction()
 
 # zb_tests(<room> EXPORTED <files> INTERNAL <files> [LONG_RUNS <files>] [LIBRARIES <targets>] [RUNS <s>] [TIMEOUT <s>]
@@ -58,26 +90,12 @@ function(zb_optimised_tests)
   endif()
 endfunction()
 
-# zb_joined_tests(<name> <files>): compiles test files of the calling folder together, some at a time, if
-# ZB_JOINED_TESTS is on. Those that include Linux's headers keep to themselves; those for Windows stand alone, as they
+# zb_joined_tests(<name> <files>): joins test files of the calling folder. Those for Windows stand alone, as they
 # replace the same calls.
 function(zb_joined_tests name)
-  set(most 8)
   list(FILTER ARGN EXCLUDE REGEX "_win_test")
-  set(portable ${ARGN})
-  set(posix ${ARGN})
-  list(FILTER portable EXCLUDE REGEX "_posix_test")
-  list(FILTER posix INCLUDE REGEX "_posix_test")
-  foreach(kind IN ITEMS portable posix)
-    set(count 0)
-    foreach(file IN LISTS ${kind})
-      math(EXPR group "${count} / ${most}")
-      math(EXPR count "${count} + 1")
-      set_source_files_properties(${CMAKE_CURRENT_SOURCE_DIR}/${file}
-        DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
-        PROPERTIES UNITY_GROUP ${name}_${kind}_${group})
-    endforeach()
-  endforeach()
+  list(TRANSFORM ARGN PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
+  zb_joined(${name} FOLDERS ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests FILES ${ARGN})
 endfunction()
 
 # zb_quickly_compiled(<target>): optimises nothing, and in release builds describes only lines to the debugger. Tests
@@ -122,7 +140,7 @@ function(zb_test_program target)
   if("zb_test_support" IN_LIST libraries)
     zb_quickly_compiled(${target})
     zb_quickly_linked(${target})
-    if(ZB_JOINED_TESTS)
+    if(ZB_JOINED)
       set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
       if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
         # It warns of nameless namespaces in headers, and takes joined files for headers.

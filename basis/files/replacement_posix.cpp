@@ -19,7 +19,7 @@ namespace {
 /// The number of links that the system itself follows.
 constexpr int MOST_LINKS = 40;
 constexpr mode_t EVERYONE_READS_AND_WRITES = 0666;
-constexpr mode_t OWNER_READS_AND_WRITES = 0600;
+constexpr mode_t ONLY_OWNER_READS_AND_WRITES = 0600;
 
 bool failWith(int error) {
     errno = error;
@@ -99,7 +99,7 @@ Made makeBeside(char const* temporary, char const* target) {
             return Made::FAILED;
         }
     }
-    mode_t const mode = old.isOpen() ? OWNER_READS_AND_WRITES : EVERYONE_READS_AND_WRITES;
+    mode_t const mode = old.isOpen() ? ONLY_OWNER_READS_AND_WRITES : EVERYONE_READS_AND_WRITES;
     Descriptor const made(::open(temporary, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, mode));
     if (!made.isOpen()) return errno == EEXIST ? Made::NAME_TAKEN : Made::FAILED;
     if (old.isOpen()) keepAccess(old.get(), facts, made.get());

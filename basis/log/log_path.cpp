@@ -10,7 +10,7 @@ namespace ZOR_Basis {
 namespace {
 
 constexpr char FOLDER[] = "/scsi0/tmp/zb_log";
-constexpr int MOST_DIGITS = 20;
+constexpr int MOST_SESSION_DIGITS = 20;
 
 } // namespace
 
@@ -29,7 +29,7 @@ FPath makeLogFolder(Str const& log) {
 }
 
 FPath sessionFile(FPath const& folder, std::uint64_t session) {
-    char digits[MOST_DIGITS];
+    char digits[MOST_SESSION_DIGITS];
     char const* const end = std::to_chars(std::begin(digits), std::end(digits), session).ptr;
     FPath path(folder);
     path.add(digits, static_cast<std::uint64_t>(end - digits));

@@ -37,7 +37,7 @@ bool isOneOf(char const* const (&kinds)[N], Str const& kind) {
     return false;
 }
 
-struct Close {
+struct CloseTable {
     void operator()(std::FILE* table) const { endmntent(table); }
 };
 
@@ -92,7 +92,7 @@ FPath absolutePath(Str const& path) {
 }
 
 bool findMount(FPath const& path, Mount& mount) {
-    std::unique_ptr<std::FILE, Close> const table(setmntent(queryCalls.mountTable, "re"));
+    std::unique_ptr<std::FILE, CloseTable> const table(setmntent(queryCalls.mountTable, "re"));
     if (table == nullptr) return false;
     std::size_t longest = 0;
     mntent entry;

@@ -1,29 +1,31 @@
 #!/usr/bin/env python3
 """clang-tidy over what the library, the platform layer and the examples compile on Linux.
 
-A file that was clean is not read again until it changes, or a header of the project that it includes, its compiler's
-command or the checks do; --all reads every file.
+Sources that are compiled together are also read together. What was clean is not read again until it changes, or a
+header of the project that it includes, its compiler's command or the checks do; --all reads everything.
 """
 
 import hashlib
 import json
 import os
+import re
 from pathlib import Path
 
 import common
 
 BUILD = common.ROOT / "build/linux"
+OWN = BUILD / "tidy"
 ROOMS = ("basis", "host", "examples")
 # The analyzer stops at a third of its usual number of steps. It takes new lines first; the rest mostly repeats them.
 OPTIONS = ["--quiet", "--extra-arg=-Wno-unknown-warning-option", "--extra-arg=-Xclang", "--extra-arg=-analyzer-config",
            "--extra-arg=-Xclang", "--extra-arg=max-nodes=75000"]
 
 
-def sources():
+def compiled():
     """The compiler's command for each file."""
     entries = json.loads((BUILD / "compile_commands.json").read_text())
     return {e["file"]: e["command"] for e in entries
-            if any(Path(e["file"]).is_relative_to(common.ROOT / room) for room in ROOMS)}
+            if any(Path(e["file"]).is_relative_to(top / room) for room in ROOMS for top in (common.ROOT, BUILD))}
 
 
 def included():
@@ -47,16 +49,48 @@ def state(path, command, headers):
     return hashlib.sha256(b"\0".join(parts)).hexdigest()
 
 
+class Read:
+    """What clang-tidy reads for a file of the build. The analyzer leaves out what a file includes, so sources that are
+    compiled together are copied into one file."""
+
+    def __init__(self, path):
+        self.path, self.sources, self.origins = Path(path), [], []
+        if self.path.is_relative_to(BUILD):
+            self.sources = re.findall(r'^#include "(.+)"$', self.path.read_text(), re.M)
+            self.copy()
+
+    def copy(self):
+        self.path, lines = OWN / self.path.name, []
+        for source in self.sources:
+            lines += Path(source).read_text().splitlines()
+            self.origins += [f"{source}:{line}:" for line in range(1, len(lines) - len(self.origins) + 1)]
+        self.path.write_text("\n".join(lines) + "\n")
+
+    def named_by_origin(self, text):
+        """Messages with the places that the lines were copied from."""
+        if not self.origins:
+            return text
+        return re.sub(re.escape(str(self.path)) + r":(\d+):", lambda found: self.origins[int(found[1]) - 1], text)
+
+
 def check(path):
-    result = common.run("clang-tidy", "-p", BUILD, *OPTIONS, path)
+    result = common.run("clang-tidy", "-p", OWN, *OPTIONS, read[path].path)
     if result.returncode or result.stdout:
-        return result.stdout + result.stderr
+        return read[path].named_by_origin(result.stdout + result.stderr)
     clean.note(path, states[path])
     return ""
 
 
-headers = included()
-states = {path: state(path, command, headers) for path, command in sources().items()}
+OWN.mkdir(exist_ok=True)
+commands, headers = compiled(), included()
+read = {path: Read(path) for path in commands}
+joined = {source for path in read for source in read[path].sources}
+for path in joined & commands.keys(): # a test program compiles it too
+    del commands[path]
+(OWN / "compile_commands.json").write_text(json.dumps(
+    [{"directory": str(BUILD), "file": str(read[path].path), "command": command.replace(path, str(read[path].path))}
+     for path, command in commands.items()]))
+states = {path: state(path, command, headers) for path, command in commands.items()}
 clean = common.CleanFiles(BUILD / "tidy-clean.json")
 changed = sorted(path for path in states if states[path] is None or clean.known.get(path) != states[path])
 problems = [text for text in common.in_parallel(check, changed) if text]
