@@ -58,15 +58,15 @@ endfunction()
 # [THREADED]): a room's tests.
 # The EXPORTED ones use nothing but the public headers and go into exported_tests, which links the shared library. The
 # INTERNAL ones make the program <room>_tests, which holds the library's objects and may see internal headers. Under a
-# sanitizer all of them do. LONG_RUNS are those of both that run longer than they compile. THREADED marks a program that
-# the thread sanitizer shall watch.
+# sanitizer, and if ZB_TESTS_BY_ROOM is on, all of them do. LONG_RUNS are those of both that run longer than they
+# compile. THREADED marks a program that the thread sanitizer shall watch.
 function(zb_tests room)
   cmake_parse_arguments(ARG "THREADED" "RUNS;TIMEOUT" "EXPORTED;INTERNAL;LONG_RUNS;LIBRARIES" ${ARGN})
   zb_optimised_tests(${ARG_LONG_RUNS})
   zb_joined_tests(${room}_exported ${ARG_EXPORTED})
   zb_joined_tests(${room}_internal ${ARG_INTERNAL})
   set(own_files ${ARG_INTERNAL})
-  if(ZB_SANITIZE)
+  if(ZB_SANITIZE OR ZB_TESTS_BY_ROOM)
     list(APPEND own_files ${ARG_EXPORTED})
   else()
     list(TRANSFORM ARG_EXPORTED PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)

@@ -1,11 +1,12 @@
 // Any bytes as the stored form of blobs, one behind the other. Lengths above a megabyte are made smaller beforehand, as
 // reading reserves what they announce.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/text/blob.h>
 
 #include "tests/support/memory_file.h"
 
-#include <cstdlib>
 #include <cstring>
 #include <string>
 
@@ -14,10 +15,6 @@ using namespace ZOR_Basis;
 namespace {
 
 constexpr std::uint32_t LARGEST = 1'000'000;
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 template <class B>
 void readAll(std::string bytes) {
@@ -44,11 +41,12 @@ void readAll(std::string bytes) {
     }
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
+void run(unsigned char const* data, std::size_t size) {
     std::string const bytes(reinterpret_cast<char const*>(data), size);
     readAll<Blob>(bytes);
     readAll<SecretBlob>(bytes);
-    return 0;
 }
+
+FuzzTarget const TARGET("blob", run);
+
+} // namespace

@@ -1,19 +1,16 @@
 // Any text as a command line: the words are those that a second reading finds, which looks at one character at a time
 // and remembers the backslashes before it.
 
+#include "fuzz/target.h"
+
 #include "basis/system/command_line.h"
 
-#include <cstdlib>
 #include <string>
 #include <vector>
 
 using namespace ZOR_Basis;
 
 namespace {
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 bool isBlank(char c) { return c == ' ' || c == '\t'; }
 
@@ -73,9 +70,7 @@ Words expectedWords(std::string const& text) {
     return words;
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
+void run(unsigned char const* data, std::size_t size) {
     std::string text(reinterpret_cast<char const*>(data), size);
     text = text.c_str();
     CommandLine const line(text.c_str());
@@ -84,5 +79,8 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     require(line.size() == expected.size());
     for (std::size_t i = 0; i < expected.size(); ++i) require(expected[i] == line.words()[i]);
     require(line.words()[expected.size()] == nullptr);
-    return 0;
 }
+
+FuzzTarget const TARGET("command_line", run);
+
+} // namespace

@@ -1,19 +1,16 @@
 // Any bytes as UTF-8 and as UTF-16: the results are those of the second reading, and valid text survives a round trip.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/text/convert.h>
 
 #include "tests/text/reference_utf.h"
 
-#include <cstdlib>
 #include <cstring>
 
 using namespace ZOR_Basis;
 
 namespace {
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 void readAsUtf8(std::string const& text) {
     auto const expected = reference::characters(text);
@@ -37,12 +34,13 @@ void readAsUtf16(std::string const& text) {
     require(std::string(narrow.c_str(), narrow.size()) == reference::utf8(reference::characters(units)));
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
-    if (size == 0) return 0;
+void run(unsigned char const* data, std::size_t size) {
+    if (size == 0) return;
     std::string const text(reinterpret_cast<char const*>(data), size);
     readAsUtf8(text);
     readAsUtf16(text);
-    return 0;
 }
+
+FuzzTarget const TARGET("convert", run);
+
+} // namespace

@@ -1,20 +1,17 @@
 // Any bytes as a message to encrypt and as an encrypted one. The first byte says how long the secret is.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/crypto.h>
 #include <zor_basis/text/blob.h>
 
 #include <algorithm>
 #include <cstdint>
-#include <cstdlib>
 #include <memory>
 
 using namespace ZOR_Basis;
 
 namespace {
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 Crypt& crypt() {
     static Crypt& made = *Crypt::make("");
@@ -27,10 +24,8 @@ std::unique_ptr<CrKey> keyOf(unsigned char const* secret, std::size_t n) {
     return std::unique_ptr<CrKey>(crypt().deriveKey(hash));
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
-    if (size == 0) return 0;
+void run(unsigned char const* data, std::size_t size) {
+    if (size == 0) return;
     std::size_t const secretSize = std::min<std::size_t>(data[0], size - 1);
     std::unique_ptr<CrKey> const key = keyOf(data + 1, secretSize);
     Blob const message(size - 1 - secretSize, reinterpret_cast<char const*>(data) + 1 + secretSize);
@@ -51,5 +46,8 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     } else {
         require(plain == message || plain.size() == message.size());
     }
-    return 0;
 }
+
+FuzzTarget const TARGET("crypt", run);
+
+} // namespace

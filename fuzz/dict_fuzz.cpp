@@ -1,10 +1,11 @@
 // Any bytes as a dictionary's file: what is loaded is what a plain reading finds, and comes back when saved.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/containers/dict.h>
 
 #include <atomic>
 #include <chrono>
-#include <cstdlib>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
@@ -17,10 +18,6 @@ namespace {
 
 using BlobDict = Dict<Blob, Blob>;
 using Contents = std::map<std::string, std::string>;
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 struct Folder {
     Folder() {
@@ -65,9 +62,7 @@ Contents contentsOf(BlobDict& dict) {
     return contents;
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
+void run(unsigned char const* data, std::size_t size) {
     static Folder const folder;
     std::string const path = (folder.path / "dict").generic_string();
     std::string const bytes(reinterpret_cast<char const*>(data), size);
@@ -79,9 +74,12 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     Blob const extra(5, "\0new\1");
     dict.set(extra, extra);
     dict.rm(extra);
-    if (contents.count(text(extra)) != 0) return 0;
+    if (contents.count(text(extra)) != 0) return;
     require(dict.write());
     BlobDict again{Str(path)};
     require(contentsOf(again) == contents);
-    return 0;
 }
+
+FuzzTarget const TARGET("dict", run);
+
+} // namespace

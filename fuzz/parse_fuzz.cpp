@@ -1,11 +1,12 @@
 // Any bytes as a text that is read line by line. The first byte says how much is asked for at a time, the next ones by
 // which calls; what they give is what reading a character at a time gives.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/system/parse.h>
 
 #include <algorithm>
 #include <cctype>
-#include <cstdlib>
 #include <cstring>
 #include <memory>
 #include <string>
@@ -16,10 +17,6 @@ namespace {
 
 constexpr std::size_t CALLS = 8;
 constexpr std::size_t LONGEST_COMPARED = 256;
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 bool endsLine(char c) { return c == '\n' || c == '\r'; }
 
@@ -60,10 +57,8 @@ void requireLine(ZB_Parse& parse, Model& model, int maximum) {
     require(whole == model.isAtLineEnd());
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
-    if (size <= CALLS) return 0;
+void run(unsigned char const* data, std::size_t size) {
+    if (size <= CALLS) return;
     int const maximum = data[0];
     std::string const text(reinterpret_cast<char const*>(data) + 1 + CALLS, size - 1 - CALLS);
     // A block of its own: nothing behind it may be read.
@@ -84,5 +79,8 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
             require(parse.checkLine(expected.c_str()) == (call % 2 != 0));
         }
     }
-    return 0;
 }
+
+FuzzTarget const TARGET("parse", run);
+
+} // namespace

@@ -1,6 +1,8 @@
 // Any two texts as paths, narrow and wide: normalising keeps to its form, splitting loses nothing, matching is what the
 // rule says.
 
+#include "fuzz/target.h"
+
 #include "basis/ground/wildcard.h"
 #include "tests/support/reference_wildcard.h"
 
@@ -8,7 +10,6 @@
 #include <zor_basis/files/wc_path.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <cstring>
 #include <string>
 
@@ -17,10 +18,6 @@ using namespace ZOR_Basis;
 namespace {
 
 constexpr std::size_t LONGEST_FOR_MATCHING = 24;
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 std::basic_string<WChar> wide(std::string const& text) {
     std::basic_string<WChar> units;
@@ -70,10 +67,8 @@ void requireSplit(std::string const& text) {
     require(path.offsetName() == (slash == std::string::npos ? 0 : slash + 1));
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
-    if (size == 0) return 0;
+void run(unsigned char const* data, std::size_t size) {
+    if (size == 0) return;
     std::string const all(reinterpret_cast<char const*>(data), size);
     std::size_t const cut = all.find('\0');
     std::string const text = all.substr(0, cut);
@@ -100,5 +95,8 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     }
     auto const wideOther = wide(other);
     require(matched == WcPath::matchWildCard(wideText.c_str(), wideOther.c_str()));
-    return 0;
 }
+
+FuzzTarget const TARGET("paths", run);
+
+} // namespace

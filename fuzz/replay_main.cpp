@@ -1,4 +1,6 @@
-// Feeds the files of a folder to a fuzz target, once each. Fails when there is none.
+// Feeds the committed inputs to their targets, once each. Fails if a target has none.
+
+#include "fuzz/target.h"
 
 #include <cstdio>
 #include <filesystem>
@@ -6,17 +8,32 @@
 #include <iterator>
 #include <string>
 
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size);
+namespace {
+
+int replay(FuzzTarget const& target, std::filesystem::path const& folder) {
+    int replayed = 0;
+    std::error_code missing;
+    for (auto const& entry : std::filesystem::directory_iterator(folder, missing)) {
+        std::ifstream file(entry.path(), std::ios::binary);
+        std::string const bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+        // Seen only if it aborts.
+        std::printf("%s: %s", target.name, entry.path().filename().string().c_str());
+        std::fflush(stdout);
+        target.run(reinterpret_cast<unsigned char const*>(bytes.data()), bytes.size());
+        std::printf("\n");
+        ++replayed;
+    }
+    std::printf("%s: %d inputs replayed\n", target.name, replayed);
+    return replayed;
+}
+
+} // namespace
 
 int main(int argc, char** argv) {
     if (argc != 2) return 2;
-    int replayed = 0;
-    for (auto const& entry : std::filesystem::directory_iterator(argv[1])) {
-        std::ifstream file(entry.path(), std::ios::binary);
-        std::string const bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-        LLVMFuzzerTestOneInput(reinterpret_cast<unsigned char const*>(bytes.data()), bytes.size());
-        ++replayed;
+    bool isComplete = !FuzzTarget::all().empty();
+    for (FuzzTarget const* target : FuzzTarget::all()) {
+        isComplete = replay(*target, std::filesystem::path(argv[1]) / target->name) > 0 && isComplete;
     }
-    std::printf("%d inputs replayed\n", replayed);
-    return replayed > 0 ? 0 : 1;
+    return isComplete ? 0 : 1;
 }

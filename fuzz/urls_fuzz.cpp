@@ -1,10 +1,11 @@
 // Any text without zeros as a URL and as text with percent escapes.
 
+#include "fuzz/target.h"
+
 #include <zor_basis/files/f_path.h>
 #include <zor_basis/flat.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <cstring>
 #include <string>
 
@@ -14,10 +15,6 @@ namespace {
 
 // The undecoded rest is appended before each escape that follows another: the result grows with the square.
 constexpr std::size_t LONGEST = 300;
-
-void require(bool condition) {
-    if (!condition) std::abort();
-}
 
 int digit(char c) {
     if (c >= '0' && c <= '9') return c - '0';
@@ -91,12 +88,10 @@ void requireParts(std::string const& url) {
     require((hasPassword ? url.substr(colon + 1, at - colon - 1) : "-") == password.c_str());
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t size) {
+void run(unsigned char const* data, std::size_t size) {
     std::string text(reinterpret_cast<char const*>(data), std::min(size, LONGEST));
     text.resize(std::strlen(text.c_str()));
-    if (text.empty()) return 0;
+    if (text.empty()) return;
     FPath path("dir");
     path.addDecodedUrl(Str(text));
     require("dir" + decoded(text) == path.c_str());
@@ -106,5 +101,8 @@ extern "C" int LLVMFuzzerTestOneInput(unsigned char const* data, std::size_t siz
     if (FPath(text).isURL() && share.ConvertFileURLtoUNC(text.c_str())) {
         require(share.size() >= 2 && std::strncmp(share.c_str(), "//", 2) == 0);
     }
-    return 0;
 }
+
+FuzzTarget const TARGET("urls", run);
+
+} // namespace

@@ -17,8 +17,9 @@ bool FileCountVisitor::stop() {
 
 int FileCountVisitor::Get(Str const& path, LookForType type, std::uint64_t limit) {
     FileCountVisitor counter(limit);
-    return FileIterator(path, type, nullptr, nullptr).doIt(&counter, ONE_LEVEL, IGNORING_FAILURES) ? counter.total()
-                                                                                                   : -1;
+    // A walk fails only where its visitor does, and counting never fails.
+    FileIterator(path, type, nullptr, nullptr).doIt(&counter, ONE_LEVEL, IGNORING_FAILURES);
+    return counter.total();
 }
 
 } // namespace ZOR_Basis

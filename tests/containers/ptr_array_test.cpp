@@ -6,6 +6,8 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstring>
+#include <memory>
 #include <type_traits>
 #include <vector>
 
@@ -61,6 +63,22 @@ TEST(PtrArray, leaves_skipped_slots_null) {
     EXPECT_EQ(array[3], &values[1]);
     EXPECT_EQ(array.insertBack(&values[2]), 21u);
     EXPECT_EQ(array.capacity(), 42u);
+}
+
+TEST(PtrArray, leaves_skipped_slots_null_in_blocks_that_others_have_used) {
+    for (std::uint64_t n = 1; n <= 300; ++n) {
+        // The next block of this size is one of these, and still holds what was written.
+        std::vector<std::unique_ptr<char[]>> used(8);
+        for (auto& block : used) {
+            block = std::make_unique_for_overwrite<char[]>(n * sizeof(int*));
+            std::memset(block.get(), 'x', n * sizeof(int*));
+        }
+        used.clear();
+        Array array(n);
+        array.set(&values[0], n - 1);
+        EXPECT_EQ(array.capacity(), n);
+        for (std::uint64_t i = 0; i + 1 < n; ++i) ASSERT_EQ(array[i], nullptr) << i << " of " << n;
+    }
 }
 
 TEST(PtrArray, is_walked_from_its_first_slot_to_its_size) {

@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 using namespace ZOR_Basis;
@@ -57,6 +59,18 @@ TEST_F(DirIteratorLinksPosix, are_listed_as_what_they_lead_to) {
     list->setWildCard(u"to-file");
     ASSERT_NE(list->next(), nullptr);
     EXPECT_EQ(list->size(), 5u);
+}
+
+TEST_F(DirIteratorLinksPosix, have_their_own_size_and_time_where_they_lead_to_nothing) {
+    link("nowhere", "to-nothing");
+    struct timespec const times[2] = {{1'000'000'000, 0}, {1'234'567'890, 0}};
+    ASSERT_EQ(utimensat(AT_FDCWD, at("to-nothing").c_str(), times, AT_SYMLINK_NOFOLLOW), 0);
+    DirIteratorW list(LOOK_FILES, wideOf(scratch.path()).c_str());
+    ASSERT_NE(list->next(), nullptr);
+    EXPECT_TRUE(list->isFile());
+    EXPECT_EQ(list->size(), 7u) << "the length of the name that it holds";
+    EXPECT_EQ(list->time(), 1'234'567'890);
+    EXPECT_EQ(list->next(), nullptr);
 }
 
 TEST_F(DirIteratorLinksPosix, to_directories_are_directories_to_build_upon) {

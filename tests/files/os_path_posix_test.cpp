@@ -47,6 +47,22 @@ TEST(OsPathPosix, turn_to_wide_text_and_back) {
     EXPECT_TRUE(narrow.empty());
 }
 
+TEST(OsPathPosix, keep_a_stray_byte_where_the_room_inside_the_text_ends) {
+    for (std::size_t before = 250; before <= 260; ++before) {
+        for (char const* behind : {"", "z", "\xFF", "\xC3\xA4"}) {
+            std::string const name = std::string(before, 'n') + "\xE4" + behind;
+            WideText wide(before, u'n');
+            wide += static_cast<WChar>(0xDCE4);
+            ASSERT_EQ(wideOf(name).substr(0, before + 1), wide) << before;
+            ASSERT_EQ(narrowOf(wideOf(name)), name) << before << " behind " << behind;
+            BufStr<255> narrow;
+            narrowName(wideOf(name).c_str(), narrow);
+            EXPECT_EQ(narrow.size(), name.size());
+            EXPECT_GE(narrow.sizeBuf(), name.size());
+        }
+    }
+}
+
 TEST(OsPathPosix, survive_the_way_to_wide_text_whatever_their_bytes) {
     auto random = randomSource();
     for (std::uint64_t step = randomSteps(20'000); step > 0; --step) {

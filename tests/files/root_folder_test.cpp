@@ -42,6 +42,13 @@ TEST(RootFolderOfPaths, is_the_parent_of_a_folder_system) {
     }
 }
 
+TEST(RootFolderOfPaths, is_not_translated_to_itself_where_it_is_a_fake_root) {
+    EXPECT_EQ(under("/scsi0", {"fake", "/scsi0", "fake", "/scsi0/x", "fake", "/JS_Root/x"}),
+              "plain  </scsi0>\nplain  </scsi0/x>\nfake  </scsi0/x>\n");
+    EXPECT_EQ(under("/JS_Root/a", {"fake", "/JS_Root/a/x", "fake", "/JS_Root/b", "fake", "/scsi0"}),
+              "plain  </JS_Root/a/x>\nfake  </JS_Root/a/b>\nfake  </JS_Root/a>\n");
+}
+
 TEST(RootFolderOfPaths, makes_nothing_fake_while_it_is_empty_unless_it_is_the_whole_file_system) {
     EXPECT_EQ(under("system", {"fake", "/scsi0", "fake", "/JS_Root/x", "fake", "\\scsi0", "fake", "/"}),
               "plain  </scsi0>\nplain  </JS_Root/x>\nplain  <\\scsi0>\nplain  </>\n");

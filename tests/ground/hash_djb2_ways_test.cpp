@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
 #include <random>
 #include <string>
 
@@ -32,6 +33,22 @@ TEST_P(HashDjb2Ways, agree_for_every_length) {
             std::string text(size, '\0');
             for (char& c : text) c = static_cast<char>(1 + random() % 255);
             ASSERT_EQ(hashDjb2(text.c_str(), 0), plainHash(text)) << size;
+        }
+    }
+}
+
+TEST_P(HashDjb2Ways, agree_at_every_distance_from_the_end_of_a_page) {
+    constexpr std::size_t PAGE = 4096;
+    constexpr std::size_t FARTHEST = 40;
+    alignas(PAGE) static char pages[2 * PAGE];
+    std::mt19937_64 random(11);
+    for (std::size_t distance = 1; distance <= FARTHEST; ++distance) {
+        for (std::size_t size = 0; size <= FARTHEST; ++size) {
+            // Whatever lies before and behind the text does not count.
+            for (char& c : pages) c = static_cast<char>(1 + random() % 255);
+            char* const text = pages + PAGE - distance;
+            text[size] = '\0';
+            ASSERT_EQ(hashDjb2(text, 0), plainHash(text)) << size << " bytes, " << distance << " before the end";
         }
     }
 }

@@ -8,6 +8,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <array>
 #include <cstdarg>
 #include <cstddef>
@@ -16,12 +17,19 @@
 
 inline constexpr std::size_t ROOM = 1023;
 
-using Line = std::array<char, ROOM>;
+/// Bytes behind every room, which stay as they are.
+inline constexpr std::size_t BEHIND = 80;
+
+using Line = std::array<char, ROOM + BEHIND>;
 
 struct Written {
     std::string ours;
     bool quickly = false;
 };
+
+inline bool isUntouchedBehind(std::size_t room, Line const& line) {
+    return std::all_of(line.begin() + static_cast<std::ptrdiff_t>(room), line.end(), [](char c) { return c == 'X'; });
+}
 
 inline Written writtenWith(std::size_t room, char const* format, ...) {
     Line line;
@@ -31,12 +39,14 @@ inline Written writtenWith(std::size_t room, char const* format, ...) {
     Written written;
     char const* end = ZOR_Basis::writeLineText(line.data(), room, format, arguments);
     written.quickly = end != nullptr;
+    EXPECT_TRUE(isUntouchedBehind(room, line)) << format << " in " << room;
     va_end(arguments.list);
     if (!written.quickly) {
         line.fill('X');
         va_start(arguments.list, format);
         end = ZOR_Basis::writeAnyLineText(line.data(), room, format, arguments);
         va_end(arguments.list);
+        EXPECT_TRUE(isUntouchedBehind(room, line)) << format << " in " << room;
     }
     written.ours = line.data();
     EXPECT_EQ(end, line.data() + written.ours.size());

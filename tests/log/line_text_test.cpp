@@ -159,6 +159,20 @@ TEST(LineText, counts_what_has_been_written_so_far) {
     EXPECT_EQ(ours, 3);
 }
 
+TEST(LineText, writes_nothing_behind_its_room_wherever_that_ends) {
+    for (std::size_t room = 1; room <= 100; ++room) {
+        SCOPED_TRACE(room);
+        EXPECT_EQ(writtenWith(room, "%-30s|%d", "text", -77).ours, printed(room, "%-30s|%d", "text", -77));
+        EXPECT_EQ(writtenWith(room, "%30s%%", "text").ours, printed(room, "%30s%%", "text"));
+        EXPECT_EQ(writtenWith(room, "%-40c|", 'a').ours, printed(room, "%-40c|", 'a'));
+        EXPECT_EQ(writtenWith(room, "a%50d|", -12345).ours, printed(room, "a%50d|", -12345));
+        EXPECT_EQ(writtenWith(room, "a%050d|", -12345).ours, printed(room, "a%050d|", -12345));
+        EXPECT_EQ(writtenWith(room, "a%-50d|", 12345).ours, printed(room, "a%-50d|", 12345));
+        EXPECT_EQ(writtenWith(room, "%lo", ~0UL).ours, printed(room, "%lo", ~0UL));
+        EXPECT_EQ(writtenWith(room, "%.9f|%x", -4e15, 255).ours, printed(room, "%.9f|%x", -4e15, 255));
+    }
+}
+
 TEST(LineText, is_cut_where_the_room_ends) {
     std::string const text(2000, 'x');
     for (std::size_t room : {1u, 2u, 3u, 5u, 8u, 1023u}) {

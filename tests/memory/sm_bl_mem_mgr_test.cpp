@@ -146,7 +146,10 @@ TEST(SmBlMemMgr, serves_elements_larger_than_its_first_chunk) {
     EXPECT_TRUE(large.isConsistent());
     SmBlMemMgr tooLarge(5 * MIB, 1, 0, 8);
     EXPECT_EQ(tooLarge.alloc(), nullptr);
-    EXPECT_EQ(tooLarge.alloc(), nullptr);
+    std::uint64_t const chunks = tooLarge.chunkCount();
+    EXPECT_LE(chunks, 3u) << "of 1, 2 and 4 MiB";
+    for (int i = 0; i < 10; ++i) EXPECT_EQ(tooLarge.alloc(), nullptr);
+    EXPECT_EQ(tooLarge.chunkCount(), chunks) << "no chunk after chunk that cannot hold an element";
     MemMgrPtr const none(MemMgr::makeSmlBlk(0, 0, 0, 0));
     none->free(none->alloc());
 }

@@ -6,7 +6,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <random>
 
 template <class Subject>
 struct Operation {
@@ -17,8 +16,8 @@ struct Operation {
 };
 
 /// Draws one of the operations by weight.
-template <class Subject, std::size_t N>
-Operation<Subject> const& drawn(Operation<Subject> const (&operations)[N], std::mt19937_64& random) {
+template <class Subject, std::size_t N, class Random>
+Operation<Subject> const& drawn(Operation<Subject> const (&operations)[N], Random& random) {
     std::uint64_t total = 0;
     for (auto const& operation : operations) total += operation.weight;
     std::uint64_t place = random() % total;

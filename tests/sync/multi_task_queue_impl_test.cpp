@@ -80,6 +80,28 @@ TEST_F(MTQ_ImplCalls, makes_a_mutex_and_an_empty_signal_and_destroys_them) {
     EXPECT_EQ(xos_HostCalls("xos_SemDestroy"), 2u);
 }
 
+TEST_F(MTQ_ImplCalls, is_destroyed_only_after_the_jobs_that_are_ending_have_left_it) {
+    Ends ends;
+    GatedJob gate;
+    auto* const argument = new TaskArgument(ends);
+    argument->endBehind(gate);
+    auto* const queue = new MTQ_Impl(MultiTaskQueue::Continue, 1);
+    EXPECT_EQ(queue->ending(), 0u);
+    ASSERT_TRUE(addOwned(*queue, argument));
+    ASSERT_TRUE(waitFor([&] { return gate.runs(); }));
+    EXPECT_EQ(queue->ending(), 1u) << "its function has returned, its end is not reported yet";
+    std::atomic<bool> isDestroyed{false};
+    std::thread destroyer([&] {
+        delete queue;
+        isDestroyed = true;
+    });
+    EXPECT_TRUE(notInAMoment([&] { return isDestroyed.load(); }));
+    gate.open();
+    destroyer.join();
+    EXPECT_TRUE(isDestroyed);
+    EXPECT_EQ(ends.onOwnTask, 1);
+}
+
 TEST_F(MTQ_ImplCalls, makes_tasks_with_the_same_parameters_always) {
     MTQ_Impl queue(MultiTaskQueue::Continue, 0);
     for (bool byRecord : {false, true}) {

@@ -4,6 +4,7 @@
 
 #include "tests/support/scratch.h"
 #include "tests/support/skip.h"
+#include "tests/support/table.h"
 #include "tests/system/query_calls_test_posix.h"
 
 #include <grp.h>
@@ -63,8 +64,8 @@ int threeGroups(char const*, gid_t group, gid_t* groups, int* n) {
     return 3;
 }
 /// A user of so many groups.
+template <int MANY>
 int manyGroups(char const*, gid_t group, gid_t* groups, int* n) {
-    constexpr int MANY = 5000;
     int const room = *n;
     *n = MANY;
     for (int i = 0; i < room && i < MANY; ++i) groups[i] = group;
@@ -145,12 +146,34 @@ TEST_F(LogonPosix, fails_for_users_without_an_account) {
     EXPECT_EQ(Sys::loginUser("john", "secret", true), nullptr);
     queryCalls.groupsOf = endlessGroups;
     EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "whose groups are unknown";
-    queryCalls.groupsOf = manyGroups;
-    Handle const handle(Sys::loginUser("jane", "secret", true));
-    ASSERT_NE(handle, nullptr);
-    pretend();
-    EXPECT_TRUE(Sys::impersonate(handle.get()));
-    EXPECT_EQ(changes.front(), "groups 5000");
+    queryCalls.groupsOf = manyGroups<65537>;
+    EXPECT_EQ(Sys::loginUser("jane", "secret", true), nullptr) << "whose groups are more than the kernel keeps";
+}
+
+TEST_F(LogonPosix, takes_as_many_groups_as_the_kernel_keeps) {
+    struct Case {
+        Row row;
+        int (*groupsOf)(char const*, gid_t, gid_t*, int*);
+        char const* change;
+    };
+    for (Case const& c : {
+             Case{{}, manyGroups<16>, "groups 16"},
+             Case{{}, manyGroups<17>, "groups 17"},
+             Case{{}, manyGroups<5000>, "groups 5000"},
+             Case{{}, manyGroups<16384>, "groups 16384"},
+             Case{{}, manyGroups<16385>, "groups 16385"},
+             Case{{}, manyGroups<65536>, "groups 65536"},
+         }) {
+        SCOPED_TRACE(c.row);
+        changes.clear();
+        queryCalls.groupsOf = c.groupsOf;
+        Handle const handle(Sys::loginUser("jane", "secret", true));
+        ASSERT_NE(handle, nullptr);
+        pretend();
+        EXPECT_TRUE(Sys::impersonate(handle.get()));
+        EXPECT_EQ(changes.front(), c.change);
+        Sys::revertToSelf();
+    }
 }
 
 TEST_F(LogonPosix, hands_the_password_to_the_modules) {

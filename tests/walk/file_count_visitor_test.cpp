@@ -23,6 +23,16 @@ TEST_F(FileCountVisitorOnDisk, ends_at_its_limit) {
     EXPECT_EQ(FileCountVisitor::Get(at("src"), LOOK_FILES, 0), 1) << "one level only";
 }
 
+TEST_F(FileCountVisitorOnDisk, counts_nothing_where_nothing_can_be_listed) {
+    EXPECT_EQ(FileCountVisitor::Get(at("src/a"), LOOK_BOTH, 3), 0) << "a file";
+    for (char const* call : {"xos_DirOpenEx", "xos_DirNextEx"}) {
+        ASSERT_EQ(xos_HostFail(call, 0, 1), 0);
+        EXPECT_EQ(FileCountVisitor::Get(at("src"), LOOK_BOTH, 0), 0) << call;
+        xos_HostFailClear();
+    }
+    EXPECT_EQ(FileCountVisitor::Get(at("src"), LOOK_BOTH, 0), 2);
+}
+
 TEST_F(FileCountVisitorOnDisk, Kept_walk_08_compares_the_low_32_bits_of_the_limit_with_a_sign) {
     for (std::uint64_t const limit : {0x80000000u * std::uint64_t{1}, std::uint64_t{1} << 32}) {
         EXPECT_TRUE(FileCountVisitor(limit).stop()) << limit;

@@ -111,6 +111,22 @@ TEST_F(FileIteratorStops, brings_a_failure_up_from_below) {
     expectAllClosed();
 }
 
+TEST_F(FileIteratorStops, asks_no_sibling_once_a_folder_below_has_failed) {
+    for (char const* folder : {"d", "e", "f"}) {
+        makeFolder(scratch / (std::string(folder) + "/a/b"));
+        put(scratch / (std::string(folder) + "/a/b/bad"), "");
+    }
+    Recorder seen;
+    seen.failing = {"bad"};
+    EXPECT_FALSE(FileIterator(scratch.path().c_str(), LOOK_FILES, nullptr, nullptr).doIt(&seen, true, true));
+    EXPECT_EQ(seen.paths.size(), 1u);
+    Recorder all;
+    all.failing = seen.failing;
+    FileIterator(scratch.path().c_str(), LOOK_FILES, nullptr, nullptr).doIt(&all, true, false);
+    EXPECT_EQ(all.paths.size(), 3u) << "of a walk that ignores failures";
+    expectAllClosed();
+}
+
 TEST_F(FileIteratorStops, ends_at_every_level_when_the_visitor_stops_it) {
     fill();
     for (std::size_t most = 0; most <= 6; ++most) {

@@ -162,3 +162,18 @@ TEST_F(FileIteratorInAFolder, copies_its_settings_but_not_its_listing) {
     }
     expectAllClosed();
 }
+
+TEST_F(FileIteratorInAFolder, takes_every_setting_when_it_is_assigned) {
+    fill();
+    makeFolder(scratch / "other");
+    for (char const* name : {"ax", "ay", "bx"}) put(scratch / (std::string("other/") + name), "");
+    OnlyWith condition('x');
+    FileIterator it(scratch.path().c_str(), LOOK_DIRS, "d*", nullptr);
+    it = FileIterator((scratch / "other").c_str(), LOOK_FILES, "a*", &condition);
+    EXPECT_EQ(listed(it), Found{"ax"}) << "path, kind, wildcard and condition";
+    it = FileIterator((scratch / "other").c_str(), LOOK_FILES, "b*", nullptr);
+    EXPECT_EQ(listed(it), Found{"bx"}) << "a wildcard in place of another";
+    it = FileIterator((scratch / "other").c_str(), LOOK_FILES, nullptr, nullptr);
+    EXPECT_EQ(listed(it), (Found{"ax", "ay", "bx"})) << "none in place of one";
+    expectAllClosed();
+}

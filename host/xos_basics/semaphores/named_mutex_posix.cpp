@@ -2,15 +2,14 @@
 
 #include "host/xos_basics/last_error.h"
 #include "host/xos_basics/semaphores/named_mutex.h"
+#include "host/xos_basics/semaphores/run_file_posix.h"
 
 #include <cerrno>
-#include <fcntl.h>
 #include <memory>
 #include <new>
 #include <pthread.h>
 #include <string>
 #include <sys/file.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
 namespace host {
@@ -85,32 +84,13 @@ private:
 namespace {
 
 /// The parents of the users' run directories. All processes of a user must come to the same one, with or without a
-/// login session, so these are fixed places, and the first that serves is taken.
+/// login session, so these are fixed places.
 constexpr char const* const PARENTS[] = {"/run/lock", "/dev/shm", "/tmp"};
-
-/// A folder that others could write, or a link that others made, is not trusted.
-bool isPrivateFolder(char const* path) {
-    struct stat status {};
-    return lstat(path, &status) == 0 && S_ISDIR(status.st_mode) && status.st_uid == geteuid() &&
-           (status.st_mode & 077) == 0;
-}
-
-std::string runDirectory() {
-    std::string const name = "/xos-" + std::to_string(geteuid());
-    for (char const* parent : PARENTS) {
-        std::string path = parent + name;
-        if ((mkdir(path.c_str(), 0700) == 0 || errno == EEXIST) && isPrivateFolder(path.c_str())) return path;
-    }
-    return {};
-}
 
 } // namespace
 
 NamedMutex* openNamed(int id) {
-    std::string const folder = runDirectory();
-    if (folder.empty()) return nullptr;
-    std::string const path = folder + "/mutex-" + std::to_string(id);
-    int const file = open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
+    int const file = openRunFile(PARENTS, "mutex-" + std::to_string(id));
     if (file < 0) return nullptr;
     auto* const mutex = new (std::nothrow) NamedMutex(file);
     if (mutex == nullptr) {

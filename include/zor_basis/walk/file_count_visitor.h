@@ -28,7 +28,7 @@ public:
     int total() const { return count_; }
 
     /// Counts the direct entries of one directory, of the kinds that a walk reports for the type.
-    /// \return the number of entries, at most the limit; 0 if the directory is missing; -1 if the walk fails
+    /// \return the number of entries, at most the limit; 0 also if the directory cannot be listed
     static int Get(Str const& path, LookForType type, std::uint64_t limit);
 
 private:

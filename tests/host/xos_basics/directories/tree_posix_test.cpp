@@ -52,6 +52,33 @@ TEST(HostTreePosix, removes_special_entries_and_directories_that_may_not_be_read
     EXPECT_EQ(scratch.content(), Names{});
 }
 
+namespace {
+
+/// Acts as an ordinary user, to whom a tree was given before.
+class AsItsOwner {
+public:
+    explicit AsItsOwner(std::string const& tree) {
+        if (!privileged_) return;
+        for (auto const& entry : std::filesystem::recursive_directory_iterator(tree)) {
+            EXPECT_EQ(::lchown(entry.path().c_str(), NOBODY, NOBODY), 0);
+        }
+        EXPECT_EQ(::seteuid(NOBODY), 0);
+    }
+    ~AsItsOwner() {
+        int const error = errno;
+        if (privileged_) { EXPECT_EQ(::seteuid(0), 0); }
+        errno = error;
+    }
+    AsItsOwner(AsItsOwner const&) = delete;
+    AsItsOwner& operator=(AsItsOwner const&) = delete;
+
+private:
+    static constexpr uid_t NOBODY = 65534;
+    bool const privileged_ = ::geteuid() == 0;
+};
+
+} // namespace
+
 TEST(HostTreePosix, removes_all_it_can_and_says_that_it_could_not_remove_the_rest) {
     Scratch const scratch;
     makeFolder(scratch / "tree/locked");
@@ -59,23 +86,37 @@ TEST(HostTreePosix, removes_all_it_can_and_says_that_it_could_not_remove_the_res
     put(scratch / "tree/locked/f", "");
     put(scratch / "tree/open/f", "");
     std::filesystem::permissions(scratch.path(), std::filesystem::perms::all);
-    bool const privileged = ::geteuid() == 0;
-    constexpr uid_t NOBODY = 65534;
-    if (privileged) {
-        for (auto const& entry : std::filesystem::recursive_directory_iterator(scratch.path())) {
-            ASSERT_EQ(::lchown(entry.path().c_str(), NOBODY, NOBODY), 0);
-        }
-        ASSERT_EQ(::seteuid(NOBODY), 0);
+    int result = 0;
+    int error = 0;
+    {
+        AsItsOwner const owner(scratch.path());
+        ::chmod((scratch / "tree/locked").c_str(), 0500);
+        errno = 0;
+        result = removeTree(scratch / "tree");
+        error = errno;
     }
-    ::chmod((scratch / "tree/locked").c_str(), 0500);
-    errno = 0;
-    int const result = removeTree(scratch / "tree");
-    int const error = errno;
-    if (privileged) { ASSERT_EQ(::seteuid(0), 0); }
     EXPECT_NE(result, 0);
     EXPECT_EQ(error, EACCES);
     EXPECT_EQ(scratch.content(), (Names{"tree/", "tree/locked/", "tree/locked/f"}));
     ::chmod((scratch / "tree/locked").c_str(), 0700);
+}
+
+TEST(HostTreePosix, removes_an_empty_directory_that_cannot_be_read_and_says_why_a_full_one_stays) {
+    Scratch const scratch;
+    makeFolder(scratch / "empty/unreadable");
+    makeFolder(scratch / "full/unreadable");
+    put(scratch / "full/unreadable/f", "");
+    std::filesystem::permissions(scratch.path(), std::filesystem::perms::all);
+    {
+        AsItsOwner const owner(scratch.path());
+        for (char const* tree : {"empty/unreadable", "full/unreadable"}) ::chmod((scratch / tree).c_str(), 0);
+        EXPECT_EQ(removeTree(scratch / "empty"), 0);
+        errno = 0;
+        EXPECT_NE(removeTree(scratch / "full"), 0);
+        EXPECT_EQ(errno, EACCES) << "not that it is not empty";
+        ::chmod((scratch / "full/unreadable").c_str(), 0700);
+    }
+    EXPECT_EQ(scratch.content(), (Names{"full/", "full/unreadable/", "full/unreadable/f"}));
 }
 
 TEST(HostTreePosix, refuses_the_root_and_the_current_directory) {

@@ -12,6 +12,7 @@
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
+#include <sys/syscall.h>
 #include <unistd.h>
 
 namespace {
@@ -23,7 +24,37 @@ struct Umask {
     mode_t before;
 };
 
+/// The most that anybody was permitted for a file until it got its final permissions.
+mode_t permissionsBefore = 0;
+
 } // namespace
+
+/// Stands in for the system's own in the module too.
+extern "C" [[gnu::visibility("default")]] int fchmod(int file, mode_t mode) {
+    struct stat status {};
+    if (::fstat(file, &status) == 0) permissionsBefore |= status.st_mode & 07777;
+    return static_cast<int>(::syscall(SYS_fchmod, file, mode));
+}
+
+TEST(HostFilePosix, copies_what_only_its_owner_may_read_into_what_nobody_else_may_read_meanwhile) {
+    Umask const mask{0};
+    for (std::size_t const size : {std::size_t{1}, std::size_t{200'000}}) {
+        Scratch const scratch;
+        put(scratch / "a", std::string(size, 's'));
+        ASSERT_EQ(::chmod((scratch / "a").c_str(), 0600), 0);
+        makeFolder(scratch / "d");
+        ASSERT_EQ(xos_FileCopy((scratch / "d/b").c_str(), (scratch / "a").c_str(), 0), 0);
+        ASSERT_EQ(xos_FileCopy((scratch / "d/b").c_str(), (scratch / "a").c_str(), 1), 0);
+        permissionsBefore = 0;
+        ASSERT_EQ(xos_DirCopy((scratch / "e").c_str(), (scratch / "d").c_str(), 0x200), 0);
+        EXPECT_EQ(permissionsOf(scratch / "e/b"), 0600u);
+        EXPECT_NE(permissionsBefore, 0u) << "the copy was looked at";
+        EXPECT_EQ(permissionsBefore & 077, 0u);
+        permissionsBefore = 0;
+        ASSERT_EQ(xos_FileCopy((scratch / "d/b").c_str(), (scratch / "a").c_str(), 1), 0);
+        EXPECT_EQ(permissionsBefore, 0600u);
+    }
+}
 
 TEST(HostFilePosix, copies_exactly_the_permissions_and_the_nanoseconds) {
     Umask const mask{077};

@@ -1,0 +1,97 @@
+#include "tests/faults/scenario.h"
+
+#include <zor_basis/flat.h>
+#include <zor_basis/log.h>
+#include <zor_basis/system.h>
+#include <zor_basis/timers.h>
+
+#include <xos_host.h>
+
+#include <memory>
+
+using namespace ZOR_Basis;
+
+namespace {
+
+/// The folder is the system's root, with a configuration.
+void prepareRoot(Place const& place) {
+    makeFolder(place / "system");
+    makeFolder(place / "tmp");
+    makeFolder(place / "system/config");
+    put(place / "system/config/vdp.cfg", "VDP = on\nVPS = off\n");
+    put(place / "page", "the page");
+    xos_HostSetRoot((place / "system").c_str());
+}
+
+bool makesTemporaryFolders(Place const&) {
+    VDPTempDir const folder(true);
+    return folder.status();
+}
+bool gets(Place const& place) {
+    return Url::Get((place / "got").c_str(), ("file://" + (place / "page")).c_str(), nullptr, nullptr, true, false);
+}
+bool runs(Place const& place) { return ZB_runCommand("exit 0", place.path.c_str(), false); }
+bool creates(Place const&) {
+    unsigned long id = 0;
+    int exitCode = -1;
+    return Process::Create("/bin/true", &id, "/bin/true", &exitCode) && exitCode == 0;
+}
+bool createsAndWaits(Place const&) {
+    unsigned long id = 0;
+    return Process::Create("/bin/true", &id, "/bin/true", nullptr) && Process::Wait(id);
+}
+bool knowsUsers(Place const&) {
+    BufStr<15> user;
+    BufStr<15> domain;
+    return Sys::CurrentUser(user, false) && Sys::CurHumanUser(user) && Sys::ParseUser(Str("a\\b"), user, domain);
+}
+bool knowsDrives(Place const& place) {
+    FPath unc;
+    Sys::UnMap(Str(place.path), unc);
+    return Sys::isLocalDisk(Str(place.path));
+}
+bool readsFlags(Place const&) { return setVDPFlagsFromCFG() == 0; }
+
+bool logs(Place const&) {
+    Log const log("faults");
+    for (int i = 0; i < 20; ++i) log.out("line %d of %s", i, "a log");
+    return log.flush();
+}
+bool reportsTimers(Place const&) {
+    static int number = 0;
+    TimerMgr* const manager = TimerMgr::New(("faults " + std::to_string(number++)).c_str(), 5);
+    if (manager == nullptr) return false;
+    PileTimer* const timer = manager->createTimer("a timer", 1, number % 2 == 0);
+    if (timer == nullptr) return false;
+    manager->setActive(true);
+    manager->start(1);
+    manager->stop(1);
+    manager->resetTimers(true);
+    return manager->getTimer(1) == timer;
+}
+bool parses(Place const&) {
+    std::string const text = "first line\nsecond line\n";
+    ZB_Parse parse(text.c_str(), static_cast<int>(text.size()));
+    char line[20];
+    int length = 0;
+    FPath name;
+    return parse.getLine(19, line, &length) && parse.checkLine("second line");
+}
+
+} // namespace
+
+Scenarios systemScenarios() {
+    return {
+        {"VDPTempDir", prepareRoot, makesTemporaryFolders, Scenario::NAMES},
+        {"Url::Get", prepareRoot, gets},
+        {"ZB_runCommand", prepareRoot, runs},
+        {"Process::Create", prepareRoot, creates},
+        {"Process::Wait", prepareRoot, createsAndWaits},
+        {"Sys::CurrentUser", prepareRoot, knowsUsers},
+        {"Sys::isLocalDisk, UnMap", prepareRoot, knowsDrives},
+        {"setVDPFlagsFromCFG", prepareRoot, readsFlags},
+        {"Log", prepareRoot, logs, Scenario::NAMES},
+        {"TimerMgr", prepareRoot, reportsTimers, Scenario::NAMES},
+        {"ZB_Parse", prepareNothing, parses},
+    };
+}
