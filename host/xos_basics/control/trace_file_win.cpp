@@ -12,6 +12,10 @@ static_assert(sizeof(HANDLE) == sizeof(TraceFile));
 
 namespace {
 
+constexpr DWORD FAR_BEHIND = 0x40000000;
+
+constinit QuickMutex mutex;
+
 /// One writer at a time, in all processes: not every system that runs Windows programs appends in one step. It locks a
 /// byte behind every line; standard error cannot be locked if it is no file.
 class Turn {
@@ -28,15 +32,10 @@ public:
     }
 
 private:
-    static constexpr DWORD FAR_BEHIND = 0x40000000;
-    static constinit QuickMutex mutex;
-
     HANDLE file_;
     OVERLAPPED place_{0, 0, {{0, FAR_BEHIND}}, nullptr};
     bool isLocked_;
 };
-
-constinit QuickMutex Turn::mutex;
 
 } // namespace
 
