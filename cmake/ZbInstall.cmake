@@ -76,6 +76,21 @@ if(ZB_SPLIT_DEBUG_SYMBOLS)
   endforeach()
 endif()
 
+# How debuggers show values: gdb looks for printers beside the library, and for those of the system's libraries below
+# its own folder; Visual Studio takes the other file from the project that is debugged.
+set(zb_printers $<TARGET_FILE_NAME:zor_basis>-gdb.py)
+if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+  set(zb_printers_dir ${CMAKE_INSTALL_DATAROOTDIR}/gdb/auto-load${CMAKE_INSTALL_FULL_LIBDIR})
+elseif(WIN32)
+  set(zb_printers_dir ${CMAKE_INSTALL_BINDIR})
+else()
+  set(zb_printers_dir ${CMAKE_INSTALL_LIBDIR})
+endif()
+install(FILES ${PROJECT_SOURCE_DIR}/tools/debuggers/zor_basis_printers.py DESTINATION ${zb_printers_dir}
+  COMPONENT library RENAME ${zb_printers})
+install(FILES ${PROJECT_SOURCE_DIR}/tools/debuggers/zor_basis.natvis DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/zor_basis
+  COMPONENT development)
+
 set(zb_doc_dir ${CMAKE_INSTALL_DATAROOTDIR}/doc/libzor-basis-doc)
 install(FILES ${PROJECT_SOURCE_DIR}/README.md ${PROJECT_SOURCE_DIR}/CHANGELOG.md
   DESTINATION ${zb_doc_dir} COMPONENT documentation)

@@ -11,16 +11,21 @@ namespace HQ_Basis {
 
 std::uint32_t AlertTimer::New(std::uint32_t periodMs, Callback callback, void* context) {
     auto const callbackWord = static_cast<std::uint64_t>(reinterpret_cast<std::uintptr_t>(callback));
-    if (host::failsNow("HQ_Basis::AlertTimer::New", {periodMs, callbackWord, host::addressArgument(context)}) ||
-        callback == nullptr) {
-        return 0;
-    }
-    host::offerAlertFire(fireAlert);
-    return host::AlertService::instance().add(periodMs, callback, context);
+    auto const add = [=]() -> std::uint32_t {
+        if (callback == nullptr) return 0;
+        host::offerAlertFire(fireAlert);
+        return host::AlertService::instance().add(periodMs, callback, context);
+    };
+    return host::call<std::uint32_t>("HQ_Basis::AlertTimer::New",
+                                     {periodMs, callbackWord, host::addressArgument(context)}, 0, add);
 }
 
 void AlertTimer::Delete(std::uint32_t id) {
-    if (!host::failsNow("HQ_Basis::AlertTimer::Delete", {id})) host::AlertService::instance().remove(id);
+    auto const remove = [=] {
+        host::AlertService::instance().remove(id);
+        return 0;
+    };
+    host::call("HQ_Basis::AlertTimer::Delete", {id}, -1, remove);
 }
 
 } // namespace HQ_Basis

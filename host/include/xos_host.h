@@ -11,7 +11,19 @@
 ///     puts(xos_HostLastCall("xos_FileMove")); // "new", "old", 1
 ///
 /// The library reads these environment variables: `XOS_ROOT` (the root of the file system), `XOS_CONFIG` (the folder of
-/// the configuration groups), `XOS_FAULTS` (failures to inject from the start).
+/// the configuration groups), `XOS_FAULTS` (failures to inject from the start), `XOS_TRACE` (the file to which all
+/// calls are written).
+///
+/// `XOS_TRACE` is read when the library is loaded. It names a file, to which lines are appended, or is "-" for standard
+/// error. Every call of a platform function writes one line when it returns; a call that never returns has none:
+///
+///     2026-11-22T19:47:08.123456Z 1234/1240 xos_FileMove("new", "old", 1) = -1, error 2, 13.0 us
+///
+/// The line contains the time of the call (UTC), the process, the thread, the arguments in the form of
+/// `xos_HostLastCall`, the result ("void" if there is none) and the duration. A failed call adds the last error that it
+/// set. In texts, control characters become `\x0a`. Asterisks replace passwords in the last argument of `xos_URLGet`
+/// and in URLs; those in command lines remain. The file belongs to its user alone. Threads and processes may share it,
+/// as each line is written in one step. If it cannot be opened, standard error gets a line and nothing is traced.
 ///
 /// A function is identified by its C name (`"xos_FileMove"`, `"cfg_GroupDelete"`); the two of module `hq_basis` are
 /// `"HQ_Basis::AlertTimer::New"` and `"HQ_Basis::AlertTimer::Delete"`.
@@ -135,6 +147,16 @@ XOS_HOST_API int xos_HostAlertFire(uint32_t id);
 /// \param arguments  holds one word for each argument; for a text its address
 /// \return 1 if the call must fail (the last error is then set), otherwise 0; 0 also if there is no such function
 XOS_HOST_API int xos_HostEnter(char const* function, uint64_t const* arguments, uint32_t count);
+
+/// Begins a call of another module in the trace.
+/// \param arguments  holds one word for each argument; for a text its address
+/// \return what `xos_HostTraceEnd` takes; null without a trace
+XOS_HOST_API void* xos_HostTraceBegin(char const* function, uint64_t const* arguments, uint32_t count);
+
+/// Writes a call of another module to the trace.
+/// \param traced  is released; null: nothing happens
+/// \param hasFailed  tells that the call failed: its line then contains the last error
+XOS_HOST_API void xos_HostTraceEnd(void* traced, uint64_t result, int hasFailed);
 
 /// Sets the function that `xos_HostAlertFire` calls; null: none.
 XOS_HOST_API void xos_HostOfferAlertFire(int (*fire)(uint32_t id));

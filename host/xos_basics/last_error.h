@@ -18,6 +18,22 @@ enum class Error {
 
 void setLastError(Error error);
 
+/// The system's own code; 0: none.
+unsigned long lastError();
+void restoreLastError(unsigned long code);
+
+/// The last error while something is cleared away.
+class KeepLastError {
+public:
+    KeepLastError() = default;
+    KeepLastError(KeepLastError const&) = delete;
+    KeepLastError& operator=(KeepLastError const&) = delete;
+    ~KeepLastError() { restoreLastError(code_); }
+
+private:
+    unsigned long code_{lastError()};
+};
+
 } // namespace host
 
 #endif

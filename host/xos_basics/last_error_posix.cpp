@@ -29,4 +29,8 @@ void setLastError(Error error) {
     }
 }
 
+unsigned long lastError() { return static_cast<unsigned long>(errno); }
+
+void restoreLastError(unsigned long code) { errno = static_cast<int>(code); }
+
 } // namespace host

@@ -28,4 +28,8 @@ void setLastError(Error error) {
     }
 }
 
+unsigned long lastError() { return GetLastError(); }
+
+void restoreLastError(unsigned long code) { SetLastError(code); }
+
 } // namespace host

@@ -78,13 +78,13 @@ bool get(char const* url, char const* targetPath, char const* user, char const* 
 extern "C" int xos_URLGet(char const* url, char const* target, char const* first, char const* second) {
     using host::addressArgument;
     constexpr int FAILED = -1;
-    if (host::failsNow("xos_URLGet", {addressArgument(url), addressArgument(target), addressArgument(first),
-                                      addressArgument(second)})) {
-        return FAILED;
-    }
-    if (url == nullptr || target == nullptr || *target == '\0') {
-        host::failFor(host::Reason::BAD_ARGUMENT);
-        return FAILED;
-    }
-    return host::get(url, target, first, second) ? 0 : FAILED;
+    auto const get = [=] {
+        bool const isComplete = url != nullptr && target != nullptr && *target != '\0';
+        bool const isGot =
+            isComplete ? host::get(url, target, first, second) : host::failFor(host::Reason::BAD_ARGUMENT);
+        return isGot ? 0 : FAILED;
+    };
+    host::Arguments const arguments{addressArgument(url), addressArgument(target), addressArgument(first),
+                                    addressArgument(second)};
+    return host::call("xos_URLGet", arguments, FAILED, get);
 }

@@ -1,7 +1,8 @@
 #!/usr/bin/env python3
 """Behaviour that looks odd and is relied upon has an id. A public header describes it (`\\kept id: text`), a comment
 marks its place in the code (`// kept id: text`), and a test with the id in its name pins it (`Kept_room_01_…`).
-Writes docs/kept.md, which names the header and the test's file of each."""
+Writes docs/kept.md, which names the header and the test's file of each, and docs/guide/traps.md, which explains those
+of docs/guide/traps.txt to users."""
 
 import re
 import textwrap
@@ -19,6 +20,14 @@ A comment marks each at its place in the code, and the named test fails as soon 
 
 """
 
+TRAPS = "docs/guide/traps.txt"
+TRAPS_HEAD = """# Traps you will meet
+
+Some behaviour surprises, and must stay because callers rely on it. These are the cases that cost time; each says what
+to do instead. The [list of all](../kept.md) also names the test that pins each.
+
+"""
+
 
 def gather(pattern, paths, key=lambda match: match[1]):
     found = {}
@@ -30,11 +39,9 @@ def gather(pattern, paths, key=lambda match: match[1]):
 
 def entry(identity, header, match, tests):
     """One item of the list: the text of the public header, the header, and the files of the tests."""
-    words = " ".join(re.sub(r"\n\s*///", " ", match[2]).split())
     pinned = ", ".join(f"`{name}`" for name in sorted({str(path) for path, _ in tests}))
-    told = f"**{identity}** {words} (`{str(header).removeprefix('include/')}`; pinned by {pinned})"
-    return textwrap.fill(told, COLUMNS, initial_indent="- ", subsequent_indent="  ", break_long_words=False,
-                         break_on_hyphens=False)
+    told = f"**{identity}** {words_of(match)} (`{str(header).removeprefix('include/')}`; pinned by {pinned})"
+    return wrapped(told, initial_indent="- ", subsequent_indent="  ")
 
 
 def listed(told, tests):
@@ -44,6 +51,40 @@ def listed(told, tests):
             lines.append(f"\n## {room}\n" if lines else f"## {room}\n")
         lines.append(entry(identity, *told[identity][0], tests.get(identity, [])))
     return HEAD + "\n".join(lines) + "\n"
+
+
+def words_of(match):
+    return " ".join(re.sub(r"\n\s*///", " ", match[2]).split())
+
+
+def wrapped(text, **options):
+    return textwrap.fill(text, COLUMNS, break_long_words=False, break_on_hyphens=False, **options)
+
+
+def traps(told, problems):
+    """The page of the traps: what to do instead, and what the header says."""
+    lines = []
+    for number, line in enumerate(common.text(TRAPS).splitlines(), 1):
+        if line.startswith("## "):
+            lines.append(line + "\n")
+        elif line and not line.startswith("#"):
+            identity, what, instead = (part.strip() for part in line.split("|"))
+            if identity not in told:
+                problems.append(f"{TRAPS}:{number}: no header has {identity}")
+                continue
+            header, match = told[identity][0]
+            lines.append(f"### {what}\n")
+            lines.append(wrapped(instead) + "\n")
+            reason = f"`{str(header).removeprefix('include/')}`, {identity}: {words_of(match)}"
+            lines.append(wrapped(reason, initial_indent="> ", subsequent_indent="> ") + "\n")
+    return TRAPS_HEAD + "\n".join(lines)
+
+
+def update(name, content, problems):
+    page = common.ROOT / name
+    if not page.exists() or page.read_text() != content:
+        page.write_text(content)
+        problems.append(f"{name} was out of date and has been rewritten; commit it")
 
 
 def main():
@@ -58,11 +99,8 @@ def main():
         for name, where in lists.items():
             if identity not in where:
                 problems.append(f"{identity} lacks {name}")
-    page = common.ROOT / "docs/kept.md"
-    content = listed(told, tests)
-    if not page.exists() or page.read_text() != content:
-        page.write_text(content)
-        problems.append("docs/kept.md was out of date and has been rewritten; commit it")
+    update("docs/kept.md", listed(told, tests), problems)
+    update("docs/guide/traps.md", traps(told, problems), problems)
     common.finish("kept", problems, len(told))
 
 

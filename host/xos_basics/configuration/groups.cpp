@@ -75,16 +75,7 @@ int switchOf(cfg_Group const& group, char const* key, int fallback) {
     return *value ? 1 : 0;
 }
 
-} // namespace
-
-extern "C" {
-
-void xos_HostSetConfigDir(char const* path) { directory.set(path); }
-
-cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2, int reserved3) {
-    if (host::failsNow(host::Function::cfg_GroupLoadFromFile, name, reserved1, reserved2, reserved3)) {
-        return nullptr;
-    }
+cfg_Group* loadGroup(char const* name) {
     if (!isName(name)) {
         host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
@@ -103,14 +94,29 @@ cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2,
     return group.release();
 }
 
+} // namespace
+
+extern "C" {
+
+void xos_HostSetConfigDir(char const* path) { directory.set(path); }
+
+cfg_Group* cfg_GroupLoadFromFile(char const* name, int reserved1, int reserved2, int reserved3) {
+    return host::call<cfg_Group*>(
+        host::Function::cfg_GroupLoadFromFile, nullptr, [=] { return loadGroup(name); }, name, reserved1, reserved2,
+        reserved3);
+}
+
 int cfg_KeyGetOpt_Bool(cfg_Group* group, char const* key, int fallback) {
-    if (host::failsNow(host::Function::cfg_KeyGetOpt_Bool, group, key, fallback)) return fallback;
-    return group == nullptr || key == nullptr ? fallback : switchOf(*group, key, fallback);
+    auto const get = [=] { return group == nullptr || key == nullptr ? fallback : switchOf(*group, key, fallback); };
+    return host::call(host::Function::cfg_KeyGetOpt_Bool, fallback, get, group, key, fallback);
 }
 
 void cfg_GroupDelete(cfg_Group* group, int reserved) {
-    static_cast<void>(host::failsNow(host::Function::cfg_GroupDelete, group, reserved));
-    delete group;
+    auto const remove = [=] {
+        delete group;
+        return host::NEVER_FAILS;
+    };
+    host::call(host::Function::cfg_GroupDelete, host::NEVER_FAILS, remove, group, reserved);
 }
 
 } // extern "C"

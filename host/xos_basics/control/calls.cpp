@@ -1,12 +1,11 @@
 // The record of calls as others read it, and calls on behalf of other modules.
 
 #include "host/include/xos_host.h"
+#include "host/xos_basics/control/call_text.h"
 #include "host/xos_basics/control/control.h"
 
 #include <algorithm>
 #include <array>
-#include <cinttypes>
-#include <cstdio>
 #include <mutex>
 #include <string>
 #include <string_view>
@@ -29,13 +28,8 @@ bool tryCopy(CallRecord const& record, Words& words) {
 }
 
 std::string argumentText(char kind, std::uint64_t word, std::string const& texts) {
-    if (kind == 't') return word == NULL_TEXT ? "null" : '"' + std::string(texts.c_str() + word) + '"';
-    if (kind == 'd') return std::to_string(static_cast<std::int64_t>(word));
-    if (kind == 'u') return std::to_string(word);
-    if (kind == 'p' && word == 0) return "null";
-    char digits[24];
-    std::snprintf(digits, sizeof digits, "0x%" PRIx64, word);
-    return digits;
+    if (!isText(kind)) return numberText(kind, word);
+    return word == NULL_TEXT ? "null" : '"' + std::string(texts.c_str() + word) + '"';
 }
 
 std::string callText(std::string_view kinds, CallRecord& record) {
@@ -63,7 +57,7 @@ void noteCall(Function function, ThreadCalls& mine, std::uint64_t const* argumen
     CallRecord& record = mine.records[indexOf(function)];
     std::uint64_t const begun = beginCall(function, record);
     for (std::size_t i = 0; i < std::min(count, kinds.size()); ++i) {
-        if (kinds[i] == 't') {
+        if (isText(kinds[i])) {
             record.addText(i, reinterpret_cast<char const*>(arguments[i]));
         } else {
             record.addWord(i, arguments[i]);

@@ -1,7 +1,8 @@
 /// \file
-/// What every platform function does first: count the call, remember its arguments, and ask whether it must fail.
+/// What surrounds the body of every platform function: the call is counted, its arguments are remembered, it fails if
+/// that was asked for, and it is traced if XOS_TRACE asks for that.
 ///
-///     if (failsNow(Function::xos_FileMove, dst, src, overwrite)) return FAILED;
+///     return call(Function::xos_FileFlush, FAILED, [=] { return flush(handle); }, handle);
 ///
 /// Always on, correct from any thread, about a nanosecond. The arguments are given in the order and number of the
 /// function's kinds in functions.h. A `char const*` is a text, which is copied; any other pointer is an address.
@@ -18,7 +19,9 @@
 #define HOST_XOS_BASICS_CONTROL_CONTROL_H
 
 #include "host/compiler.h"
+#include "host/xos_basics/control/faults.h"
 #include "host/xos_basics/control/functions.h"
+#include "host/xos_basics/control/trace.h"
 #include "host/xos_basics/this_thread.h"
 #include "host/xos_basics/wait/quick_mutex.h"
 
@@ -30,6 +33,8 @@
 #include <type_traits>
 
 namespace host {
+
+constexpr int NEVER_FAILS = 0;
 
 constexpr std::uint64_t NULL_TEXT = ~std::uint64_t{0};
 
@@ -79,17 +84,6 @@ ThreadCalls* adoptThreadCalls();
 
 inline ThreadCalls* threadCalls() { return thisThread.calls != nullptr ? thisThread.calls : adoptThreadCalls(); }
 
-/// The failures asked for: the calls to skip in the upper half, the failures in the lower; 0: none.
-extern constinit std::array<std::atomic<std::uint64_t>, FUNCTION_COUNT> faults;
-
-/// Counts one call down.
-/// \return whether it fails; the last error is then set
-bool takesInjectedFailure(Function function);
-
-inline bool failsOnDemand(Function function) {
-    return faults[indexOf(function)].load(std::memory_order_relaxed) != 0 && takesInjectedFailure(function);
-}
-
 /// \return the sequence number for `endCall`
 HOST_INLINE std::uint64_t beginCall(Function function, CallRecord& record) {
     if (factsOf(function).hasTexts) {
@@ -101,16 +95,23 @@ HOST_INLINE std::uint64_t beginCall(Function function, CallRecord& record) {
     return begun;
 }
 
+/// Signed numbers keep their sign in 64 bits; a text is its address.
+template <class Argument>
+HOST_INLINE std::uint64_t wordOf(Argument const& argument) {
+    if constexpr (std::is_pointer_v<Argument>) {
+        return reinterpret_cast<std::uintptr_t>(argument);
+    } else {
+        static_assert(std::is_integral_v<Argument>);
+        return static_cast<std::uint64_t>(static_cast<std::int64_t>(argument));
+    }
+}
+
 template <class Argument>
 HOST_INLINE void noteArgument(CallRecord& record, std::size_t index, Argument const& argument) {
     if constexpr (std::is_same_v<Argument, char const*>) {
         record.addText(index, argument);
-    } else if constexpr (std::is_pointer_v<Argument>) {
-        record.addWord(index, reinterpret_cast<std::uintptr_t>(argument));
     } else {
-        static_assert(std::is_integral_v<Argument>);
-        // Signed numbers keep their sign in 64 bits.
-        record.addWord(index, static_cast<std::uint64_t>(static_cast<std::int64_t>(argument)));
+        record.addWord(index, wordOf(argument));
     }
 }
 
@@ -126,16 +127,36 @@ HOST_INLINE void endCall(Function function, CallRecord& record, ThreadCalls& min
 }
 
 template <class... Arguments>
-HOST_INLINE bool failsNow(Function function, Arguments const&... arguments) {
+HOST_INLINE void recordCall(Function function, Arguments const&... arguments) {
     static_assert(sizeof...(Arguments) <= MAX_ARGUMENTS);
-    if (ThreadCalls* const mine = threadCalls()) {
-        CallRecord& record = mine->records[indexOf(function)];
-        std::uint64_t const begun = beginCall(function, record);
-        std::size_t index = 0;
-        (noteArgument(record, index++, arguments), ...);
-        endCall(function, record, *mine, begun);
-    }
-    return failsOnDemand(function);
+    ThreadCalls* const mine = threadCalls();
+    if (mine == nullptr) return;
+    CallRecord& record = mine->records[indexOf(function)];
+    std::uint64_t const begun = beginCall(function, record);
+    std::size_t index = 0;
+    (noteArgument(record, index++, arguments), ...);
+    endCall(function, record, *mine, begun);
+}
+
+/// The body of a function that may have to fail, or is traced. Takes copies, as what is in registers otherwise would
+/// have to be in memory at every call.
+template <class Result, class Body, class... Arguments>
+HOST_COLD Result callWatched(Function function, Result failure, Body body, Arguments... arguments) {
+    if (!isTracing()) return takesInjectedFailure(function) ? failure : body();
+    std::array<std::uint64_t, sizeof...(Arguments)> const words{wordOf(arguments)...};
+    TracedCall traced{function, words.data(), words.size()};
+    Result const result = takesInjectedFailure(function) ? failure : body();
+    traced.end(wordOf(result), result == failure);
+    return result;
+}
+
+/// \param failure  is what the function returns when it fails on demand; `NEVER_FAILS` if it cannot
+/// \param body  does the function's work; for one that returns nothing it returns `NEVER_FAILS`
+template <class Result, class Body, class... Arguments>
+HOST_INLINE Result call(Function function, Result failure, Body const& body, Arguments const&... arguments) {
+    recordCall(function, arguments...);
+    if (isWatched(function)) return callWatched<Result, Body, Arguments...>(function, failure, body, arguments...);
+    return body();
 }
 
 } // namespace host

@@ -1,7 +1,6 @@
-// Failures on demand: which function fails after how many successful calls, and how often.
+#include "host/xos_basics/control/faults.h"
 
 #include "host/include/xos_host.h"
-#include "host/xos_basics/control/control.h"
 #include "host/xos_basics/last_error.h"
 
 #include <algorithm>
@@ -19,6 +18,13 @@ namespace {
 
 constexpr int SKIP_SHIFT = 32;
 constexpr std::uint64_t ONE_SKIPPED = std::uint64_t{1} << SKIP_SHIFT;
+/// Calls to skip but no failures: all calls are watched.
+constexpr std::uint64_t WATCHED = ONE_SKIPPED;
+constinit std::atomic<bool> areAllWatched{false};
+
+bool hasFailures(std::uint64_t fault) { return static_cast<std::uint32_t>(fault) != 0; }
+
+std::uint64_t withoutFailures() { return areAllWatched ? WATCHED : 0; }
 
 /// Takes the number behind the last ":" off the end of `text`.
 bool takeNumber(std::string_view& text, std::uint32_t& number) {
@@ -55,9 +61,10 @@ char const* const listAtLoad = std::getenv("XOS_FAULTS");
 
 bool takesInjectedFailure(Function function) {
     std::atomic<std::uint64_t>& fault = faults[indexOf(function)];
-    for (std::uint64_t seen = fault.load(std::memory_order_relaxed); seen != 0;) {
+    for (std::uint64_t seen = fault.load(std::memory_order_relaxed); hasFailures(seen);) {
         bool const fails = seen < ONE_SKIPPED;
-        std::uint64_t const next = seen - (fails ? 1 : ONE_SKIPPED);
+        std::uint64_t const left = seen - (fails ? 1 : ONE_SKIPPED);
+        std::uint64_t const next = hasFailures(left) ? left : withoutFailures();
         if (!fault.compare_exchange_weak(seen, next, std::memory_order_relaxed)) continue;
         if (fails) setLastError(Error::INJECTED);
         return fails;
@@ -65,16 +72,27 @@ bool takesInjectedFailure(Function function) {
     return false;
 }
 
+void watchAllCalls() {
+    areAllWatched = true;
+    for (std::atomic<std::uint64_t>& fault : faults) {
+        std::uint64_t none = 0; // otherwise XOS_FAULTS has asked for a failure
+        fault.compare_exchange_strong(none, WATCHED, std::memory_order_relaxed);
+    }
+}
+
 } // namespace host
 
 int xos_HostFail(char const* name, uint32_t skip, uint32_t times) {
     host::Function const function = host::functionNamed(name);
     if (function == host::Function::NONE || (host::factsOf(function).traits & host::CAN_FAIL) == 0) return -1;
-    std::uint64_t const fault = times == 0 ? 0 : std::uint64_t{skip} << host::SKIP_SHIFT | times;
-    host::faults[host::indexOf(function)].store(fault, std::memory_order_relaxed);
+    std::uint64_t const fault = std::uint64_t{skip} << host::SKIP_SHIFT | times;
+    host::faults[host::indexOf(function)].store(times == 0 ? host::withoutFailures() : fault,
+                                                std::memory_order_relaxed);
     return 0;
 }
 
 void xos_HostFailClear(void) {
-    for (std::atomic<std::uint64_t>& fault : host::faults) { fault.store(0, std::memory_order_relaxed); }
+    for (std::atomic<std::uint64_t>& fault : host::faults) {
+        fault.store(host::withoutFailures(), std::memory_order_relaxed);
+    }
 }

@@ -10,10 +10,11 @@
 #include <cstring>
 #include <string>
 
+using host::call;
 using host::FAILED;
-using host::failsNow;
 using host::Function;
 using host::given;
+using host::NEVER_FAILS;
 using host::resultOf;
 
 namespace {
@@ -44,30 +45,7 @@ Listing* listingOf(xos_Dir handle) {
     return reinterpret_cast<Listing*>(static_cast<std::uintptr_t>(handle));
 }
 
-} // namespace
-
-int xos_DirCreateEx(char const* path, int reserved) {
-    if (failsNow(Function::xos_DirCreateEx, path, reserved) || !given(path)) return FAILED;
-    return resultOf([&] { return host::createDirectory(path); });
-}
-
-int xos_DirRemove(char const* path, uint32_t flags) {
-    if (failsNow(Function::xos_DirRemove, path, flags) || !given(path)) return FAILED;
-    return resultOf([&] { return host::removeDirectory(path, (flags & RECURSIVE) != 0); });
-}
-
-int xos_DirCopy(char const* dst, char const* src, uint32_t flags) {
-    if (failsNow(Function::xos_DirCopy, dst, src, flags) || !given(dst, src)) return FAILED;
-    return resultOf([&] { return host::copyDirectory(dst, src, (flags & OVERWRITE) != 0, (flags & RECURSIVE) != 0); });
-}
-
-int xos_DirMove(char const* dst, char const* src, uint32_t flags) {
-    if (failsNow(Function::xos_DirMove, dst, src, flags) || !given(dst, src)) return FAILED;
-    return resultOf([&] { return host::moveDirectory(dst, src, (flags & OVERWRITE) != 0); });
-}
-
-xos_Dir xos_DirOpenEx(char const* path, char const* pattern, uint32_t flags) {
-    if (failsNow(Function::xos_DirOpenEx, path, pattern, flags) || !given(path)) return 0;
+xos_Dir openListing(char const* path, char const* pattern) {
     return host::unlessMemoryLacks(xos_Dir{0}, [&]() -> xos_Dir {
         auto listing = std::make_unique<Listing>();
         listing->entries = host::RawListing::open(path);
@@ -77,28 +55,74 @@ xos_Dir xos_DirOpenEx(char const* path, char const* pattern, uint32_t flags) {
     });
 }
 
-void xos_DirForceCaseAny(xos_Dir handle, int on) {
-    failsNow(Function::xos_DirForceCaseAny, handle, on);
-    if (Listing* const listing = listingOf(handle)) listing->anyCase = on != 0;
-}
-
-char const* xos_DirNextEx(xos_Dir handle, int kind, int reserved, uint32_t flags) {
-    if (failsNow(Function::xos_DirNextEx, handle, kind, reserved, flags)) return nullptr;
-    Listing* const listing = listingOf(handle);
-    if (listing == nullptr) return nullptr;
+char const* nextName(Listing& listing, int kind) {
     if (kind < ALL || kind > FILES) {
         host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
     }
-    while (char const* const name = listing->entries->next()) {
-        if (listing->accepts(name) && (kind == ALL || listing->entries->isDirectory() == (kind == DIRECTORIES))) {
+    while (char const* const name = listing.entries->next()) {
+        if (listing.accepts(name) && (kind == ALL || listing.entries->isDirectory() == (kind == DIRECTORIES))) {
             return name;
         }
     }
     return nullptr;
 }
 
+} // namespace
+
+int xos_DirCreateEx(char const* path, int reserved) {
+    auto const create = [=] { return resultOf([&] { return given(path) && host::createDirectory(path); }); };
+    return call(Function::xos_DirCreateEx, FAILED, create, path, reserved);
+}
+
+int xos_DirRemove(char const* path, uint32_t flags) {
+    auto const remove = [=] {
+        return resultOf([&] { return given(path) && host::removeDirectory(path, (flags & RECURSIVE) != 0); });
+    };
+    return call(Function::xos_DirRemove, FAILED, remove, path, flags);
+}
+
+int xos_DirCopy(char const* dst, char const* src, uint32_t flags) {
+    auto const copy = [=] {
+        return resultOf([&] {
+            return given(dst, src) && host::copyDirectory(dst, src, (flags & OVERWRITE) != 0, (flags & RECURSIVE) != 0);
+        });
+    };
+    return call(Function::xos_DirCopy, FAILED, copy, dst, src, flags);
+}
+
+int xos_DirMove(char const* dst, char const* src, uint32_t flags) {
+    auto const move = [=] {
+        return resultOf([&] { return given(dst, src) && host::moveDirectory(dst, src, (flags & OVERWRITE) != 0); });
+    };
+    return call(Function::xos_DirMove, FAILED, move, dst, src, flags);
+}
+
+xos_Dir xos_DirOpenEx(char const* path, char const* pattern, uint32_t flags) {
+    auto const open = [=] { return given(path) ? openListing(path, pattern) : xos_Dir{0}; };
+    return call<xos_Dir>(Function::xos_DirOpenEx, 0, open, path, pattern, flags);
+}
+
+void xos_DirForceCaseAny(xos_Dir handle, int on) {
+    auto const force = [=] {
+        if (Listing* const listing = listingOf(handle)) listing->anyCase = on != 0;
+        return NEVER_FAILS;
+    };
+    call(Function::xos_DirForceCaseAny, NEVER_FAILS, force, handle, on);
+}
+
+char const* xos_DirNextEx(xos_Dir handle, int kind, int reserved, uint32_t flags) {
+    auto const next = [=]() -> char const* {
+        Listing* const listing = listingOf(handle);
+        return listing == nullptr ? nullptr : nextName(*listing, kind);
+    };
+    return call<char const*>(Function::xos_DirNextEx, nullptr, next, handle, kind, reserved, flags);
+}
+
 void xos_DirClose(xos_Dir handle) {
-    failsNow(Function::xos_DirClose, handle);
-    delete listingOf(handle);
+    auto const close = [=] {
+        delete listingOf(handle);
+        return NEVER_FAILS;
+    };
+    call(Function::xos_DirClose, NEVER_FAILS, close, handle);
 }

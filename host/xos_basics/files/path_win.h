@@ -8,6 +8,7 @@
 
 #include "host/windows_api.h"
 #include "host/xos_basics/files/slashes.h"
+#include "host/xos_basics/last_error.h"
 
 #include <string>
 #include <utility>
@@ -18,19 +19,6 @@ inline bool failWith(DWORD error) {
     SetLastError(error);
     return false;
 }
-
-/// Keeps the last error of a failure while what it left is cleared away.
-class KeepLastError {
-public:
-    KeepLastError() : kept_(GetLastError()) {}
-    ~KeepLastError() { SetLastError(kept_); }
-    KeepLastError(KeepLastError const&) = delete;
-    KeepLastError& operator=(KeepLastError const&) = delete;
-
-private:
-    DWORD kept_;
-};
-
 /// Owner of a handle that is closed by `CloseHandle`.
 class Handle {
 public:

@@ -58,6 +58,6 @@ xos_Sem handleById(int id, std::uint32_t* word) {
 } // namespace host
 
 extern "C" xos_Sem xos_SemNamedMutexCreate(int id, int flags, int reserved, uint32_t* word) {
-    if (host::failsNow(host::Function::xos_SemNamedMutexCreate, id, flags, reserved, word)) return 0;
-    return host::handleById(id, word);
+    auto const create = [=] { return host::handleById(id, word); };
+    return host::call<xos_Sem>(host::Function::xos_SemNamedMutexCreate, 0, create, id, flags, reserved, word);
 }

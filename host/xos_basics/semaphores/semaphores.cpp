@@ -9,7 +9,7 @@
 #include <atomic>
 #include <cstdint>
 
-using host::failsNow;
+using host::call;
 using host::Function;
 
 namespace {
@@ -73,23 +73,8 @@ int giveBinary(host::Semaphore& semaphore) {
 
 xos_Sem handleOf(host::Semaphore const* semaphore) { return semaphore == nullptr ? 0 : semaphore->handle.load(); }
 
-} // namespace
-
-extern "C" {
-
-xos_Sem xos_SemMCreate(void) {
-    if (failsNow(Function::xos_SemMCreate)) return 0;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::MUTEX, host::WORD_FREE));
-}
-
-xos_Sem xos_SemBCreate(int available) {
-    if (failsNow(Function::xos_SemBCreate, available)) return 0;
-    std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
-    return handleOf(host::makeSemaphore(host::SemaphoreKind::BINARY, state));
-}
-
-int xos_SemTake(xos_Sem sem) {
-    if (failsNow(Function::xos_SemTake, sem)) return host::FAILED;
+/// Into the functions themselves: most calls return before another one would have begun.
+HOST_INLINE int take(xos_Sem sem) {
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
     if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
@@ -102,8 +87,7 @@ int xos_SemTake(xos_Sem sem) {
     }
 }
 
-int xos_SemGive(xos_Sem sem) {
-    if (failsNow(Function::xos_SemGive, sem)) return host::FAILED;
+HOST_INLINE int give(xos_Sem sem) {
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
     if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     switch (semaphore->kind) {
@@ -116,14 +100,45 @@ int xos_SemGive(xos_Sem sem) {
     }
 }
 
-int xos_SemDestroy(xos_Sem sem) {
-    if (failsNow(Function::xos_SemDestroy, sem)) return host::FAILED;
+int destroy(xos_Sem sem) {
     host::Semaphore* const semaphore = host::semaphoreOf(sem);
     if (semaphore == nullptr) return failWith(host::Error::BAD_HANDLE);
     if (semaphore->kind == host::SemaphoreKind::MUTEX) leaveMutex(*semaphore);
     // A named mutex is the process's, not the caller's: others hold the same handle.
     if (semaphore->kind != host::SemaphoreKind::NAMED) host::freeSemaphore(semaphore);
     return 0;
+}
+
+} // namespace
+
+extern "C" {
+
+xos_Sem xos_SemMCreate(void) {
+    auto const create = [] { return handleOf(host::makeSemaphore(host::SemaphoreKind::MUTEX, host::WORD_FREE)); };
+    return call<xos_Sem>(Function::xos_SemMCreate, 0, create);
+}
+
+xos_Sem xos_SemBCreate(int available) {
+    auto const create = [=] {
+        std::uint32_t const state = available != 0 ? host::WORD_FREE : host::WORD_HELD;
+        return handleOf(host::makeSemaphore(host::SemaphoreKind::BINARY, state));
+    };
+    return call<xos_Sem>(Function::xos_SemBCreate, 0, create, available);
+}
+
+int xos_SemTake(xos_Sem sem) {
+    return call(
+        Function::xos_SemTake, host::FAILED, [=] { return take(sem); }, sem);
+}
+
+int xos_SemGive(xos_Sem sem) {
+    return call(
+        Function::xos_SemGive, host::FAILED, [=] { return give(sem); }, sem);
+}
+
+int xos_SemDestroy(xos_Sem sem) {
+    return call(
+        Function::xos_SemDestroy, host::FAILED, [=] { return destroy(sem); }, sem);
 }
 
 } // extern "C"

@@ -24,6 +24,16 @@ Listener currentListener() {
 
 char const* orEmpty(char const* text) { return text == nullptr ? "" : text; }
 
+void raise(int line, char const* module, char const* message) {
+    // Outside the lock, as a handler may raise assertions of its own or replace itself.
+    Listener const heard = currentListener();
+    if (heard.handler != nullptr) {
+        heard.handler(line, module, message, heard.context);
+    } else {
+        std::fprintf(stderr, "%s:%d: %s\n", orEmpty(module), line, orEmpty(message));
+    }
+}
+
 } // namespace
 
 extern "C" {
@@ -34,14 +44,11 @@ void xos_HostSetAssertHandler(xos_HostAssertHandler handler, void* context) {
 }
 
 void xos_Assert(int line, char const* module, char const* message) {
-    static_cast<void>(host::failsNow(host::Function::xos_Assert, line, module, message));
-    // Outside the lock, as a handler may raise assertions of its own or replace itself.
-    Listener const heard = currentListener();
-    if (heard.handler != nullptr) {
-        heard.handler(line, module, message, heard.context);
-    } else {
-        std::fprintf(stderr, "%s:%d: %s\n", orEmpty(module), line, orEmpty(message));
-    }
+    auto const assertion = [=] {
+        raise(line, module, message);
+        return host::NEVER_FAILS;
+    };
+    host::call(host::Function::xos_Assert, host::NEVER_FAILS, assertion, line, module, message);
 }
 
 } // extern "C"

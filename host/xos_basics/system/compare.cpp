@@ -5,7 +5,9 @@
 #include <cstring>
 
 extern "C" int xos_StrCmp(char const* a, char const* b) {
-    static_cast<void>(host::failsNow(host::Function::xos_StrCmp, a, b));
-    if (a == nullptr || b == nullptr) return static_cast<int>(a != nullptr) - static_cast<int>(b != nullptr);
-    return std::strcmp(a, b);
+    auto const compare = [=] {
+        if (a == nullptr || b == nullptr) return static_cast<int>(a != nullptr) - static_cast<int>(b != nullptr);
+        return std::strcmp(a, b);
+    };
+    return host::call(host::Function::xos_StrCmp, host::NEVER_FAILS, compare, a, b);
 }

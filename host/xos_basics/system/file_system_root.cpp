@@ -22,8 +22,7 @@ extern "C" {
 void xos_HostSetRoot(char const* path) { host::root.set(path); }
 
 char const* xos_FileSystemRoot(void) {
-    if (host::failsNow(host::Function::xos_FileSystemRoot)) return "";
-    return host::configuredRoot();
+    return host::call<char const*>(host::Function::xos_FileSystemRoot, "", host::configuredRoot);
 }
 
 } // extern "C"

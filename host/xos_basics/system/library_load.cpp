@@ -5,10 +5,10 @@
 #include "basis/platform/xos_basics.h"
 
 extern "C" void* xos_LibraryLoad(char const* name) {
-    if (host::failsNow(host::Function::xos_LibraryLoad, name)) return nullptr;
-    if (name == nullptr || *name == '\0') {
+    auto const load = [=]() -> void* {
+        if (name != nullptr && *name != '\0') return host::loadLibrary(name);
         host::setLastError(host::Error::BAD_ARGUMENT);
         return nullptr;
-    }
-    return host::loadLibrary(name);
+    };
+    return host::call<void*>(host::Function::xos_LibraryLoad, nullptr, load, name);
 }

@@ -13,10 +13,17 @@ namespace {
 /// What a debugger shows for a task without a name.
 constexpr char const* const NAMELESS = "xos_task";
 
-bool createFails(xos_TaskParams const* given) {
-    xos_TaskParams const params = given == nullptr ? xos_TaskParams{} : *given;
-    return failsNow(Function::xos_TaskCreate, params.entry, params.argument, params.options, params.priority,
-                    params.stackSize, params.name, params.reserved);
+constexpr xos_Task NO_TASK = ~xos_Task{0};
+
+xos_Task create(xos_TaskParams const& params) {
+    static constinit std::atomic<xos_Task> lastTask{0};
+    if (params.entry == nullptr) {
+        setLastError(Error::BAD_ARGUMENT);
+        return NO_TASK;
+    }
+    // What the creator called so far comes before what the task calls.
+    beginEra();
+    return runTask(jobOf(params)) ? lastTask.fetch_add(1, std::memory_order_relaxed) + 1 : NO_TASK;
 }
 
 } // namespace
@@ -31,14 +38,8 @@ TaskJob jobOf(xos_TaskParams const& params) {
 } // namespace host
 
 extern "C" xos_Task xos_TaskCreate(xos_TaskParams const* params) {
-    constexpr xos_Task NO_TASK = ~xos_Task{0};
-    static constinit std::atomic<xos_Task> lastTask{0};
-    if (host::createFails(params)) return NO_TASK;
-    if (params == nullptr || params->entry == nullptr) {
-        host::setLastError(host::Error::BAD_ARGUMENT);
-        return NO_TASK;
-    }
-    // What the creator called so far comes before what the task calls.
-    host::beginEra();
-    return host::runTask(host::jobOf(*params)) ? lastTask.fetch_add(1, std::memory_order_relaxed) + 1 : NO_TASK;
+    xos_TaskParams const task = params == nullptr ? xos_TaskParams{} : *params;
+    auto const create = [&] { return host::create(task); };
+    return host::call(host::Function::xos_TaskCreate, host::NO_TASK, create, task.entry, task.argument, task.options,
+                      task.priority, task.stackSize, task.name, task.reserved);
 }

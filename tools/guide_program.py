@@ -1,0 +1,73 @@
+#!/usr/bin/env python3
+"""Makes tests of the guide's pages: guide_program.py cpp OUTPUT PAGE... or guide_program.py c OUTPUT PAGE.
+
+The C++ blocks of a page are one function, in which a block sees what the earlier ones declared; what the page prints
+must be its `text` blocks. The C block of a page is a program. Errors name the line of the page."""
+
+import re
+import sys
+from pathlib import Path
+
+
+def blocks(page):
+    """(language, number of the first line, lines) of the blocks of a page."""
+    language, first, lines = None, 0, []
+    for number, line in enumerate(page.read_text(encoding="utf-8").splitlines(), 1):
+        if language is None:
+            if line.startswith("```"):
+                language, first, lines = line[3:].strip(), number + 1, []
+        elif line == "```":
+            yield language, first, lines
+            language = None
+        else:
+            lines.append(line)
+
+
+def of_language(page, language):
+    return [(first, lines) for found, first, lines in blocks(page) if found == language]
+
+
+def outputs_after(page, language):
+    """The `text` blocks that follow a block of the language, up to one of another."""
+    last, outputs = None, []
+    for found, _, lines in blocks(page):
+        if found != "text":
+            last = found
+        elif last == language:
+            outputs += lines
+    return "".join(line + "\n" for line in outputs)
+
+
+def test_of(page):
+    name = re.sub(r"\W", "_", page.stem)
+    code = []
+    for first, lines in of_language(page, "cpp"):
+        code.append(f'#line {first} "{page.as_posix()}"')
+        code += ["" if line.startswith("#include") else line for line in lines]
+    expected = "".join(f'    "{line}\\n"\n' for line in
+                       (l.replace("\\", "\\\\").replace('"', '\\"') for l in outputs_after(page, "cpp").splitlines()))
+    return ["", f"static void {name}() {{", *code, "}", "", f"TEST(Guide, {name}) {{", "    Page const page;",
+            f"    {name}();", f'    EXPECT_EQ(page.printed(),\n{expected or "    " + chr(34) * 2});', "}"]
+
+
+def cpp(pages):
+    pages = [page for page in pages if of_language(page, "cpp")]
+    includes = {line for page in pages for _, lines in of_language(page, "cpp") for line in lines
+                if line.startswith("#include")}
+    body = [line for page in pages for line in test_of(page)]
+    return [*sorted(includes), '#include "tests/guide/page.h"', *body]
+
+
+def main():
+    language, output, *pages = sys.argv[1:]
+    pages = [Path(page) for page in pages]
+    if language == "cpp":
+        lines = cpp(pages)
+    else:
+        lines = [line for page in pages for first, block in of_language(page, language)
+                 for line in (f'#line {first} "{page.as_posix()}"', *block)]
+    Path(output).write_text("\n".join(lines) + "\n", encoding="utf-8")
+
+
+if __name__ == "__main__":
+    main()
