@@ -44,18 +44,25 @@ private:
 
 } // namespace
 
-bool copyStaged(FPath const& target, FPath const& source, bool overwrite, std::string& reason) {
+bool writeStaged(FPath const& target, std::function<bool(FPath const& staged)> const& fill, bool overwrite,
+                 std::string& reason) {
     StagingFolder const staging(target);
-    FPath const copy(staging.path(), "copy");
+    FPath const staged(staging.path(), "copy");
     // A move that is refused removes its source, which is only the staged copy.
-    bool good = staging.isMade();
-    if (FStat(source, SYSTEM_ONLY).isDir()) {
-        good = good && Dir::Copy(copy, source, WITH_CONTENTS, SPARING, WITHOUT_SECOND_FLAG) &&
-               Dir::Move(target, copy, SPARING, WITHOUT_SECOND_FLAG);
-    } else {
-        good = good && File::Copy(copy, source, SPARING, WITHOUT_PARENTS) &&
-               File::Move(target, copy, overwrite, WITHOUT_PARENTS);
+    bool const good = staging.isMade() && fill(staged) && File::Move(target, staged, overwrite, WITHOUT_PARENTS);
+    if (!good) reason = lastReason();
+    return good;
+}
+
+bool copyStaged(FPath const& target, FPath const& source, bool overwrite, std::string& reason) {
+    if (!FStat(source, SYSTEM_ONLY).isDir()) {
+        auto const fill = [&](FPath const& staged) { return File::Copy(staged, source, SPARING, WITHOUT_PARENTS); };
+        return writeStaged(target, fill, overwrite, reason);
     }
+    StagingFolder const staging(target);
+    FPath const staged(staging.path(), "copy");
+    bool const good = staging.isMade() && Dir::Copy(staged, source, WITH_CONTENTS, SPARING, WITHOUT_SECOND_FLAG) &&
+                      Dir::Move(target, staged, SPARING, WITHOUT_SECOND_FLAG);
     if (!good) reason = lastReason();
     return good;
 }

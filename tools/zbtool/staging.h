@@ -6,6 +6,7 @@
 
 #include <zor_basis/files.h>
 
+#include <functional>
 #include <string>
 
 namespace zbtool {
@@ -14,6 +15,10 @@ namespace zbtool {
 /// `clearStaging` can remove it at any time.
 /// \param reason  receives why the copy failed; nothing is left of it then
 bool copyStaged(ZOR_Basis::FPath const& target, ZOR_Basis::FPath const& source, bool overwrite, std::string& reason);
+
+/// The same for a file that `fill` makes at the path that it is given.
+bool writeStaged(ZOR_Basis::FPath const& target, std::function<bool(ZOR_Basis::FPath const& staged)> const& fill,
+                 bool overwrite, std::string& reason);
 
 /// Removes what other threads have half copied. From then on no other file is begun.
 void clearStaging();
