@@ -36,7 +36,8 @@ TEST(CommandLine, refuses_what_it_does_not_know_in_one_line) {
 TEST(CommandLine, helps_with_every_command) {
     Tool tool;
     std::string const commands = tool.run({"--help"}).output;
-    for (char const* command : {"copy", "move", "delete", "count", "size", "find"}) {
+    for (char const* command :
+         {"copy", "move", "delete", "count", "size", "find", "dict", "timers", "log", "crypt", "sys", "url"}) {
         SCOPED_TRACE(command);
         EXPECT_NE(commands.find(std::string("\n  ") + command + " "), std::string::npos) << commands;
         ToolResult const help = tool.run({command, "--help"});

@@ -30,9 +30,9 @@ TEST(Timers, merges_several_and_sorts_by_any_column) {
     Tool tool;
     makeReports(tool);
     EXPECT_EQ(tool.run({"timers", "--csv", "--sort", "count", "1.timer", "2.timer"}).output,
-              "timer,count,total,average,maximum,maximum-count,minimum,suspended,suspended-maximum\r\n"
-              "quick <1>,20,1500,75,200,3,40,0,0\r\nslow,3,14000,4666,6000,1,3000,10,10\r\nnever,0,0,0,0,0,0,0,0\r\n");
-    EXPECT_EQ(tool.run({"timers", "--csv", "--sort", "timer", "--reverse", "1.timer"}).output.substr(85, 4), "slow");
+              "timer,count,total,average,maximum,maximum-count,minimum,suspended,suspended-maximum\n"
+              "quick <1>,20,1500,75,200,3,40,0,0\nslow,3,14000,4666,6000,1,3000,10,10\nnever,0,0,0,0,0,0,0,0\n");
+    EXPECT_EQ(tool.run({"timers", "--csv", "--sort", "timer", "--reverse", "1.timer"}).output.substr(84, 4), "slow");
     EXPECT_EQ(tool.run({"timers", "--json", "2.timer"}).output.substr(0, 40),
               "[\n  {\"timer\": \"slow\", \"count\": 1, \"total");
 }
@@ -41,8 +41,8 @@ TEST(Timers, compares_the_averages_of_several) {
     Tool tool;
     makeReports(tool);
     EXPECT_EQ(tool.run({"timers", "--compare", "--csv", "1.timer", "2.timer"}).output,
-              "timer,count-1,average-1,count-2,average-2,change-%\r\n"
-              "slow,2,4000,1,6000,50\r\nnever,0,0,0,0,0\r\nquick <1>,10,100,10,50,-50\r\n");
+              "timer,count-1,average-1,count-2,average-2,change-%\n"
+              "slow,2,4000,1,6000,50\nnever,0,0,0,0,0\nquick <1>,10,100,10,50,-50\n");
 }
 
 TEST(Timers, writes_a_page_that_needs_nothing_else) {

@@ -35,9 +35,12 @@ public:
         put(streams / "input", input);
         Child child{"zbtool", arguments, environment, path(), streams / "input", streams / "errors"};
         ChildResult const result = ::run(child);
-        std::string errors = textOf(streams / "errors");
-        errors.erase(std::remove(errors.begin(), errors.end(), '\r'), errors.end());
-        return {result.exitCode, result.output, errors};
+        return {result.exitCode, withoutReturns(result.output), withoutReturns(textOf(streams / "errors"))};
+    }
+
+    static std::string withoutReturns(std::string text) {
+        text.erase(std::remove(text.begin(), text.end(), '\r'), text.end());
+        return text;
     }
 
     std::vector<std::pair<std::string, std::string>> environment{{"XOS_ROOT", path()}};
