@@ -35,8 +35,9 @@ stand-alone platform layer that they run on without a print server.")
 zb_debian_package(development libzor-basis-dev SECTION libdevel DEPENDS "${zb_library} (= ${zb_same_version})"
   DESCRIPTION "Headers, and what find_package and pkg-config read.")
 zb_debian_package(tools zor-basis-tools SECTION utils DEPENDS "${zb_library} (= ${zb_same_version})"
-  DESCRIPTION "zor_basis_demo copies a folder of jobs, verifies the copy and prints a
-report of timers.")
+  DESCRIPTION "zbtool works with files and trees, dictionaries, timer reports, logs and
+secrets; zor_basis_demo copies a folder of jobs, verifies the copy and
+prints a report of timers.")
 zb_debian_package(symbols ${zb_library}-dbgsym SECTION debug DEPENDS "${zb_library} (= ${zb_same_version})"
   DESCRIPTION "Symbols for the debugger, which finds them by build id.")
 zb_debian_package(documentation libzor-basis-doc SECTION doc

@@ -46,14 +46,23 @@ foreach(file IN ITEMS zor_basis.pc xos_host.pc)
 endforeach()
 
 set(zb_programs ${zb_libraries})
-if(TARGET zor_basis_demo)
-  if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
-    set_target_properties(zor_basis_demo PROPERTIES INSTALL_RPATH "") # the loader knows the system's libraries
-  else()
-    set_target_properties(zor_basis_demo PROPERTIES INSTALL_RPATH "$ORIGIN/../${CMAKE_INSTALL_LIBDIR}")
+foreach(tool IN ITEMS zbtool zor_basis_demo)
+  if(NOT TARGET ${tool})
+    continue()
   endif()
-  install(TARGETS zor_basis_demo RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
-  list(APPEND zb_programs zor_basis_demo)
+  if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+    set_target_properties(${tool} PROPERTIES INSTALL_RPATH "") # the loader knows the system's libraries
+  else()
+    set_target_properties(${tool} PROPERTIES INSTALL_RPATH "$ORIGIN/../${CMAKE_INSTALL_LIBDIR}")
+  endif()
+  install(TARGETS ${tool} RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
+  list(APPEND zb_programs ${tool})
+endforeach()
+if(TARGET zbtool_man)
+  install(DIRECTORY ${PROJECT_BINARY_DIR}/man/ DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT tools
+    FILES_MATCHING PATTERN "*.gz")
+  install(FILES ${PROJECT_SOURCE_DIR}/tools/zbtool/zbtool.bash COMPONENT tools RENAME zbtool
+    DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/bash-completion/completions)
 endif()
 
 # Symbols lie where the debugger looks for them: those of the system below /usr/lib/debug by build id, others beside

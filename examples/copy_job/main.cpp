@@ -1,7 +1,9 @@
 // The main job of a server module: copies a job folder, looks at both sides, finds the job's ticket, verifies the copy,
 // clears up, and prints how long each of it took.
 //
-//     zor_basis_demo [FOLDER]      FOLDER: any folder; without one a sample job is made
+//     zor_basis_demo [FOLDER [REPORT]]    FOLDER: any folder; without one a sample job is made
+//                                         REPORT: a file that receives the timer report
+//     zor_basis_demo --sample FOLDER      makes the sample job in a new folder
 //
 // Read this file first, then folder_copy.cpp, which is the heart of it.
 
@@ -63,7 +65,6 @@ bool complain(char const* what, FPath const& path) {
 int statusOf(bool good) { return good ? EXIT_SUCCESS : EXIT_FAILURE; }
 
 bool run(FPath const& source, FPath const& copy, Timers const& timers) {
-    if (!FStat(source).isDir()) return complain("find the folder", source);
     {
         PileTimerAuto const timing = timers.time(timers.copying);
         FolderCopy folderCopy;
@@ -86,6 +87,8 @@ bool run(FPath const& source, FPath const& copy, Timers const& timers) {
 } // namespace
 
 int main(int argc, char** argv) {
+    if (argc == 3 && Str(argv[1]) == "--sample") return statusOf(makeSampleJob(argv[2]) || complain("make", argv[2]));
+    if (argc >= 2 && !FStat(argv[1]).isDir()) return statusOf(complain("find the folder", argv[1]));
     ScratchRoot const scratch;
     if (!scratch.isMade()) return statusOf(complain("make", scratch.path()));
     Timers const timers;
@@ -94,5 +97,5 @@ int main(int argc, char** argv) {
 
     bool const good = run(argc < 2 ? sample : FPath(argv[1]), FPath(scratch.path(), "copy"), timers);
     timers.manager->reset(PRINTED);
-    return statusOf(printTimerReport(scratch.path()) && good);
+    return statusOf(printTimerReport(scratch.path(), argc < 3 ? "" : argv[2]) && good);
 }

@@ -8,7 +8,7 @@
 
 using namespace ZOR_Basis;
 
-bool printTimerReport(FPath const& root) {
+bool printTimerReport(FPath const& root, FPath const& copy) {
     FPath report;
     if (zbFindFile(FPath(root, "timer"), "*.timer", LOOK_FILES, report, LAST_OF_ALL, ONE_LEVEL) == 0) return false;
     File file(report, File::FILE_READ | File::FILE_BINARY);
@@ -19,5 +19,5 @@ bool printTimerReport(FPath const& root) {
         // A row ends in a zero byte and a line feed, for programs that look at one row at a time.
         for (std::uint64_t i = 0; i < got; ++i) std::putchar(piece[i] != '\0' ? piece[i] : ' ');
     }
-    return true;
+    return copy.empty() || File::Copy(copy, report, OVERWRITING, WITHOUT_PARENTS);
 }

@@ -7,7 +7,8 @@
 #include <zor_basis/files.h>
 
 /// Prints the report that lies beneath a root folder.
-/// \return whether there is one
-bool printTimerReport(ZOR_Basis::FPath const& root);
+/// \param copy  names a file that receives the report, too; empty: none
+/// \return whether there is one and it could be copied
+bool printTimerReport(ZOR_Basis::FPath const& root, ZOR_Basis::FPath const& copy);
 
 #endif

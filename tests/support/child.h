@@ -17,6 +17,10 @@ struct Child {
     std::vector<std::pair<std::string, std::string>> environment;
     /// Where it starts; empty: here.
     std::string folder;
+    /// What its standard input reads; empty: the same as this process's.
+    std::string inputFile = {};
+    /// Receives its standard error; empty: it goes where this process's goes.
+    std::string errorFile = {};
 };
 
 struct ChildResult {

@@ -2,6 +2,7 @@
 
 #include "tests/support/child.h"
 
+#include <fcntl.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -22,6 +23,9 @@ namespace {
     for (std::string const& argument : child.arguments) arguments.push_back(const_cast<char*>(argument.c_str()));
     arguments.push_back(nullptr);
     ::dup2(output, STDOUT_FILENO);
+    if (!child.inputFile.empty()) ::dup2(::open(child.inputFile.c_str(), O_RDONLY), STDIN_FILENO);
+    if (!child.errorFile.empty())
+        ::dup2(::open(child.errorFile.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0666), STDERR_FILENO);
     if (child.folder.empty() || ::chdir(child.folder.c_str()) == 0) ::execv(program.c_str(), arguments.data());
     ::_exit(127);
 }

@@ -52,18 +52,41 @@ std::string readAll(HANDLE pipe) {
     return lines;
 }
 
+/// A file as one of a child's streams, closed at the end of the scope; without a name the stream of this process.
+class Stream {
+public:
+    Stream(std::string const& name, DWORD access, DWORD creation, DWORD standard) : isOwn_(!name.empty()) {
+        SECURITY_ATTRIBUTES inherited{sizeof(SECURITY_ATTRIBUTES), nullptr, TRUE};
+        handle_ = isOwn_ ? CreateFileA(name.c_str(), access, FILE_SHARE_READ, &inherited, creation, 0, nullptr)
+                         : GetStdHandle(standard);
+    }
+    ~Stream() {
+        if (isOwn_) CloseHandle(handle_);
+    }
+    Stream(Stream const&) = delete;
+    Stream& operator=(Stream const&) = delete;
+
+    HANDLE get() const { return handle_; }
+
+private:
+    bool isOwn_;
+    HANDLE handle_;
+};
+
 /// Starts a process that writes to the end of a pipe.
 bool start(Child const& child, HANDLE output, PROCESS_INFORMATION& process) {
     std::string const program = programBeside(child.program);
     std::string commandLine = quoted(program);
     for (std::string const& argument : child.arguments) commandLine += " " + quoted(argument);
     std::string environment = environmentOf(child);
+    Stream const input(child.inputFile, GENERIC_READ, OPEN_EXISTING, STD_INPUT_HANDLE);
+    Stream const errors(child.errorFile, GENERIC_WRITE, CREATE_ALWAYS, STD_ERROR_HANDLE);
     STARTUPINFOA startup{};
     startup.cb = sizeof startup;
     startup.dwFlags = STARTF_USESTDHANDLES;
-    startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
+    startup.hStdInput = input.get();
     startup.hStdOutput = output;
-    startup.hStdError = GetStdHandle(STD_ERROR_HANDLE);
+    startup.hStdError = errors.get();
     return CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
                           child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
 }

@@ -77,8 +77,8 @@ def unnamed(names, tested, listed):
 
 def main():
     listed, problems = exceptions()
-    sources = common.files("basis/**.cpp", "host/**.cpp")
-    headers = common.files("basis/**.h", "host/**.h", "include/zor_basis/**.h")
+    sources = common.files("basis/**.cpp", "host/**.cpp", "tools/zbtool/**.cpp")
+    headers = common.files("basis/**.h", "host/**.h", "include/zor_basis/**.h", "tools/zbtool/**.h")
     components = {path.with_name(stem(path)) for path in sources}
     names = {}
     for path in sources + headers:

@@ -1,0 +1,74 @@
+#include "tests/zbtool/tool.h"
+
+#include <gtest/gtest.h>
+
+#include <fcntl.h>
+#include <pty.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace {
+
+/// Runs the program on a terminal of its own.
+/// \param typed  is what the user types
+ToolResult runOnTerminal(std::string const& folder, std::vector<std::string> const& words, std::string const& typed) {
+    int terminal = -1;
+    pid_t const process = ::forkpty(&terminal, nullptr, nullptr, nullptr);
+    if (process == 0) {
+        std::string const program = programBeside("zbtool");
+        std::vector<char*> arguments{const_cast<char*>(program.c_str())};
+        for (std::string const& word : words) arguments.push_back(const_cast<char*>(word.c_str()));
+        arguments.push_back(nullptr);
+        if (::chdir(folder.c_str()) == 0) ::execv(program.c_str(), arguments.data());
+        ::_exit(127);
+    }
+    ToolResult result;
+    if (::write(terminal, typed.data(), typed.size()) < 0) return result;
+    char buffer[4096];
+    for (ssize_t n = 0; (n = ::read(terminal, buffer, sizeof buffer)) > 0;)
+        result.output.append(buffer, static_cast<std::size_t>(n));
+    ::close(terminal);
+    int status = 0;
+    if (::waitpid(process, &status, 0) == process && WIFEXITED(status)) result.code = WEXITSTATUS(status);
+    return result;
+}
+
+std::size_t timesIn(std::string const& text, std::string const& part) {
+    std::size_t times = 0;
+    for (std::size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++times;
+    return times;
+}
+
+void makeFiles(Tool const& tool, int files) {
+    makeFolder(tool / "job");
+    for (int i = 0; i < files; ++i) put(tool / ("job/" + std::to_string(i)), std::string(50'000, 'x'));
+}
+
+TEST(ProgressPosix, is_shown_on_a_terminal_with_the_total_and_what_is_left) {
+    Tool tool;
+    makeFiles(tool, 3'000);
+    ToolResult const result = runOnTerminal(tool.path(), {"copy", "job", "copy"}, "");
+    EXPECT_EQ(result.code, 0);
+    EXPECT_GE(timesIn(result.output, "\rcopying  "), 1u) << result.output;
+    EXPECT_GE(timesIn(result.output, " of 3001 entries"), 1u) << result.output;
+    EXPECT_GE(timesIn(result.output, " left"), 1u) << result.output;
+    EXPECT_NE(result.output.find("done:  3001 entries, 143.1 MiB, "), std::string::npos) << result.output;
+    EXPECT_EQ(tool.run({"count", "copy"}).output, "3001\tcopy\n");
+}
+
+TEST(ProgressPosix, deleting_asks_on_a_terminal_and_tells_how_much) {
+    Tool tool;
+    makeFiles(tool, 10);
+    for (char const* answer : {"n\n", "\n", "never\n"}) {
+        SCOPED_TRACE(answer);
+        ToolResult const kept = runOnTerminal(tool.path(), {"delete", "job"}, answer);
+        EXPECT_EQ(kept.code, 1);
+        EXPECT_NE(kept.output.find("delete job: 11 entries, 488.3 KiB? [y/N]"), std::string::npos) << kept.output;
+        EXPECT_EQ(tool.content("job").size(), 10u);
+    }
+    ToolResult const gone = runOnTerminal(tool.path(), {"delete", "job"}, "y\n");
+    EXPECT_EQ(gone.code, 0);
+    EXPECT_EQ(tool.content(), Names{});
+}
+
+} // namespace

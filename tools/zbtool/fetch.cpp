@@ -1,0 +1,42 @@
+#include "tools/zbtool/fetch.h"
+
+#include "tools/zbtool/choices.h"
+#include "tools/zbtool/complaint.h"
+#include "tools/zbtool/exit_code.h"
+#include "tools/zbtool/whole_file.h"
+
+#include <zor_basis/files.h>
+#include <zor_basis/system.h>
+
+using namespace ZOR_Basis;
+
+namespace zbtool {
+namespace {
+
+/// A URL without the user and password in it, which do not belong on a screen.
+std::string publicPart(std::string url) {
+    std::size_t const scheme = url.find("://");
+    if (scheme == std::string::npos) return url;
+    std::size_t const host = scheme + 3;
+    std::size_t const at = url.substr(0, url.find_first_of("/?#", host)).rfind('@');
+    if (at != std::string::npos && at >= host) url.erase(host, at + 1 - host);
+    return url;
+}
+
+} // namespace
+
+int fetch(FetchOptions const& options) {
+    std::string password;
+    std::string reason;
+    if (!options.passwordFile.empty() && !readWhole(options.passwordFile, password, reason))
+        return exitCodeOf(complain(options.passwordFile, reason));
+    password.erase(password.find_last_not_of("\r\n") + 1);
+    if (!options.overwrite && FStat::exist(options.target.c_str()))
+        return exitCodeOf(complain(options.target, "exists already"));
+    bool const hasUser = !options.user.empty();
+    bool const good = Url::Get(options.target.c_str(), options.url.c_str(), hasUser ? options.user.c_str() : nullptr,
+                               hasUser ? password.c_str() : nullptr, options.overwrite, WITHOUT_PARENTS);
+    return exitCodeOf(good || complain("cannot fetch '" + publicPart(options.url) + "' to '" + options.target + "'"));
+}
+
+} // namespace zbtool

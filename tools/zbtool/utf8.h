@@ -1,0 +1,21 @@
+/// \file
+/// UTF-8, character by character.
+
+#ifndef TOOLS_ZBTOOL_UTF8_H
+#define TOOLS_ZBTOOL_UTF8_H
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace zbtool {
+
+/// Returns the length of the character at the front of a text in bytes; 0 if no valid one begins there.
+std::size_t utf8Length(std::string_view text);
+/// Tells whether a text is valid UTF-8.
+bool isUtf8(std::string_view text);
+void appendUtf8(std::string& text, std::uint32_t codePoint);
+
+} // namespace zbtool
+
+#endif
