@@ -21,7 +21,7 @@ struct Field {
     bool hasBar;
 };
 
-constexpr Field FIELDS[] = {
+constexpr Field COLUMNS[] = {
     {"count", &TimerRow::count, false},
     {TOTAL, &TimerRow::total, true},
     {"average", &TimerRow::average, true},
@@ -34,10 +34,10 @@ constexpr Field FIELDS[] = {
 
 Table mergedTable(std::vector<TimerReport> const& reports) {
     Table table{{{TIMER}}, {}};
-    for (Field const& field : FIELDS) table.columns.push_back({field.name, true, field.hasBar});
+    for (Field const& field : COLUMNS) table.columns.push_back({field.name, true, field.hasBar});
     for (TimerRow const& row : mergedRows(reports)) {
         table.rows.push_back({row.name});
-        for (Field const& field : FIELDS) table.rows.back().emplace_back(row.*field.value);
+        for (Field const& field : COLUMNS) table.rows.back().emplace_back(row.*field.value);
     }
     return table;
 }
