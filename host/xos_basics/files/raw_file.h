@@ -25,6 +25,9 @@ public:
     RawFile() = default;
     RawFile(RawFile const&) = delete;
     RawFile& operator=(RawFile const&) = delete;
+    ~RawFile() {
+        if (native_ != -1) close();
+    }
 
     /// Opens an entry that is no directory.
     bool open(char const* path, OpenMode mode);
