@@ -60,7 +60,8 @@ bool run(std::initializer_list<char const*> command) {
     arguments.push_back(nullptr);
     posix_spawn_file_actions_t actions;
     ::posix_spawn_file_actions_init(&actions);
-    ::posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
+    for (int stream : {STDOUT_FILENO, STDERR_FILENO})
+        ::posix_spawn_file_actions_addopen(&actions, stream, "/dev/null", O_WRONLY, 0);
     pid_t child = 0;
     int status = -1;
     bool const good = ::posix_spawnp(&child, arguments[0], &actions, nullptr, arguments.data(), environ) == 0 &&

@@ -34,7 +34,7 @@ inline constexpr int SOURCE_FILES = 20'000;
 /// A tree of files of 0 to 16 KiB, eight folders to a folder. Made at the first call.
 std::string const& sourceTree();
 
-/// Runs a program to its end, its output thrown away.
+/// Runs a program to its end, its output and its errors thrown away.
 /// \return whether it ended well
 bool run(std::initializer_list<char const*> command);
 

@@ -7,6 +7,8 @@
 #include "tests/support/child.h"
 #include "tests/support/scratch.h"
 
+#include <gtest/gtest.h>
+
 #include <algorithm>
 #include <ostream>
 #include <string>

@@ -8,6 +8,7 @@
 #include "tools/zbtool/tally.h"
 #include "tools/zbtool/tree_work.h"
 
+#include <atomic>
 #include <cstdio>
 #include <filesystem>
 #include <span>
@@ -22,8 +23,14 @@ namespace {
 constexpr std::uint64_t MOST_BYTES = 16 << 20;
 constexpr std::uint64_t MOST_ENTRIES = 2'000;
 
+/// The first failure ends the work. What other threads meet meanwhile only follows from it.
+bool complainOnce(std::string const& subject, std::string const& reason) {
+    static std::atomic<bool> isTold{false};
+    return !isTold.exchange(true) && complain(subject, reason);
+}
+
 bool complainOfCopy(FPath const& source, FPath const& target, std::string const& reason) {
-    return complain("cannot copy '" + std::string(source.c_str()) + "' to '" + target.c_str() + "'", reason);
+    return complainOnce("cannot copy '" + std::string(source.c_str()) + "' to '" + target.c_str() + "'", reason);
 }
 
 std::uint64_t bytesOf(FStat const& status) { return status.isFile() ? status.size() : 0; }
@@ -78,7 +85,7 @@ private:
                 content.entries.push_back({path, status});
             return true;
         });
-        if (!read) return complain(folder.c_str());
+        if (!read) return complainOnce(folder.c_str(), lastReason());
         return (copyInOneStep(folder, content) || copyEntries(folder, content)) &&
                (below.empty() || makeWritable(folder));
     }

@@ -18,10 +18,11 @@ h1 { font-size: 1.4rem; margin: 0 0 .3rem; }
 p { color: var(--faint); margin: .1rem 0; }
 .wide { overflow-x: auto; margin-top: 1.2rem; }
 table { border-collapse: collapse; width: 100%; font-variant-numeric: tabular-nums; }
-th { background: var(--head); text-align: left; white-space: nowrap; }
+th { background: var(--head); text-align: left; vertical-align: bottom; }
+td { white-space: nowrap; }
 th, td { border-bottom: 1px solid var(--line); padding: .35rem .6rem; }
 th.number, td.number { text-align: right; }
-td.bar { min-width: 9rem; }
+td.bar { min-width: 8rem; }
 td.bar i { display: block; height: .3rem; margin-left: auto; border-radius: 2px; background: var(--bar); }
 th button { all: unset; cursor: pointer; }
 th button:focus-visible { outline: 2px solid var(--bar); outline-offset: 2px; }
