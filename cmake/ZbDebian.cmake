@@ -41,8 +41,8 @@ prints a report of timers.")
 zb_debian_package(symbols ${zb_library}-dbgsym SECTION debug DEPENDS "${zb_library} (= ${zb_same_version})"
   DESCRIPTION "Symbols for the debugger, which finds them by build id.")
 zb_debian_package(documentation libzor-basis-doc SECTION doc
-  DESCRIPTION "Glossary, reasons of failures, decisions, behaviour that must stay, and
-the sources of the examples.")
+  DESCRIPTION "A guide that begins with a first hour, the glossary, reasons of failures,
+decisions, behaviour that must stay, and the sources of the examples.")
 set(CPACK_DEBIAN_DOCUMENTATION_PACKAGE_ARCHITECTURE all)
 set(CPACK_DEBIAN_SYMBOLS_PACKAGE_SHLIBDEPS OFF)
 

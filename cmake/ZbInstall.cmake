@@ -101,7 +101,7 @@ install(FILES ${PROJECT_SOURCE_DIR}/tools/debuggers/zor_basis.natvis DESTINATION
   COMPONENT development)
 
 set(zb_doc_dir ${CMAKE_INSTALL_DATAROOTDIR}/doc/libzor-basis-doc)
-install(FILES ${PROJECT_SOURCE_DIR}/README.md ${PROJECT_SOURCE_DIR}/CHANGELOG.md
+install(FILES ${PROJECT_SOURCE_DIR}/README.md ${PROJECT_SOURCE_DIR}/CHANGELOG.md ${PROJECT_SOURCE_DIR}/CONTRIBUTING.md
   DESTINATION ${zb_doc_dir} COMPONENT documentation)
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/docs ${PROJECT_SOURCE_DIR}/examples
-  DESTINATION ${zb_doc_dir} COMPONENT documentation PATTERN CMakeLists.txt EXCLUDE)
+  DESTINATION ${zb_doc_dir} COMPONENT documentation PATTERN CMakeLists.txt EXCLUDE PATTERN doxygen EXCLUDE)

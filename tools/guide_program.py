@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Makes tests of the guide's pages: guide_program.py cpp OUTPUT PAGE... or guide_program.py c OUTPUT PAGE.
+"""Makes the test of a page of the guide: guide_program.py cpp|c OUTPUT PAGE.
 
 The C++ blocks of a page are one function, in which a block sees what the earlier ones declared; what the page prints
 must be its `text` blocks. The C block of a page is a program. Errors name the line of the page."""
@@ -50,23 +50,22 @@ def test_of(page):
             f"    {name}();", f'    EXPECT_EQ(page.printed(),\n{expected or "    " + chr(34) * 2});', "}"]
 
 
-def cpp(pages):
-    pages = [page for page in pages if of_language(page, "cpp")]
-    includes = {line for page in pages for _, lines in of_language(page, "cpp") for line in lines
-                if line.startswith("#include")}
-    body = [line for page in pages for line in test_of(page)]
-    return [*sorted(includes), '#include "tests/guide/page.h"', *body]
+def cpp(page):
+    """A page sees only what it includes itself, so that it is a program without the others."""
+    if not of_language(page, "cpp"):
+        return []
+    includes = [line for _, lines in of_language(page, "cpp") for line in lines if line.startswith("#include")]
+    return [*includes, '#include "tests/guide/page.h"', *test_of(page)]
 
 
 def main():
-    language, output, *pages = sys.argv[1:]
-    pages = [Path(page) for page in pages]
+    language, output, page = sys.argv[1], Path(sys.argv[2]), Path(sys.argv[3])
     if language == "cpp":
-        lines = cpp(pages)
+        lines = cpp(page)
     else:
-        lines = [line for page in pages for first, block in of_language(page, language)
+        lines = [line for first, block in of_language(page, language)
                  for line in (f'#line {first} "{page.as_posix()}"', *block)]
-    Path(output).write_text("\n".join(lines) + "\n", encoding="utf-8")
+    output.write_text("\n".join(lines) + "\n", encoding="utf-8")
 
 
 if __name__ == "__main__":

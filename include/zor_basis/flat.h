@@ -75,12 +75,13 @@ ZB_EXTERN_C ZB_API int isVDPON(void);
 /* Timers. A null argument makes a function do nothing and return null, if it returns anything. Flags: 0 is false, any
    other value true. */
 
-/// Opaque in C; in C++ the classes of `zor_basis/timers.h`.
+// Opaque in C; in C++ the classes of `zor_basis/timers.h`.
 #ifdef __cplusplus
 namespace ZOR_Basis {
 class PileTimer;
 class TimerMgr;
 } // namespace ZOR_Basis
+/// A pile timer and a manager of timers; callers have only their addresses.
 typedef ZOR_Basis::PileTimer zbPileTimer;
 typedef ZOR_Basis::TimerMgr zbTimerMgr;
 #else

@@ -9,6 +9,7 @@
 
 namespace ZOR_Basis {
 
+/// A UTF-16 code unit, and a literal of them.
 #ifdef _WIN32
 using WChar = wchar_t;
 #define ZB_W(text) L##text

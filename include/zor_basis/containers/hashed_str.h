@@ -31,6 +31,7 @@ public:
     HashedStr(std::string const& text) : text_(text) { calcHash(); }
     HashedStr(HashedStr const& other) : text_(other.text_), hash_(other.hash_) {}
 
+    /// Assigns a copy and calculates its hash.
     HashedStr& operator=(char const* text) { return assign(text); }
     HashedStr& operator=(Str const& text) { return assign(text); }
     HashedStr& operator=(std::string const& text) { return assign(text); }
@@ -46,11 +47,13 @@ public:
         calcHash();
         return *this;
     }
+    /// Empties the text.
     void clear() {
         text_.clear();
         calcHash();
     }
 
+    /// The text and its size, as of `str()`.
     char const* c_str() const { return text_.c_str(); }
     bool empty() const { return text_.empty(); }
     std::uint64_t size() const { return text_.size(); }
@@ -59,6 +62,7 @@ public:
     /// The text. A caller that changes it through this reference must call `calcHash` afterwards.
     Text& str() { return text_; }
     Text const& str() const { return text_; }
+    /// Calculates the hash of the present text.
     void calcHash() { hash_ = text_.hash(); }
 
     /// Compares by the rule of `Str`, without the hash.
@@ -67,6 +71,7 @@ public:
     /// \param hash  is that of `text`
     bool eq(Str const& text, std::uint64_t hash) const { return hash_ == hash && text_ == text; }
 
+    /// Compares hashes first and then texts, by the rule of `Str`.
     bool operator==(HashedStr const& other) const { return this == &other || eq(other.text_, other.hash_); }
     bool operator!=(HashedStr const& other) const { return !(*this == other); }
     /// \kept hash-03: the order is by hash, and only for equal hashes by the bytes of the texts; it is not alphabetical

@@ -88,6 +88,7 @@ protected:
         capacity_ = capacity;
     }
 
+    /// The slots, how many there are, and how many are in use.
     std::uint64_t capacity_ = 0;
     std::uint64_t count_ = 0;
     T** slots_ = nullptr;

@@ -46,13 +46,16 @@ struct UnitCount {
 template <class T>
 class SngList {
 public:
+    /// One link of the list.
     struct Unit {
-        Unit* next;
-        T value;
+        Unit* next; ///< null at the end
+        T value;    ///< is the list's own
     };
 
+    /// Changes the values of a list, and names the place for an insertion or a removal.
     class iterator {
     public:
+        /// What the standard library asks of an iterator.
         using iterator_category = std::forward_iterator_tag;
         using value_type = T;
         using difference_type = std::ptrdiff_t;
@@ -60,10 +63,14 @@ public:
         using reference = T&;
 
         iterator() = default;
+        /// The value of the unit.
+        /// \pre not at the end
         T& operator*() const { return current_->value; }
         T* operator->() const { return &current_->value; }
         /// The unit itself; null at the end.
         Unit* unit() const { return current_; }
+        /// Advances to the next unit.
+        /// \pre not at the end
         iterator& operator++() {
             previous_ = current_;
             current_ = current_->next;
@@ -74,6 +81,7 @@ public:
             ++*this;
             return before;
         }
+        /// Tells whether both are at the same unit.
         bool operator==(iterator const& other) const { return current_ == other.current_; }
         bool operator!=(iterator const& other) const { return current_ != other.current_; }
 
@@ -88,6 +96,7 @@ public:
     /// Reads the values of a list. Every iterator converts to one.
     class const_iterator {
     public:
+        /// What the standard library asks of an iterator.
         using iterator_category = std::forward_iterator_tag;
         using value_type = T;
         using difference_type = std::ptrdiff_t;
@@ -95,7 +104,10 @@ public:
         using reference = T const&;
 
         const_iterator() = default;
+        /// Reads from the place of an iterator.
         const_iterator(iterator const& other) : current_(other.unit()) {}
+        /// The value of the unit.
+        /// \pre not at the end
         T const& operator*() const { return current_->value; }
         T const* operator->() const { return &current_->value; }
         /// The unit itself; null at the end.
@@ -155,8 +167,10 @@ public:
     /// The first and the last unit; null in an empty list.
     Unit* first() const { return exposed(first_); }
     Unit* last() const { return exposed(last_); }
+    /// The number of units.
     std::uint64_t size() const { return count_.number; }
     bool empty() const { return count_.number == 0; }
+    /// The place of the first unit, and the end behind the last.
     iterator begin() { return {exposed(first_), nullptr}; }
     iterator end() { return {}; }
     const_iterator begin() const { return const_iterator(exposed(first_)); }
@@ -164,6 +178,7 @@ public:
     const_iterator cbegin() const { return begin(); }
     const_iterator cend() const { return end(); }
 
+    /// Inserts at the front or at the back, a new unit with a copy of the value or an adopted one.
     void insertFront(T const& value) { insertFront(new Unit{nullptr, value}); }
     void insertFront(Unit* unit) { linkFront(exposed(unit)); }
     void insertBack(T const& value) { insertBack(new Unit{nullptr, value}); }
@@ -279,6 +294,7 @@ public:
 protected:
     /// \name For a derived class that keeps account of its units: none of these exposes them
     /// @{
+    /// The first unit, how many there are, and the insertion of one at the front.
     Unit* head() const { return first_; }
     detail::UnitCount<T> const& unitCount() const { return count_; }
     void linkFront(Unit* unit) {

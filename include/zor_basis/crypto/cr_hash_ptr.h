@@ -22,6 +22,7 @@ public:
     CrHashPtr(CrHash* hash) : hash_(hash) {}
     ~CrHashPtr();
 
+    /// The hash, which may be null.
     operator CrHash*() const { return hash_; }
     CrHash* operator->() const { return hash_; }
     CrHash* ptr() const { return hash_; }

@@ -51,6 +51,7 @@ public:
     /// \return owned by the caller; null if memory runs out
     static DirIterImplW* Make(LookForType type, WChar const* path);
 
+    /// Sets the directory to list.
     void setPath(WStr const& path);
     void setPath(WChar const* path) { setPath(WStr(path)); }
     /// Sets which entries to report; `LOOK_ANYCASE` has no effect here.
@@ -69,6 +70,7 @@ public:
     std::uint32_t lastError() const { return lastError_; }
 
 protected:
+    /// Stores what to list; nothing is opened.
     DirIterImplW(LookForType type, WChar const* path) : path_(path), type_(type) {}
 
     /// Append the wildcard to the path for the duration of a listing, and remove it again.
@@ -77,6 +79,7 @@ protected:
     /// Tells whether entries of a kind are reported.
     bool isWanted(bool isDirectory) const;
 
+    /// The directory, what to report of it, and the state of the listing.
     WcPath path_;
     LookForType type_;
     WBStr wildcard_;
@@ -91,6 +94,7 @@ private:
 /// Owns a listing.
 class ZB_API DirIteratorW {
 public:
+    /// Makes a listing by `DirIterImplW::Make`.
     DirIteratorW(LookForType type, WChar const* path) : impl_(DirIterImplW::Make(type, path)) {}
     ~DirIteratorW() { delete impl_; }
     DirIteratorW(DirIteratorW const&) = delete;

@@ -43,6 +43,7 @@ struct TranslPath {};
 
 class ZB_API FPath : public BufStr<255> {
 public:
+    /// The two kinds of slash.
     static constexpr char BACK_SLASH = '\\';
     static constexpr char FORW_SLASH = '/';
     /// The Windows separator and the other one, on every target.
@@ -71,6 +72,7 @@ public:
     FPath(Str const& text, TranslPath);
 
     FPath& operator=(FPath const& other) = default;
+    /// Assigns a copy, as to any `BufStr`.
     FPath& operator=(Str const& text) { return BufStr::operator=(text), *this; }
     FPath& operator=(std::string const& text) { return BufStr::operator=(text), *this; }
     FPath& operator=(char const* text) { return BufStr::operator=(text), *this; }

@@ -41,12 +41,13 @@ public:
     FStat(char const* path, bool platformFallback) { update(path, platformFallback); }
     FStat(WChar const* path) { updateW(path); }
 
+    /// Takes a new snapshot, with the platform layer as fallback.
+    bool update(char const* path) { return update(path, true); }
     /// Takes a new snapshot.
     /// \param platformFallback  asks the platform layer if the system finds nothing; that layer may reach shares with
     ///     other credentials
     /// \return whether the entry exists; a null path counts as empty, and nothing exists there
     /// \cost one system call for an existing entry
-    bool update(char const* path) { return update(path, true); }
     bool update(char const* path, bool platformFallback);
 
     /// `update` that survives transient network and logon errors: it tries again after a second as long as the last
@@ -70,6 +71,7 @@ public:
     ///     layer is not asked
     bool updateW(WChar const* path);
 
+    /// The kind of the entry, and questions about it; without an entry all are false.
     StatMode type() const { return type_; }
     bool exist() const { return type_ != ST_NONE; }
     bool isFile() const { return type_ == ST_FILE; }

@@ -16,6 +16,7 @@ namespace ZOR_Basis {
 /// \thread one thread at a time
 class ZB_API FileEntry {
 public:
+    /// The kind of an entry.
     using EntryType = FStat::StatMode;
 
     /// Stores the arguments and joins the full path; the file system is not asked.

@@ -49,6 +49,7 @@ public:
     virtual std::int64_t seek(int origin, int offset) = 0;
     virtual bool isOpen() = 0;
 
+    /// Tells whether the file is closed.
     bool operator!() { return !isOpen(); }
 };
 

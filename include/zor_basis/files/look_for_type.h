@@ -10,6 +10,7 @@
 
 namespace ZOR_Basis {
 
+/// What to report; the kinds are in the low two bits.
 enum LookForType : std::uint32_t {
     LOOK_ALL = 0,
     LOOK_FILES = 1,
@@ -18,6 +19,7 @@ enum LookForType : std::uint32_t {
     LOOK_ANYCASE = 4, ///< may be added: the wildcard ignores case, in listings that support this
 };
 
+/// Combine selections.
 constexpr LookForType operator|(LookForType a, LookForType b) {
     return static_cast<LookForType>(static_cast<std::uint32_t>(a) | static_cast<std::uint32_t>(b));
 }

@@ -16,6 +16,7 @@ namespace ZOR_Basis {
 class Size {
 public:
     Size() = default;
+    /// A number of bytes.
     Size(std::uint64_t value) : value_(value) {}
     /// The absolute value of an `int`.
     /// \kept stat-01: the absolute value is computed in 32 bits and then sign-extended, so the most negative `int`
@@ -25,11 +26,14 @@ public:
     template <std::integral I>
     Size(I value) : value_(static_cast<std::uint64_t>(value)) {}
 
+    /// The number, which also is its hash.
     std::uint64_t get() const { return value_; }
     std::uint64_t val() const { return value_; }
     std::uint64_t hash() const { return value_; }
+    /// Sets the number.
     void set(std::uint64_t value) { value_ = value; }
 
+    /// Compare the numbers.
     bool operator==(Size const& other) const { return value_ == other.value_; }
     bool operator!=(Size const& other) const { return value_ != other.value_; }
     bool operator<(Size const& other) const { return value_ < other.value_; }

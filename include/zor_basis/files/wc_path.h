@@ -29,6 +29,7 @@ namespace ZOR_Basis {
 
 class ZB_API WcPath : public WBStr {
 public:
+    /// As in `FPath`: the two kinds of slash, the Windows separator and the other one.
     static constexpr WChar BACK_SLASH = ZB_W('\\');
     static constexpr WChar FORW_SLASH = ZB_W('/');
     static constexpr WChar slashGood = BACK_SLASH;
@@ -41,6 +42,7 @@ public:
 
     WcPath() = default;
     WcPath(WcPath const& other) = default;
+    /// Copy a text, or join two by `add`; nothing is normalised or translated.
     WcPath(WStr const& text) : WBStr(text) {}
     WcPath(WChar const* text, std::uint64_t len = 0) : WBStr(text, len) {}
     template <detail::Index I>
@@ -51,9 +53,11 @@ public:
     WcPath(WChar const* a, WStr const& b) : WBStr(a) { add(b); }
 
     WcPath& operator=(WcPath const& other) = default;
+    /// Assigns a copy, as to any `WBStr`.
     WcPath& operator=(WStr const& text) { return WBStr::operator=(text), *this; }
     WcPath& operator=(WChar const* text) { return WBStr::operator=(text), *this; }
 
+    /// Assigns two texts joined by `add`.
     WcPath& assign(WStr const& a, WStr const& b);
     WcPath& assign(WStr const& a, WChar const* b) { return assign(a, WStr(b)); }
 
@@ -77,6 +81,7 @@ public:
         return add(c);
     }
 
+    /// As in `FPath`, in code units.
     WcPath& addExt(WStr const& ext, bool addDot);
     WcPath& assureTermSlash();
     WcPath& remTermSlash();
@@ -99,6 +104,7 @@ public:
     bool ConvertFileURLtoUNC(WChar const* url);
     bool ConvertFileURLtoUNC(WStr const& url);
 
+    /// As in `FPath`: questions about a character, the path or a text.
     static bool isSlash(WChar c) { return c == BACK_SLASH || c == FORW_SLASH; }
     template <detail::Index I>
     requires(!std::same_as<I, WChar>) bool isSlash(I index) const {
@@ -114,6 +120,7 @@ public:
     /// Tells whether the whole path is a slash and a fake root, or equals `pathRoot` and begins with a slash.
     bool isFake() const { return isFake(text_); }
     static bool isFake(WChar const* text);
+    /// As in `FPath`.
     bool isWildCard() const { return isWildCard(text_); }
     static bool isWildCard(WChar const* text);
     bool matchWildCard(WChar const* pattern) const { return matchWildCard(pattern, text_); }

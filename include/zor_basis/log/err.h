@@ -13,6 +13,7 @@ namespace ZOR_Basis {
 /// \thread thread-safe
 class ZB_API Err {
 public:
+    /// Do nothing.
     static void err(char const* text);
     static void trace(char const* text);
 };

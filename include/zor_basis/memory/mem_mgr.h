@@ -70,6 +70,7 @@ public:
 protected:
     constexpr MemMgr() = default;
 
+    /// The one standard manager.
     static MemMgr _Only;
 };
 
@@ -82,6 +83,7 @@ public:
     MemMgrPtr& operator=(MemMgrPtr const&) = delete;
     ~MemMgrPtr() { delete manager_; }
 
+    /// The manager, which may be null.
     operator MemMgr*() const { return manager_; }
     MemMgr* operator->() const { return manager_; }
 

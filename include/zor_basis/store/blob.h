@@ -70,6 +70,7 @@ public:
     std::uint64_t size() const { return size_; }
     std::uint64_t sizeBuf() const { return capacity_; }
 
+    /// Compares sizes and bytes.
     bool operator==(Blob const& other) const;
     bool operator!=(Blob const& other) const { return !(*this == other); }
     /// Orders by unsigned bytes; a blob is less than a longer one that begins with it.

@@ -60,6 +60,7 @@ enum DictFile : int {
 template <class K, class V>
 class Dict : public SngList<DictEntry<K, V>> {
 public:
+    /// A key with its value.
     using Entry = DictEntry<K, V>;
 
     /// Constructs an empty dictionary without a path, which counts as saved.

@@ -24,6 +24,7 @@ public:
     DictEntry& operator=(DictEntry const& other) = default;
     DictEntry& operator=(DictEntry&& other) noexcept = default;
 
+    /// Tells whether the entry has this key.
     bool eq(K const& other) const { return key == other; }
     /// Assigns a copy of a value, unless it is the entry's own.
     void set(V const& other) {
@@ -35,6 +36,7 @@ public:
     /// Orders by the keys alone.
     bool operator<(DictEntry const& other) const { return key < other.key; }
 
+    /// Public, as in a pair.
     K key;
     V value;
 };

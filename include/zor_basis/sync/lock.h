@@ -19,6 +19,7 @@ namespace ZOR_Basis {
 
 class ZB_API Lock {
 public:
+    /// Which threads may unlock.
     enum Type : std::uint32_t {
         Binary = 0, ///< any thread may unlock
         Mutex = 1,  ///< the locking thread unlocks, and may lock again meanwhile; any other value means the same

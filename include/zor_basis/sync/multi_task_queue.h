@@ -45,6 +45,7 @@ namespace ZOR_Basis {
 
 class ZB_API MultiTaskQueue {
 public:
+    /// What the failure of a job entails.
     enum ErrPolicy : std::uint32_t {
         Continue = 0,    ///< a failure is recorded and changes nothing else
         StopOnError = 1, ///< after a failure no job is accepted and none is started; any other value means the same

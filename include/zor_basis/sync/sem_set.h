@@ -33,6 +33,7 @@ public:
     SemSet& operator=(SemSet const& other);
     ~SemSet();
 
+    /// The set itself.
     ISemSet* operator->() const { return set_; }
 
 private:

@@ -41,6 +41,7 @@ public:
     ///     the last of the text. It is a `char` value, so bytes above 127 come out negative
     int skipBlanks();
 
+    /// Tells whether all bytes have been read.
     bool isDataEnd() const { return position_ >= size_; }
     /// Tells whether a character is a line feed or a carriage return.
     static bool isEndOfLine(char c) { return c == '\n' || c == '\r'; }

@@ -26,9 +26,11 @@ public:
     Auto_ptr_CStr(std::string text);
     ~Auto_ptr_CStr();
 
+    /// The buffer.
     char* c_str() noexcept { return buffer_; }
     char const* c_str() const noexcept { return buffer_; }
     operator char*() noexcept { return buffer_; }
+    /// The number of bytes, without the terminator.
     std::uint64_t length() const noexcept { return length_; }
 
     /// Terminates a buffer that a callee may have filled completely.

@@ -255,7 +255,7 @@ protected:
     /// Releases the text.
     void free() noexcept { std::free(getBuf()); }
 
-    // With a `std::string_view`, by the rules of `std::string`.
+    /// Compare with a `std::string_view` by the rules of `std::string`.
     template <detail::StringView View>
     friend bool operator==(BufStr const& a, View b) noexcept {
         return detail::sameAsView(a, b);

@@ -39,6 +39,7 @@
 
 namespace ZOR_Basis {
 
+/// The conversions; there are no objects of this class.
 class ZB_API Convert {
 public:
     /// A narrow encoding. Other values are refused, or copied through by `EncodeMB` and `ToLocal`.

@@ -66,7 +66,7 @@ public:
     HeapStr& toLower() noexcept;
     HeapStr& toUpper() noexcept;
 
-    // With a `std::string_view`, by the rules of `std::string`.
+    /// Compare with a `std::string_view` by the rules of `std::string`.
     template <detail::StringView View>
     friend bool operator==(HeapStr const& a, View b) noexcept {
         return detail::sameAsView(a, b);

@@ -62,6 +62,7 @@ public:
 
     /// The number of bytes of text, without the terminator.
     std::uint64_t size() const noexcept { return size_; }
+    /// The text, as it was given.
     char const* c_str() const noexcept { return text_; }
     operator char const*() const noexcept { return text_; }
     /// Tells whether the pointer is not null, like the conversion to a pointer.
@@ -71,6 +72,7 @@ public:
     }
     /// The text with its size unchanged, including inner zeros.
     explicit operator std::string_view() const noexcept { return {text_, size_}; }
+    /// Ask for the size alone.
     bool empty() const noexcept { return size_ == 0; }
     bool some() const noexcept { return size_ > 0; }
 
@@ -109,7 +111,7 @@ public:
     bool operator!=(std::string const& other) const noexcept { return !(*this == other); }
     bool operator!=(char const* other) const noexcept { return !(*this == other); }
 
-    // The same with the operands exchanged; here the `Str` is the right-hand operand, whose size decides.
+    /// The same with the operands exchanged; here the `Str` is the right-hand operand, whose size decides.
     friend bool operator==(char const* a, Str const& b) noexcept { return Str(a) == b; }
     friend bool operator==(std::string const& a, Str const& b) noexcept { return Str(a) == b; }
     friend bool operator!=(char const* a, Str const& b) noexcept { return !(a == b); }
@@ -173,6 +175,7 @@ public:
     static void ToLower(char* text, std::uint64_t n) noexcept;
     static void ToUpper(char* text, std::uint64_t n) noexcept;
 
+    /// Tells whether a character is a hexadecimal digit of either case.
     static bool isHexDigit(char c) noexcept { return hexToDigit(c) >= 0; }
     /// 0 to 15 for a hexadecimal digit of either case, otherwise -1.
     static int hexToDigit(char c) noexcept {
@@ -189,6 +192,7 @@ public:
     static char decodeHexChar(char const* digits) noexcept;
 
 protected:
+    /// The view.
     std::uint64_t size_;
     char const* text_;
 

@@ -43,6 +43,7 @@ public:
 
     /// The number of code units of text, without the terminator.
     std::uint64_t size() const noexcept { return size_; }
+    /// The text, as it was given.
     WChar const* wstr() const noexcept { return text_; }
     operator WChar const*() const noexcept { return text_; }
     /// Tells whether the pointer is not null, like the conversion to a pointer.
@@ -52,6 +53,7 @@ public:
     }
     /// The text with its size unchanged, including inner zeros.
     explicit operator std::basic_string_view<WChar>() const noexcept { return {text_, size_}; }
+    /// Asks for the size alone.
     bool empty() const noexcept { return size_ == 0; }
     /// The first unit; the terminator if the text is empty.
     WChar first() const noexcept { return *text_; }
@@ -126,6 +128,7 @@ public:
     static void toUpper(WChar* text) noexcept;
 
 protected:
+    /// The view.
     std::uint64_t size_;
     WChar const* text_;
 };

@@ -39,6 +39,7 @@ public:
     BaseTimer& operator=(BaseTimer const&) = default;
     BaseTimer& operator=(BaseTimer&&) = default;
 
+    /// Tell whether a measurement is in progress, and whether it is suspended.
     bool started() const { return zbTimerDat::start > 0; }
     bool isSuspended() const { return suspendStart > 0; }
     /// Returns the ticks from start to stop.

@@ -62,6 +62,7 @@ public:
     PileTimer& operator=(PileTimer const&) = default;
     virtual ~PileTimer();
 
+    /// The name, which the timer owns.
     Str const& name() const { return name_; }
     char const* cname() const { return name_.c_str(); }
     /// The slot in the timer's manager; 0 until a manager assigns one.
@@ -125,15 +126,18 @@ protected:
     virtual void lock();
     virtual void unlock();
 
+    /// The statistics in ticks, and how many measurements they contain.
     detail::Statistic<std::int64_t> total_;
     detail::Statistic<std::int64_t> suspendTotal_;
     detail::Statistic<std::int64_t> max_;
     detail::Statistic<std::int64_t> min_; ///< 0: none yet
     detail::Statistic<std::int64_t> suspendMax_;
     detail::Statistic<std::uint64_t> count_;
+    /// The slot in the manager.
     std::uint64_t id_ = 0;
     detail::Statistic<std::uint64_t> maxCount_; ///< the count when max_ was set
-    detail::Statistic<std::uint64_t> minCount_;
+    detail::Statistic<std::uint64_t> minCount_; ///< the count when min_ was set
+    /// Whether misuse is reported, and the name.
     bool checks_;
     HeapStr name_;
 };

@@ -76,6 +76,7 @@ public:
     /// Calls `getTimer`; null for a null manager.
     static PileTimer* get(TimerMgr* manager, std::uint64_t id);
 
+    /// Switch the measurements through this manager on or off.
     void setActive(bool active) { active_.store(active, std::memory_order_relaxed); }
     bool active() const { return active_.load(std::memory_order_relaxed); }
 
