@@ -1,6 +1,8 @@
 #include "host/control_link/control_link.h"
 #include "host/hq_basis/alert_service.h"
 
+#include <new>
+
 namespace {
 
 int fireAlert(std::uint32_t id) { return host::AlertService::instance().fire(id) ? 0 : -1; }
@@ -15,8 +17,10 @@ std::uint32_t AlertTimer::New(std::uint32_t periodMs, Callback callback, void* c
         callback == nullptr) {
         return 0;
     }
-    host::offerAlertFire(fireAlert);
-    return host::AlertService::instance().add(periodMs, callback, context);
+    try {
+        host::offerAlertFire(fireAlert);
+        return host::AlertService::instance().add(periodMs, callback, context);
+    } catch (std::bad_alloc const&) { return 0; }
 }
 
 void AlertTimer::Delete(std::uint32_t id) {

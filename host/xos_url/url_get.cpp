@@ -8,6 +8,7 @@
 #include "host/xos_url/url_text.h"
 
 #include <memory>
+#include <new>
 
 namespace host {
 
@@ -86,5 +87,10 @@ extern "C" int xos_URLGet(char const* url, char const* target, char const* first
         host::failFor(host::Reason::BAD_ARGUMENT);
         return FAILED;
     }
-    return host::get(url, target, first, second) ? 0 : FAILED;
+    try {
+        return host::get(url, target, first, second) ? 0 : FAILED;
+    } catch (std::bad_alloc const&) {
+        host::failFor(host::Reason::NO_MEMORY);
+        return FAILED;
+    }
 }
