@@ -1,6 +1,8 @@
 #include "host/hq_basis/alert_service.h"
 
 #include <algorithm>
+#include <exception>
+#include <new>
 #include <system_error>
 
 namespace host {
@@ -28,8 +30,13 @@ std::uint32_t AlertService::add(std::uint32_t periodMs, HQ_Basis::AlertTimer::Ca
     auto const alert = std::make_shared<Alert>();
     alert->shown = {freeId(), context};
     alert->callback = callback;
-    alerts_.emplace(alert->shown.id, alert);
-    plan(alert, dueAfter(periodMs));
+    auto const place = alerts_.emplace(alert->shown.id, alert).first;
+    try {
+        plan(alert, dueAfter(periodMs));
+    } catch (std::bad_alloc const&) {
+        alerts_.erase(place);
+        throw;
+    }
     return alert->shown.id;
 }
 
@@ -90,7 +97,7 @@ bool AlertService::startScheduler() {
 void AlertService::startWorker() {
     try {
         std::thread([this] { work(); }).detach();
-    } catch (std::system_error const&) {
+    } catch (std::exception const&) { // neither a thread nor memory for it
         // The alert waits in the queue for the next worker that is free.
     }
 }

@@ -1,6 +1,8 @@
 #include "host/control_link/control_link.h"
 #include "host/hq_basis/alert_service.h"
 
+#include <new>
+
 namespace {
 
 int fireAlert(std::uint32_t id) { return host::AlertService::instance().fire(id) ? 0 : -1; }
@@ -13,8 +15,10 @@ std::uint32_t AlertTimer::New(std::uint32_t periodMs, Callback callback, void* c
     auto const callbackWord = static_cast<std::uint64_t>(reinterpret_cast<std::uintptr_t>(callback));
     auto const add = [=]() -> std::uint32_t {
         if (callback == nullptr) return 0;
-        host::offerAlertFire(fireAlert);
-        return host::AlertService::instance().add(periodMs, callback, context);
+        try {
+            host::offerAlertFire(fireAlert);
+            return host::AlertService::instance().add(periodMs, callback, context);
+        } catch (std::bad_alloc const&) { return 0; }
     };
     return host::call<std::uint32_t>("HQ_Basis::AlertTimer::New",
                                      {periodMs, callbackWord, host::addressArgument(context)}, 0, add);

@@ -14,7 +14,8 @@ enum class Reason {
     FORBIDDEN,      ///< EACCES; 5
     DIRECTORY,      ///< EISDIR; 5
     TOO_MANY_STEPS, ///< ELOOP; 12156
-    BAD_ANSWER      ///< EPROTO; 12152
+    BAD_ANSWER,     ///< EPROTO; 12152
+    NO_MEMORY       ///< ENOMEM; 8
 };
 
 /// Sets the last error.

@@ -24,6 +24,8 @@ int codeOf(Reason reason) {
         return ELOOP;
     case Reason::BAD_ANSWER:
         return EPROTO;
+    case Reason::NO_MEMORY:
+        return ENOMEM;
     }
     return EIO;
 }

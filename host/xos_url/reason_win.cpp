@@ -26,6 +26,8 @@ DWORD codeOf(Reason reason) {
         return ERROR_WINHTTP_REDIRECT_FAILED;
     case Reason::BAD_ANSWER:
         return ERROR_WINHTTP_INVALID_SERVER_RESPONSE;
+    case Reason::NO_MEMORY:
+        return ERROR_NOT_ENOUGH_MEMORY;
     }
     return ERROR_GEN_FAILURE;
 }

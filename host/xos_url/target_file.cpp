@@ -30,9 +30,9 @@ TargetFile::~TargetFile() {
 
 bool TargetFile::open() {
     for (int attempt = 0; attempt < MOST_ATTEMPTS && file_ == nullptr; ++attempt) {
-        std::string const name = temporaryName(path_);
+        std::string name = temporaryName(path_);
         file_ = createNewFile(name);
-        if (file_ != nullptr) temporary_ = name;
+        if (file_ != nullptr) temporary_ = std::move(name);
     }
     return file_ != nullptr;
 }

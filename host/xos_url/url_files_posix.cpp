@@ -19,6 +19,15 @@ bool isRegular(int file) {
     return S_ISREG(status.st_mode) || failFor(Reason::BAD_ARGUMENT);
 }
 
+/// Closes a file that cannot become a stream, because memory is short.
+std::FILE* streamOf(int file, char const* mode) {
+    std::FILE* const stream = fdopen(file, mode);
+    if (stream != nullptr) return stream;
+    KeepReason const keep;
+    close(file);
+    return nullptr;
+}
+
 } // namespace
 
 std::string systemPath(std::string path) {
@@ -30,13 +39,18 @@ std::string pathOfFileUrl(FileUrl const& url) { return url.host.empty() ? url.pa
 
 std::FILE* createNewFile(std::string const& path) {
     int const file = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-    return file < 0 ? nullptr : fdopen(file, "wb");
+    if (file < 0) return nullptr;
+    std::FILE* const stream = streamOf(file, "wb");
+    if (stream != nullptr) return stream;
+    KeepReason const keep;
+    removeFile(path);
+    return nullptr;
 }
 
 std::FILE* openRegularFile(std::string const& path) {
     // Without waiting for a writer, should the name be a pipe's.
     int const file = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (file < 0 || isRegular(file)) return file < 0 ? nullptr : fdopen(file, "rb");
+    if (file < 0 || isRegular(file)) return file < 0 ? nullptr : streamOf(file, "rb");
     KeepReason const keep;
     close(file);
     return nullptr;

@@ -1,6 +1,7 @@
 // The sibling is url_files_posix.cpp.
 
 #include "host/windows_api.h"
+#include "host/xos_url/reason.h"
 #include "host/xos_url/url_files.h"
 
 #include <algorithm>
@@ -26,16 +27,34 @@ std::string pathOfFileUrl(FileUrl const& url) {
     return systemPath(path);
 }
 
+namespace {
+
+/// Closes a file that cannot become a stream, because memory is short.
+std::FILE* streamOf(int file, char const* mode) {
+    std::FILE* const stream = _fdopen(file, mode);
+    if (stream != nullptr) return stream;
+    KeepReason const keep;
+    _close(file);
+    return nullptr;
+}
+
+} // namespace
+
 std::FILE* createNewFile(std::string const& path) {
     int const file =
         _open(path.c_str(), _O_WRONLY | _O_CREAT | _O_EXCL | _O_BINARY | _O_NOINHERIT, _S_IREAD | _S_IWRITE);
-    return file < 0 ? nullptr : _fdopen(file, "wb");
+    if (file < 0) return nullptr;
+    std::FILE* const stream = streamOf(file, "wb");
+    if (stream != nullptr) return stream;
+    KeepReason const keep;
+    removeFile(path);
+    return nullptr;
 }
 
 std::FILE* openRegularFile(std::string const& path) {
     // A directory cannot be opened this way.
     int const file = _open(path.c_str(), _O_RDONLY | _O_BINARY | _O_NOINHERIT);
-    return file < 0 ? nullptr : _fdopen(file, "rb");
+    return file < 0 ? nullptr : streamOf(file, "rb");
 }
 
 bool replaceFile(std::string const& from, std::string const& to) {

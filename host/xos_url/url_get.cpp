@@ -8,6 +8,7 @@
 #include "host/xos_url/url_text.h"
 
 #include <memory>
+#include <new>
 
 namespace host {
 
@@ -79,12 +80,12 @@ extern "C" int xos_URLGet(char const* url, char const* target, char const* first
     using host::addressArgument;
     constexpr int FAILED = -1;
     auto const get = [=] {
-        bool const isComplete = url != nullptr && target != nullptr && *target != '\0';
-        bool const isGot =
-            isComplete ? host::get(url, target, first, second) : host::failFor(host::Reason::BAD_ARGUMENT);
-        return isGot ? 0 : FAILED;
+        if (url == nullptr || target == nullptr || *target == '\0') return host::failFor(host::Reason::BAD_ARGUMENT);
+        try {
+            return host::get(url, target, first, second);
+        } catch (std::bad_alloc const&) { return host::failFor(host::Reason::NO_MEMORY); }
     };
     host::Arguments const arguments{addressArgument(url), addressArgument(target), addressArgument(first),
                                     addressArgument(second)};
-    return host::call("xos_URLGet", arguments, FAILED, get);
+    return host::call("xos_URLGet", arguments, FAILED, [&] { return get() ? 0 : FAILED; });
 }

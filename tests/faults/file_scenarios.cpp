@@ -4,6 +4,7 @@
 #include <zor_basis/text/convert.h>
 
 #include <cstring>
+#include <memory>
 
 using namespace ZOR_Basis;
 
@@ -37,7 +38,8 @@ bool readsStream(IFile* file) {
 }
 
 bool listsWide(Place const& place) {
-    DirIteratorW list(LOOK_ALL, wide(place.path));
+    std::unique_ptr<DirIterImplW> const list(DirIterImplW::Make(LOOK_ALL, wide(place.path)));
+    if (list == nullptr) return false;
     int count = 0;
     std::uint64_t size = 0;
     while (list->next() != nullptr) {

@@ -21,8 +21,18 @@ struct Scenario {
         WHOLE_FILES,
         /// A file may also be cut: it is written piece by piece.
         PIECES,
+        /// As WHOLE_FILES; success says nothing of what is not there: what cannot be listed counts as empty.
+        WHAT_IS_LISTED,
         /// Files have contents of their own in every run.
         NAMES
+    };
+
+    enum Without {
+        NONE,
+        /// The operation tries until it succeeds.
+        LASTING_FAULTS,
+        /// The system's own library crashes or loses memory when an allocation fails.
+        ALLOCATION_FAULTS
     };
 
     char const* name;
@@ -31,6 +41,7 @@ struct Scenario {
     /// \return whether the operation says that it succeeded, with what it is to give
     bool (*act)(Place const& place);
     Promise promise = WHOLE_FILES;
+    Without without = NONE;
 };
 
 using Scenarios = std::vector<Scenario>;

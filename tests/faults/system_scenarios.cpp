@@ -13,14 +13,16 @@ using namespace ZOR_Basis;
 
 namespace {
 
-/// The folder is the system's root, with a configuration.
+/// The system's root lies beside the folders of all runs, with a configuration. The platform layer keeps every root
+/// that it is given, so it is given one.
 void prepareRoot(Place const& place) {
-    makeFolder(place / "system");
-    makeFolder(place / "tmp");
-    makeFolder(place / "system/config");
-    put(place / "system/config/vdp.cfg", "VDP = on\nVPS = off\n");
     put(place / "page", "the page");
-    xos_HostSetRoot((place / "system").c_str());
+    std::filesystem::path const root = std::filesystem::path(place.path).parent_path() / "root";
+    makeFolder((root / "system/config").string());
+    makeFolder((root / "tmp").string());
+    put((root / "system/config/vdp.cfg").string(), "VDP = on\nVPS = off\n");
+    static std::string given;
+    if (given.empty()) xos_HostSetRoot((given = (root / "system").string()).c_str());
 }
 
 bool makesTemporaryFolders(Place const&) {
@@ -53,15 +55,18 @@ bool knowsDrives(Place const& place) {
 bool readsFlags(Place const&) { return setVDPFlagsFromCFG() == 0; }
 
 bool logs(Place const&) {
-    Log const log("faults");
+    // A log that is destroyed is closed some time later.
+    static Log const& log = *new Log("faults");
     for (int i = 0; i < 20; ++i) log.out("line %d of %s", i, "a log");
     return log.flush();
 }
 bool reportsTimers(Place const&) {
-    static int number = 0;
-    TimerMgr* const manager = TimerMgr::New(("faults " + std::to_string(number++)).c_str(), 5);
+    // A manager and its timers exist as long as the process.
+    TimerMgr* manager = TimerMgr::Get("faults");
+    if (manager == nullptr) manager = TimerMgr::New("faults", 5);
     if (manager == nullptr) return false;
-    PileTimer* const timer = manager->createTimer("a timer", 1, number % 2 == 0);
+    PileTimer* timer = manager->getTimer(1);
+    if (timer == nullptr) timer = manager->createTimer("a timer", 1, true);
     if (timer == nullptr) return false;
     manager->setActive(true);
     manager->start(1);
@@ -82,12 +87,13 @@ bool parses(Place const&) {
 
 Scenarios systemScenarios() {
     return {
-        {"VDPTempDir", prepareRoot, makesTemporaryFolders, Scenario::NAMES},
+        {"VDPTempDir", prepareRoot, makesTemporaryFolders, Scenario::NAMES, Scenario::LASTING_FAULTS},
         {"Url::Get", prepareRoot, gets},
         {"ZB_runCommand", prepareRoot, runs},
         {"Process::Create", prepareRoot, creates},
         {"Process::Wait", prepareRoot, createsAndWaits},
-        {"Sys::CurrentUser", prepareRoot, knowsUsers},
+        // Of glibc the name service.
+        {"Sys::CurrentUser", prepareRoot, knowsUsers, Scenario::WHOLE_FILES, Scenario::ALLOCATION_FAULTS},
         {"Sys::isLocalDisk, UnMap", prepareRoot, knowsDrives},
         {"setVDPFlagsFromCFG", prepareRoot, readsFlags},
         {"Log", prepareRoot, logs, Scenario::NAMES},

@@ -38,8 +38,8 @@ bool lists(Place const& place) {
     return names == 4;
 }
 bool linksOrCopies(Place const& place) {
-    return zbLinkOrCopy((place / "d").c_str(), (place / "linked").c_str(), false) &&
-           FStat::isDir((place / "linked").c_str());
+    return zbLinkOrCopy((place / "a").c_str(), (place / "linked").c_str(), false) &&
+           FStat::isFile((place / "linked").c_str());
 }
 bool checksAndRemoves(Place const& place) {
     return zbCheckRemoveFileDir(FPath((place / "d").c_str()), true) &&
@@ -50,9 +50,9 @@ bool checksAndRemoves(Place const& place) {
 
 Scenarios walkScenarios() {
     return {
-        {"FileCopyVisitor", prepareTree, copies},
-        {"FileMoveVisitor", prepareTree, moves},
-        {"FileDeleteVisitor", prepareTree, removes},
+        {"FileCopyVisitor", prepareTree, copies, Scenario::WHAT_IS_LISTED},
+        {"FileMoveVisitor", prepareTree, moves, Scenario::WHAT_IS_LISTED},
+        {"FileDeleteVisitor", prepareTree, removes, Scenario::WHAT_IS_LISTED},
         {"FileCountVisitor::Get", prepareTree, counts},
         {"FileSizeVisitor::Get", prepareTree, sums},
         {"FindFileVisit", prepareTree, finds},

@@ -1,9 +1,11 @@
 #include "basis/files/system_calls.h"
 #include "tests/support/scratch.h"
 #include "tests/support/skip.h"
+#include "tests/support/table.h"
 
 #include <gtest/gtest.h>
 
+#include <cerrno>
 #include <string>
 #include <tuple>
 #include <unistd.h>
@@ -51,6 +53,43 @@ TEST(SystemCallsPosix, give_so_many_links_as_fit) {
         if (::link((scratch / "file").c_str(), name.c_str()) != 0) CASE_CANNOT_HOLD("no so many links here");
     }
     EXPECT_EQ(std::get<0>(numbersOf(scratch / "file")), 32767);
+}
+
+TEST(SystemCallsPosix, give_the_codes_that_retries_are_decided_by) {
+    struct Case {
+        Row row;
+        int error;
+        std::uint32_t code;
+    };
+    for (Case const& c : {
+             Case{{}, 0, NO_ERROR_YET},
+             Case{{}, ENOENT, FILE_NOT_FOUND},
+             Case{{}, ENOTDIR, PATH_NOT_FOUND},
+             Case{{}, EACCES, ACCESS_DENIED},
+             Case{{}, EPERM, GENERAL_FAILURE},
+             Case{{}, ESTALE, NETWORK_NAME_GONE},
+             Case{{}, EHOSTDOWN, NETWORK_NAME_GONE},
+             Case{{}, EHOSTUNREACH, NETWORK_NAME_GONE},
+             Case{{}, ENETDOWN, NETWORK_NAME_GONE},
+             Case{{}, ENETUNREACH, NETWORK_NAME_GONE},
+             Case{{}, ENETRESET, NETWORK_NAME_GONE},
+             Case{{}, ENOLINK, NETWORK_NAME_GONE},
+             Case{{}, EREMOTEIO, NETWORK_NAME_GONE},
+             Case{{}, EKEYREJECTED, LOGON_FAILURE},
+             Case{{}, EKEYEXPIRED, LOGON_FAILURE},
+             Case{{}, EKEYREVOKED, LOGON_FAILURE},
+             Case{{}, ENOKEY, LOGON_FAILURE},
+         }) {
+        SCOPED_TRACE(c.row);
+        errno = c.error;
+        EXPECT_EQ(systemCalls.lastError(), c.code);
+    }
+}
+
+TEST(SystemCallsPosix, sleep_as_long_as_the_tick_says) {
+    std::uint64_t const before = systemCalls.tick();
+    systemCalls.sleep(30);
+    EXPECT_GE(systemCalls.tick() - before, 29u);
 }
 
 } // namespace

@@ -33,7 +33,7 @@ public:
     SemSet& operator=(SemSet const& other);
     ~SemSet();
 
-    /// The set itself.
+    /// \return the set; null if memory was too short for the set itself
     ISemSet* operator->() const { return set_; }
 
 private:

@@ -45,11 +45,11 @@ TEST(HostReason, of_an_answers_status_is_forbidden_missing_or_bad) {
 TEST(HostReason, has_a_code_of_its_own_but_for_a_folder) {
     std::set<int> codes;
     for (Reason const reason : {Reason::BAD_ARGUMENT, Reason::UNKNOWN_SCHEME, Reason::NOT_FOUND, Reason::FORBIDDEN,
-                                Reason::TOO_MANY_STEPS, Reason::BAD_ANSWER}) {
+                                Reason::TOO_MANY_STEPS, Reason::BAD_ANSWER, Reason::NO_MEMORY}) {
         EXPECT_NE(codeAfter(reason), 0);
         codes.insert(codeAfter(reason));
     }
-    EXPECT_EQ(codes.size(), 6u);
+    EXPECT_EQ(codes.size(), 7u);
     EXPECT_NE(codeAfter(Reason::DIRECTORY), 0);
 }
 
