@@ -83,7 +83,7 @@ ZB_INLINE bool QuickLine::putPlain(char const*& format) {
 }
 
 bool QuickLine::writeConversion(char const*& format) {
-    // The most frequent ones, which say no more than that.
+    // The most frequent conversions: a kind alone, without flags, width or precision.
     constexpr Conversion PLAIN;
     switch (*format) {
     case 's':

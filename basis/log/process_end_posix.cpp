@@ -10,7 +10,7 @@ namespace {
 
 void beforeFork() { loggers().mutex.lock(); }
 void inParent() { loggers().mutex.unlock(); }
-/// The lines that the copy of a process inherits are the original's to write.
+/// A forked copy inherits lines that the original process writes.
 void inCopy() {
     for (LoggerImpl* logger = loggers().list.first(); logger != nullptr; logger = logger->next) logger->becomeCopy();
     loggers().mutex.unlock();

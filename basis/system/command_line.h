@@ -78,7 +78,7 @@ private:
             std::memset(out_, '\\', backslashes);
             out_ += backslashes;
             if (!beforeQuote || literal) {
-                // The end and a separator are the loop's to see.
+                // The loop handles separators and the end.
                 if (*text != '\0' && (quoted || !isSeparator(*text))) *out_++ = *text++;
             } else if (quoted && text[1] == '"') {
                 *out_++ = '"';
