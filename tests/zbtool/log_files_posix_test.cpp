@@ -34,8 +34,8 @@ TEST(LogFilesPosix, follows_the_lines_and_sessions_that_come) {
     append(folder + "/0.log", "second\n");
     expect("second\n");
     append(folder + "/0.log", "third\n");
-    append(folder + "/1.log", "next session\n");
-    expect("third\nnext session\n");
+    append(folder + "/1.log", "the next session, in more bytes than before\n");
+    expect("third\nthe next session, in more bytes than before\n");
     ::kill(child.process(), SIGINT);
     auto const end = child.wait();
     EXPECT_EQ(end.signal, SIGINT);

@@ -11,7 +11,8 @@ TEST(LogFiles, prints_all_sessions_in_their_order) {
         put(tool / ("tmp/zb_log/render/" + std::to_string(session) + ".log"),
             "session " + std::to_string(session) + "\n");
     }
-    put(tool / "tmp/zb_log/render/notes.log", "no session\n");
+    for (char const* name : {"notes.log", "5x.log", "-1.log"})
+        put(tool / ("tmp/zb_log/render/" + std::string(name)), "no session\n");
     EXPECT_EQ(tool.run({"log", "render"}), (ToolResult{0, "session 0\nsession 2\nsession 10\n", ""}));
     EXPECT_EQ(tool.run({"log", "render", "--session", "2"}).output, "session 2\n");
     Tool elsewhere;
