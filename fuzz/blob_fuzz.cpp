@@ -41,12 +41,12 @@ void readAll(std::string bytes) {
     }
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runBlob(unsigned char const* data, std::size_t size) {
     std::string const bytes(reinterpret_cast<char const*>(data), size);
     readAll<Blob>(bytes);
     readAll<SecretBlob>(bytes);
 }
 
-FuzzTarget const TARGET("blob", run);
+FuzzTarget const BLOB("blob", runBlob);
 
 } // namespace

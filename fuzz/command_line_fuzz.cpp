@@ -70,7 +70,7 @@ Words expectedWords(std::string const& text) {
     return words;
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runCommandLine(unsigned char const* data, std::size_t size) {
     std::string text(reinterpret_cast<char const*>(data), size);
     text = text.c_str();
     CommandLine const line(text.c_str());
@@ -81,6 +81,6 @@ void run(unsigned char const* data, std::size_t size) {
     require(line.words()[expected.size()] == nullptr);
 }
 
-FuzzTarget const TARGET("command_line", run);
+FuzzTarget const COMMAND_LINE("command_line", runCommandLine);
 
 } // namespace

@@ -13,18 +13,18 @@ using namespace host;
 
 namespace {
 
-bool isBlank(char c) { return c == ' ' || (c >= '\t' && c <= '\r' && c != '\n'); }
+bool isWhiteSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r' && c != '\n'); }
 
 std::string stripped(std::string text) {
-    while (!text.empty() && isBlank(text.back())) text.pop_back();
-    while (!text.empty() && isBlank(text.front())) text.erase(0, 1);
+    while (!text.empty() && isWhiteSpace(text.back())) text.pop_back();
+    while (!text.empty() && isWhiteSpace(text.front())) text.erase(0, 1);
     return text;
 }
 
 std::string beforeComment(std::string const& line) {
     std::string text;
     for (char const c : line) {
-        if (c == '#' && (text.empty() || isBlank(text.back()))) break;
+        if (c == '#' && (text.empty() || isWhiteSpace(text.back()))) break;
         text += c;
     }
     return text;
@@ -50,7 +50,7 @@ void requireLine(std::string const& line, int number, GroupText const& found, st
     require(switchValue(read.value).has_value() == (isOn || isOff) && switchValue(read.value).value_or(false) == isOn);
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runConfiguration(unsigned char const* data, std::size_t size) {
     std::string text(reinterpret_cast<char const*>(data), size);
     GroupText const found = parseGroup(text);
     if (text.compare(0, 3, "\xEF\xBB\xBF") == 0) text.erase(0, 3);
@@ -62,6 +62,6 @@ void run(unsigned char const* data, std::size_t size) {
     require(entry == found.entries.size() && bad == found.malformedLines.size());
 }
 
-FuzzTarget const TARGET("configuration", run);
+FuzzTarget const CONFIGURATION("configuration", runConfiguration);
 
 } // namespace

@@ -34,13 +34,13 @@ void readAsUtf16(std::string const& text) {
     require(std::string(narrow.c_str(), narrow.size()) == reference::utf8(reference::characters(units)));
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runConvert(unsigned char const* data, std::size_t size) {
     if (size == 0) return;
     std::string const text(reinterpret_cast<char const*>(data), size);
     readAsUtf8(text);
     readAsUtf16(text);
 }
 
-FuzzTarget const TARGET("convert", run);
+FuzzTarget const CONVERT("convert", runConvert);
 
 } // namespace

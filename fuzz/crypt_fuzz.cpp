@@ -24,7 +24,7 @@ std::unique_ptr<CrKey> keyOf(unsigned char const* secret, std::size_t n) {
     return std::unique_ptr<CrKey>(crypt().deriveKey(hash));
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runCrypt(unsigned char const* data, std::size_t size) {
     if (size == 0) return;
     std::size_t const secretSize = std::min<std::size_t>(data[0], size - 1);
     std::unique_ptr<CrKey> const key = keyOf(data + 1, secretSize);
@@ -48,6 +48,6 @@ void run(unsigned char const* data, std::size_t size) {
     }
 }
 
-FuzzTarget const TARGET("crypt", run);
+FuzzTarget const CRYPT("crypt", runCrypt);
 
 } // namespace

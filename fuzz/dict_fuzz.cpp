@@ -62,7 +62,7 @@ Contents contentsOf(BlobDict& dict) {
     return contents;
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runDict(unsigned char const* data, std::size_t size) {
     static Folder const folder;
     std::string const path = (folder.path / "dict").generic_string();
     std::string const bytes(reinterpret_cast<char const*>(data), size);
@@ -80,6 +80,6 @@ void run(unsigned char const* data, std::size_t size) {
     require(contentsOf(again) == contents);
 }
 
-FuzzTarget const TARGET("dict", run);
+FuzzTarget const DICT("dict", runDict);
 
 } // namespace

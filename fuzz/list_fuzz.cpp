@@ -5,7 +5,7 @@
 
 namespace {
 
-void run(unsigned char const* data, std::size_t size) {
+void runList(unsigned char const* data, std::size_t size) {
     {
         sng_list::ListBesideVector<RandomBytes> both(RandomBytes(data, size));
         while (!both.random.isUsedUp()) {
@@ -16,6 +16,6 @@ void run(unsigned char const* data, std::size_t size) {
     require(Item::living == 0);
 }
 
-FuzzTarget const TARGET("list", run);
+FuzzTarget const LIST("list", runList);
 
 } // namespace

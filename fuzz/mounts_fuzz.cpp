@@ -96,12 +96,12 @@ void requireTheLongest(RandomBytes bytes) {
     }
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runMounts(unsigned char const* data, std::size_t size) {
     std::string const table(reinterpret_cast<char const*>(data), size);
     for (char const* path : {"/", "/home", "/a/b/c"}) requireOneThatCovers(table, path);
     requireTheLongest(RandomBytes(data, size));
 }
 
-FuzzTarget const TARGET("mounts", run);
+FuzzTarget const MOUNTS("mounts", runMounts);
 
 } // namespace

@@ -57,7 +57,7 @@ void requireLine(ZB_Parse& parse, Model& model, int maximum) {
     require(whole == model.isAtLineEnd());
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runParse(unsigned char const* data, std::size_t size) {
     if (size <= CALLS) return;
     int const maximum = data[0];
     std::string const text(reinterpret_cast<char const*>(data) + 1 + CALLS, size - 1 - CALLS);
@@ -81,6 +81,6 @@ void run(unsigned char const* data, std::size_t size) {
     }
 }
 
-FuzzTarget const TARGET("parse", run);
+FuzzTarget const PARSE("parse", runParse);
 
 } // namespace

@@ -67,7 +67,7 @@ void requireSplit(std::string const& text) {
     require(path.offsetName() == (slash == std::string::npos ? 0 : slash + 1));
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runPaths(unsigned char const* data, std::size_t size) {
     if (size == 0) return;
     std::string const all(reinterpret_cast<char const*>(data), size);
     std::size_t const cut = all.find('\0');
@@ -97,6 +97,6 @@ void run(unsigned char const* data, std::size_t size) {
     require(matched == WcPath::matchWildCard(wideText.c_str(), wideOther.c_str()));
 }
 
-FuzzTarget const TARGET("paths", run);
+FuzzTarget const PATHS("paths", runPaths);
 
 } // namespace

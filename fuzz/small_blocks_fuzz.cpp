@@ -52,7 +52,7 @@ private:
     unsigned char mark_ = 0;
 };
 
-void run(unsigned char const* data, std::size_t size) {
+void runSmallBlocks(unsigned char const* data, std::size_t size) {
     RandomBytes bytes(data, size);
     std::uint64_t const elementSize = SMALLEST + bytes.byte();
     std::uint64_t const count = bytes.byte();
@@ -72,6 +72,6 @@ void run(unsigned char const* data, std::size_t size) {
     }
 }
 
-FuzzTarget const TARGET("small_blocks", run);
+FuzzTarget const SMALL_BLOCKS("small_blocks", runSmallBlocks);
 
 } // namespace

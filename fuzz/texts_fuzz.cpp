@@ -21,7 +21,7 @@ void change(RandomBytes const& bytes) {
     }
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runTexts(unsigned char const* data, std::size_t size) {
     RandomBytes bytes(data, size);
     switch (bytes.byte() % 3) {
     case 0:
@@ -33,6 +33,6 @@ void run(unsigned char const* data, std::size_t size) {
     }
 }
 
-FuzzTarget const TARGET("texts", run);
+FuzzTarget const TEXTS("texts", runTexts);
 
 } // namespace

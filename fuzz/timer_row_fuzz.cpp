@@ -14,12 +14,12 @@ using namespace ZOR_Basis;
 namespace {
 
 /// Larger numbers reach into the next column, which the model does not follow.
-constexpr std::int64_t LARGEST = 999'999'999;
+constexpr std::int64_t LARGEST_FIELD = 999'999'999;
 constexpr std::size_t LONGEST_NAME = 200;
 
 /// Mostly small, so that all lengths occur.
 std::int64_t number(RandomBytes& bytes) {
-    auto const value = static_cast<std::int64_t>(bytes.word() >> (bytes.byte() % 64)) % LARGEST;
+    auto const value = static_cast<std::int64_t>(bytes.word() >> (bytes.byte() % 64)) % LARGEST_FIELD;
     return value;
 }
 
@@ -51,7 +51,7 @@ void requireConverted(std::int64_t ticks, std::int64_t frequency) {
     require(static_cast<std::uint64_t>(ms) == static_cast<std::uint64_t>(Wide{ticks} * 1000 / frequency));
 }
 
-void run(unsigned char const* data, std::size_t size) {
+void runTimerRow(unsigned char const* data, std::size_t size) {
     RandomBytes bytes(data, size);
     char const separator = ",.'\0"[bytes.byte() % 4];
     setThousandsSeparator(separator);
@@ -62,6 +62,6 @@ void run(unsigned char const* data, std::size_t size) {
     requireRow(bytes, name);
 }
 
-FuzzTarget const TARGET("timer_row", run);
+FuzzTarget const TIMER_ROW("timer_row", runTimerRow);
 
 } // namespace

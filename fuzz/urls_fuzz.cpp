@@ -14,7 +14,7 @@ using namespace ZOR_Basis;
 namespace {
 
 // The undecoded rest is appended before each escape that follows another: the result grows with the square.
-constexpr std::size_t LONGEST = 300;
+constexpr std::size_t LONGEST_URL = 300;
 
 int digit(char c) {
     if (c >= '0' && c <= '9') return c - '0';
@@ -88,8 +88,8 @@ void requireParts(std::string const& url) {
     require((hasPassword ? url.substr(colon + 1, at - colon - 1) : "-") == password.c_str());
 }
 
-void run(unsigned char const* data, std::size_t size) {
-    std::string text(reinterpret_cast<char const*>(data), std::min(size, LONGEST));
+void runUrls(unsigned char const* data, std::size_t size) {
+    std::string text(reinterpret_cast<char const*>(data), std::min(size, LONGEST_URL));
     text.resize(std::strlen(text.c_str()));
     if (text.empty()) return;
     FPath path("dir");
@@ -103,6 +103,6 @@ void run(unsigned char const* data, std::size_t size) {
     }
 }
 
-FuzzTarget const TARGET("urls", run);
+FuzzTarget const URLS("urls", runUrls);
 
 } // namespace

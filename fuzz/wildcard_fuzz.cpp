@@ -17,28 +17,28 @@ using namespace ZOR_Basis;
 namespace {
 
 /// Trying all possibilities takes a time that grows with the length to the power of the stars.
-constexpr std::size_t LONGEST = 40;
+constexpr std::size_t LONGEST_MATCHED = 40;
 constexpr std::ptrdiff_t MOST_STARS = 5;
 
-std::basic_string<WChar> wide(std::string const& text) {
+std::basic_string<WChar> wideText(std::string const& text) {
     std::basic_string<WChar> units;
     for (char const c : text) units.push_back(static_cast<unsigned char>(c));
     return units;
 }
 
-void run(unsigned char const* data, std::size_t size) {
-    std::string const all(reinterpret_cast<char const*>(data), std::min(size, 2 * LONGEST));
+void runWildcard(unsigned char const* data, std::size_t size) {
+    std::string const all(reinterpret_cast<char const*>(data), std::min(size, 2 * LONGEST_MATCHED));
     std::string const pattern = all.c_str();
     std::string const name = pattern.size() < all.size() ? all.c_str() + pattern.size() + 1 : "";
     bool const matched = FPath::matchWildCard(pattern.c_str(), name.c_str());
     require(matched == matchesWildcard(pattern.c_str(), name.c_str()));
-    require(matched == WcPath::matchWildCard(wide(pattern).c_str(), wide(name).c_str()));
+    require(matched == WcPath::matchWildCard(wideText(pattern).c_str(), wideText(name).c_str()));
     if (std::count(pattern.begin(), pattern.end(), '*') > MOST_STARS) return;
     require(matched == literally<ExactCase>(pattern.c_str(), name.c_str()));
     require(matchesWildcard<AnyCase>(pattern.c_str(), name.c_str()) ==
             literally<AnyCase>(pattern.c_str(), name.c_str()));
 }
 
-FuzzTarget const TARGET("wildcard", run);
+FuzzTarget const WILDCARD("wildcard", runWildcard);
 
 } // namespace
