@@ -31,16 +31,15 @@ function(zb_room target)
     file(RELATIVE_PATH name ${PROJECT_SOURCE_DIR} ${CMAKE_CURRENT_SOURCE_DIR})
     string(MAKE_C_IDENTIFIER ${name} name)
     get_target_property(folder ${target} SOURCE_DIR)
-    zb_joined(${name} FOLDERS ${folder} FILES ${files})
+    zb_joined(${name} MOST 8 FOLDERS ${folder} FILES ${files})
     set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
   endif()
 endfunction()
 
-# zb_joined(<name> FOLDERS <folders> FILES <files>): has targets of the given folders that join files compile these
-# files together, some at a time. Those that include the system's headers keep to themselves.
+# zb_joined(<name> MOST <n> FOLDERS <folders> FILES <files>): has targets of the given folders that join files compile
+# these files together, at most n at a time. Those that include the system's headers keep to themselves.
 function(zb_joined name)
-  cmake_parse_arguments(ARG "" "" "FOLDERS;FILES" ${ARGN})
-  set(most 8)
+  cmake_parse_arguments(ARG "" "MOST" "FOLDERS;FILES" ${ARGN})
   set(portable ${ARG_FILES})
   set(system ${ARG_FILES})
   list(FILTER portable EXCLUDE REGEX "_(posix|win)[._]")
@@ -48,7 +47,7 @@ function(zb_joined name)
   foreach(kind IN ITEMS portable system)
     set(count 0)
     foreach(file IN LISTS ${kind})
-      math(EXPR group "${count} / ${most}")
+      math(EXPR group "${count} / ${ARG_MOST}")
       math(EXPR count "${count} + 1")
       set_source_files_properties(${file} DIRECTORY ${ARG_FOLDERS} PROPERTIES UNITY_GROUP ${name}_${kind}_${group})
     endforeach()
@@ -96,7 +95,7 @@ endfunction()
 function(zb_joined_tests name)
   list(FILTER ARGN EXCLUDE REGEX "_win_test")
   list(TRANSFORM ARGN PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
-  zb_joined(${name} FOLDERS ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests FILES ${ARGN})
+  zb_joined(${name} MOST 16 FOLDERS ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests FILES ${ARGN})
 endfunction()
 
 # zb_quickly_compiled(<target>): optimises nothing, and in release builds describes only lines to the debugger. Tests

@@ -73,6 +73,9 @@ private:
     HANDLE handle_;
 };
 
+/// Wine gives up a process that does not come up within seconds, as may happen on a busy machine.
+constexpr int ATTEMPTS_TO_START = 3;
+
 /// Starts a process that writes to the end of a pipe.
 bool start(Child const& child, HANDLE output, PROCESS_INFORMATION& process) {
     std::string const program = programBeside(child.program);
@@ -87,8 +90,15 @@ bool start(Child const& child, HANDLE output, PROCESS_INFORMATION& process) {
     startup.hStdInput = input.get();
     startup.hStdOutput = output;
     startup.hStdError = errors.get();
-    return CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(),
-                          child.folder.empty() ? nullptr : child.folder.c_str(), &startup, &process) != 0;
+    char const* const folder = child.folder.empty() ? nullptr : child.folder.c_str();
+    for (int attempt = 1; attempt <= ATTEMPTS_TO_START; ++attempt) {
+        if (CreateProcessA(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, environment.data(), folder,
+                           &startup, &process) != 0) {
+            return true;
+        }
+        if (GetLastError() != ERROR_INTERNAL_ERROR) return false;
+    }
+    return false;
 }
 
 } // namespace

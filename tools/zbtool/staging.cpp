@@ -14,7 +14,7 @@ namespace zbtool {
 namespace {
 
 std::mutex mutex;
-std::set<std::string> folders;
+std::set<std::string> openFolders;
 
 /// A folder for one file.
 class StagingFolder {
@@ -24,12 +24,12 @@ public:
         path_ = (std::filesystem::path(target.c_str()).parent_path() / name).generic_string();
         std::lock_guard const lock(mutex);
         made_ = Dir::New(path_, WITHOUT_PARENTS);
-        if (made_) folders.insert(path_.c_str());
+        if (made_) openFolders.insert(path_.c_str());
     }
     ~StagingFolder() {
         std::lock_guard const lock(mutex);
         if (made_) Dir::Rem(path_, WITH_CONTENTS, WITHOUT_SECOND_FLAG);
-        folders.erase(path_.c_str());
+        openFolders.erase(path_.c_str());
     }
     StagingFolder(StagingFolder const&) = delete;
     StagingFolder& operator=(StagingFolder const&) = delete;
@@ -69,7 +69,7 @@ bool copyStaged(FPath const& target, FPath const& source, bool overwrite, std::s
 
 void clearStaging() {
     mutex.lock(); // and never unlocked, as the program ends next
-    for (std::string const& folder : folders) Dir::Rem(folder.c_str(), WITH_CONTENTS, WITHOUT_SECOND_FLAG);
+    for (std::string const& folder : openFolders) Dir::Rem(folder.c_str(), WITH_CONTENTS, WITHOUT_SECOND_FLAG);
 }
 
 } // namespace zbtool

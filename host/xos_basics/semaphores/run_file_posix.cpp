@@ -24,10 +24,11 @@ bool isPrivateFolder(char const* path) {
 int openRunFile(std::span<char const* const> parents, std::string const& name) {
     std::string const folder = "/xos-" + std::to_string(geteuid());
     for (char const* parent : parents) {
-        std::string const path = parent + folder;
+        std::string path = parent + folder;
         bool const exists = mkdir(path.c_str(), 0700) == 0 || errno == EEXIST;
         if (!exists || !isPrivateFolder(path.c_str())) continue;
-        int const file = open((path + "/" + name).c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
+        path.append("/").append(name);
+        int const file = open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600);
         // A file system that cannot be written is so for all processes. What fails for one alone, for want of
         // descriptors perhaps, must not lead it to another place than the others.
         if (file >= 0 || errno != EROFS) return file;
