@@ -148,7 +148,8 @@ void addTimers(CLI::App& app, int& result) {
         .flag("--reverse", &TimersOptions::reverse, "Numbers from the smallest, names from the last")
         .flag("--json", &TimersOptions::json, "As a JSON array")
         .flag("--csv", &TimersOptions::csv, "As comma-separated values")
-        .option("--html", &TimersOptions::html, "Write a page to this file instead, and print its path");
+        .option("--html", &TimersOptions::html, "Write a page to this file instead, and print its path")
+        .flag("--overwrite", &TimersOptions::overwrite, "Replace an existing page; otherwise it is an error");
 }
 
 void addLog(CLI::App& app, int& result) {
