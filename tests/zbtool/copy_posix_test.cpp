@@ -174,6 +174,15 @@ TEST(CopyPosix, goes_to_another_file_system_by_move) {
     EXPECT_EQ(tool.run({"move", "job", other / "job"}).code, 0);
     EXPECT_EQ(textOf(other / "job/below/file"), "text");
     EXPECT_FALSE(exists(tool / "job"));
+
+    // Nor does a move fill up a folder there.
+    makeFolder(tool / "job");
+    put(tool / "job/new", "text");
+    makeFolder(other / "job/job");
+    put(other / "job/job/older", "text");
+    EXPECT_EQ(tool.run({"move", "--overwrite", "job", other / "job"}).code, 1);
+    EXPECT_TRUE(exists(tool / "job/new"));
+    EXPECT_EQ(other.content("job/job"), Names{"older"});
 }
 
 TEST(CopyPosix, keeps_the_source_of_a_move_that_cannot_be_copied) {

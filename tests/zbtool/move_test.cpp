@@ -31,9 +31,46 @@ TEST(Move, keeps_both_when_the_target_exists) {
     EXPECT_TRUE(exists(tool / "spool/folder/x"));
 
     EXPECT_EQ(tool.run({"move", "--overwrite", "file", "other"}).code, 0);
-    EXPECT_EQ(tool.run({"move", "--overwrite", "folder", "spool"}).code, 0);
-    EXPECT_EQ(tool.content(), (Names{"other", "spool/", "spool/folder/", "spool/folder/y/"}));
     EXPECT_EQ(textOf(tool / "other"), "text");
+}
+
+TEST(Move, puts_a_folder_only_in_the_place_of_an_empty_one) {
+    Tool tool;
+    makeFolder(tool / "folder/y");
+    makeFolder(tool / "spool/folder/x");
+    Names const before = tool.content();
+    ToolResult const refused = tool.run({"move", "--overwrite", "folder", "spool"});
+    EXPECT_EQ(refused.code, 1);
+    EXPECT_EQ(refused.errors, "zbtool: cannot move 'folder' to 'spool/folder': Directory not empty\n");
+    EXPECT_EQ(tool.content(), before);
+    // The place of the source's own parent is none either.
+    makeFolder(tool / "deep/deep");
+    EXPECT_EQ(tool.run({"move", "--overwrite", "deep/deep", "."}).code, 1);
+    EXPECT_TRUE(exists(tool / "deep/deep"));
+
+    std::filesystem::remove(tool / "spool/folder/x");
+    EXPECT_EQ(tool.run({"move", "--overwrite", "folder", "spool"}).code, 0);
+    EXPECT_EQ(tool.content("spool"), (Names{"folder/", "folder/y/"}));
+}
+
+TEST(Move, refuses_two_sources_of_one_name) {
+    Tool tool;
+    makeFolder(tool / "spool");
+    makeFolder(tool / "1");
+    makeFolder(tool / "2");
+    put(tool / "1/file", "one");
+    put(tool / "2/file", "two");
+    put(tool / "other", "text");
+    Names const before = tool.content();
+    for (char const* command : {"move", "copy"}) {
+        SCOPED_TRACE(command);
+        ToolResult const refused = tool.run({command, "--overwrite", "other", "1/file", "2/../2/file/", "spool"});
+        EXPECT_EQ(refused.code, 2);
+        EXPECT_EQ(refused.output, "");
+        EXPECT_TRUE(isOneLineAbout(refused.errors, "1/file"));
+        EXPECT_TRUE(isOneLineAbout(refused.errors, "2/../2/file"));
+        EXPECT_EQ(tool.content(), before);
+    }
 }
 
 TEST(Move, tells_what_is_missing) {

@@ -2,9 +2,11 @@
 
 #include <gtest/gtest.h>
 
+#include <csignal>
 #include <fcntl.h>
 #include <pty.h>
 #include <sys/wait.h>
+#include <termios.h>
 #include <unistd.h>
 
 namespace {
@@ -69,6 +71,39 @@ TEST(ProgressPosix, deleting_asks_on_a_terminal_and_tells_how_much) {
     ToolResult const gone = runOnTerminal(tool.path(), {"delete", "job"}, "y\n");
     EXPECT_EQ(gone.code, 0);
     EXPECT_EQ(tool.content(), Names{});
+}
+
+bool showsInput(int terminal) {
+    termios settings{};
+    return ::tcgetattr(terminal, &settings) == 0 && (settings.c_lflag & ECHO) != 0;
+}
+
+TEST(ProgressPosix, an_interrupted_question_for_a_secret_leaves_a_terminal_that_shows_input) {
+    Tool tool;
+    put(tool / "plain", "text");
+    for (int const signal : {SIGINT, SIGQUIT, SIGTERM, SIGHUP}) {
+        SCOPED_TRACE(signal);
+        int terminal = -1;
+        pid_t const process = ::forkpty(&terminal, nullptr, nullptr, nullptr);
+        if (process == 0) {
+            std::string const program = programBeside("zbtool");
+            if (::chdir(tool.path().c_str()) == 0)
+                ::execl(program.c_str(), "zbtool", "crypt", "encrypt", "plain", "hidden", nullptr);
+            ::_exit(127);
+        }
+        for (int i = 0; i < 10'000 && showsInput(terminal); ++i) ::usleep(1'000);
+        EXPECT_FALSE(showsInput(terminal));
+        if (signal == SIGINT)
+            EXPECT_EQ(::write(terminal, "\x03", 1), 1);
+        else
+            ::kill(process, signal);
+        int status = 0;
+        EXPECT_EQ(::waitpid(process, &status, 0), process);
+        EXPECT_TRUE(WIFSIGNALED(status) && WTERMSIG(status) == signal);
+        EXPECT_TRUE(showsInput(terminal));
+        ::close(terminal);
+    }
+    EXPECT_FALSE(exists(tool / "hidden"));
 }
 
 } // namespace

@@ -78,4 +78,15 @@ TEST(RemovePosix, tells_that_the_output_is_full) {
     EXPECT_EQ(end.errors, "zbtool: standard output: No space left on device\n");
 }
 
+TEST(RemovePosix, refuses_the_folder_above) {
+    Tool tool;
+    makeFolder(tool / "folder/below");
+    put(tool / "folder/file", "text");
+    auto const end =
+        PreparedChild({ZBTOOL, "delete", "--yes", ".."}, tool / "folder/below", [] { return true; }).wait();
+    EXPECT_EQ(end.code, 1);
+    EXPECT_TRUE(isOneLineAbout(end.errors, ".."));
+    EXPECT_EQ(tool.content(), (Names{"folder/", "folder/below/", "folder/file"}));
+}
+
 } // namespace

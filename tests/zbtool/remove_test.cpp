@@ -41,4 +41,21 @@ TEST(Remove, spares_the_root_of_a_file_system) {
     EXPECT_TRUE(exists(tool.path()));
 }
 
+TEST(Remove, refuses_a_folder_that_has_no_name_and_removes_nothing) {
+    Tool tool;
+    makeFolder(tool / "folder/below");
+    put(tool / "folder/file", "text");
+    Names const before = tool.content();
+    for (std::string const path : {".", "./", "folder/.", "folder/./", "folder/below/..", "folder/below/..//"}) {
+        SCOPED_TRACE(path);
+        ToolResult const result = tool.run({"delete", "--yes", "folder/file", path});
+        EXPECT_EQ(result.code, 1);
+        EXPECT_EQ(result.output, "");
+        EXPECT_TRUE(isOneLineAbout(result.errors, path.substr(0, path.find_last_not_of('/') + 1)));
+        EXPECT_EQ(tool.content(), before);
+    }
+    put(tool / "folder/...x..", "text");
+    EXPECT_EQ(tool.run({"delete", "--yes", "folder/...x.."}).code, 0);
+}
+
 } // namespace

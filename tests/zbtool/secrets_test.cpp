@@ -37,9 +37,34 @@ TEST(Secrets, spare_existing_files_unless_told_to_overwrite) {
     EXPECT_EQ(refused.code, 1);
     EXPECT_TRUE(isOneLineAbout(refused.errors, "hidden"));
     EXPECT_EQ(textOf(tool / "hidden"), "older");
-    EXPECT_EQ(tool.run({"crypt", "encrypt", "plain", "plain", "--overwrite", "--secret-file", "secret"}).code, 0);
-    EXPECT_EQ(textOf(tool / "plain").size(), 8u);
+    EXPECT_EQ(tool.run({"crypt", "encrypt", "plain", "hidden", "--overwrite", "--secret-file", "secret"}).code, 0);
+    EXPECT_EQ(textOf(tool / "hidden").size(), 8u);
     EXPECT_EQ(tool.content(), (Names{"hidden", "plain", "secret"}));
+}
+
+TEST(Secrets, never_overwrite_what_they_read) {
+    Tool tool;
+    put(tool / "plain", "text");
+    put(tool / "secret", "secret");
+    struct Case {
+        char const* target;
+        char const* reason;
+    };
+    Case const cases[] = {{"secret", "is the secret's file"},
+                          {"./secret", "is the secret's file"},
+                          {"plain", "is the file to read"},
+                          {"./plain", "is the file to read"}};
+    for (char const* command : {"encrypt", "decrypt"}) {
+        for (Case const& c : cases) {
+            SCOPED_TRACE(std::string(command) + " " + c.target);
+            ToolResult const refused =
+                tool.run({"crypt", command, "plain", c.target, "--secret-file", "secret", "--overwrite"});
+            EXPECT_EQ(refused.code, 1);
+            EXPECT_EQ(refused.errors, std::string("zbtool: ") + c.target + ": " + c.reason + "\n");
+            EXPECT_EQ(textOf(tool / "plain"), "text");
+            EXPECT_EQ(textOf(tool / "secret"), "secret");
+        }
+    }
 }
 
 TEST(Secrets, tell_what_is_missing_or_wrong) {

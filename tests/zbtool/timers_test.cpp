@@ -84,4 +84,30 @@ TEST(Timers, tells_what_is_missing_or_wrong) {
     EXPECT_TRUE(isOneLineAbout(tool.run({"timers", "."}).errors, "."));
 }
 
+TEST(Timers, spare_existing_files_unless_told_to_overwrite) {
+    Tool tool;
+    makeReports(tool);
+    put(tool / "page.html", "older");
+    ToolResult const refused = tool.run({"timers", "--html", "page.html", "1.timer"});
+    EXPECT_EQ(refused.code, 1);
+    EXPECT_EQ(refused.errors, "zbtool: page.html: exists already\n");
+    EXPECT_EQ(textOf(tool / "page.html"), "older");
+    EXPECT_EQ(tool.run({"timers", "--html", "page.html", "--overwrite", "1.timer"}).code, 0);
+    EXPECT_NE(textOf(tool / "page.html").find("<table"), std::string::npos);
+}
+
+TEST(Timers, never_write_the_page_over_a_report) {
+    Tool tool;
+    makeReports(tool);
+    std::string const report = textOf(tool / "2.timer");
+    makeFolder(tool / "below");
+    for (std::string const page : {"2.timer", "./2.timer", "below/../2.timer"}) {
+        SCOPED_TRACE(page);
+        ToolResult const refused = tool.run({"timers", "1.timer", "2.timer", "--overwrite", "--html", page});
+        EXPECT_EQ(refused.code, 1);
+        EXPECT_EQ(refused.errors, "zbtool: " + page + ": is one of the reports\n");
+        EXPECT_TRUE(textOf(tool / "2.timer") == report);
+    }
+}
+
 } // namespace

@@ -86,7 +86,8 @@ void addTransfers(CLI::App& app, int& result) {
     Command<CopyOptions>(app, result, "move", "Moves files, links and whole folders.", move)
         .several("SOURCE... TARGET", &CopyOptions::paths, 2,
                  "What to move, and behind it a folder to move into or the new path")
-        .flag("--overwrite", &CopyOptions::overwrite, "Replace what exists; otherwise it is an error");
+        .flag("--overwrite", &CopyOptions::overwrite,
+              "Replace existing files and empty folders; otherwise they are an error");
     Command<RemoveOptions>(app, result, "delete", "Deletes files, links and whole folders.", remove)
         .several("PATH", &RemoveOptions::paths, 1, "What to delete")
         .flag("--yes", &RemoveOptions::yes, "Do not ask; required where there is no terminal to ask on");
@@ -147,7 +148,8 @@ void addTimers(CLI::App& app, int& result) {
         .flag("--reverse", &TimersOptions::reverse, "Numbers from the smallest, names from the last")
         .flag("--json", &TimersOptions::json, "As a JSON array")
         .flag("--csv", &TimersOptions::csv, "As comma-separated values")
-        .option("--html", &TimersOptions::html, "Write a page to this file instead, and print its path");
+        .option("--html", &TimersOptions::html, "Write a page to this file instead, and print its path")
+        .flag("--overwrite", &TimersOptions::overwrite, "Replace an existing page; otherwise it is an error");
 }
 
 void addLog(CLI::App& app, int& result) {

@@ -11,6 +11,7 @@
 #include <atomic>
 #include <cstdio>
 #include <filesystem>
+#include <map>
 #include <span>
 
 using namespace ZOR_Basis;
@@ -164,6 +165,15 @@ std::string nameOf(std::string const& path) {
 
 } // namespace
 
+bool haveDistinctNames(std::span<std::string const> sources) {
+    std::map<std::string, std::string> sourceOfName;
+    for (std::string const& source : sources) {
+        auto const [other, isNew] = sourceOfName.try_emplace(nameOf(source), source);
+        if (!isNew) return complain(other->second + ", " + source, "two sources of one name");
+    }
+    return true;
+}
+
 FPath destinationOf(std::string const& source, std::string const& target, bool isOnly) {
     FStat const status(source.c_str(), SYSTEM_ONLY);
     std::error_code error;
@@ -191,10 +201,11 @@ bool copyEntry(FPath const& source, FPath const& target, bool overwrite, Progres
 }
 
 int copy(CopyOptions const& options) {
+    std::span const sources(options.paths.begin(), options.paths.end() - 1);
+    if (!haveDistinctNames(sources)) return MISUSED;
     watchForInterruption(clearStaging);
     Progress progress("copying");
     Tally total;
-    std::span const sources(options.paths.begin(), options.paths.end() - 1);
     for (std::string const& source : sources) {
         if (Progress::isVisible() && !tallyTree(source, true, nullptr, total)) return FAILED;
     }

@@ -8,6 +8,7 @@
 
 #include <zor_basis/files.h>
 
+#include <span>
 #include <string>
 #include <vector>
 
@@ -29,6 +30,10 @@ bool copyEntry(ZOR_Basis::FPath const& source, ZOR_Basis::FPath const& target, b
 /// \return an empty path, with a complaint, if several sources have no folder to go into, or if a source is missing or
 ///     contains its destination
 ZOR_Basis::FPath destinationOf(std::string const& source, std::string const& target, bool isOnly);
+
+/// Whether no two sources have one name, as the second would replace the first in the folder that they go into.
+/// \return false, with a complaint that names both
+bool haveDistinctNames(std::span<std::string const> sources);
 
 } // namespace zbtool
 

@@ -45,6 +45,13 @@ bool isRoot(std::string const& path) {
     return !error && whole == whole.root_path();
 }
 
+/// Whether a path ends in a name. The system removes no folder that is called "." or "..", but all that is in it.
+bool endsInName(std::string const& path) {
+    fs::path whole = path;
+    while (!whole.has_filename() && whole.has_relative_path()) whole = whole.parent_path();
+    return (whole.filename() != "." && whole.filename() != "..") || complain(path, "not deleted without its own name");
+}
+
 bool isConfirmed(std::string const& path, bool yes, Tally& tally) {
     if (Progress::isVisible()) tallyTree(path, true, nullptr, tally);
     if (yes) return true;
@@ -84,6 +91,8 @@ int remove(RemoveOptions const& options) {
         return MISUSED;
     }
     bool good = true;
+    for (std::string const& path : options.paths) good &= endsInName(path);
+    if (!good) return FAILED;
     for (std::string const& path : options.paths) good &= removePath(path, options.yes);
     return exitCodeOf(good);
 }

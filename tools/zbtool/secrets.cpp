@@ -51,6 +51,13 @@ std::unique_ptr<CrKey> keyOf(SecretBlob const& secret) {
     return std::unique_ptr<CrKey>(crypt->deriveKey(hash));
 }
 
+/// Complains if the target is a file that is still needed, or any other file without being told to replace it.
+bool mayWriteTarget(CryptOptions const& options) {
+    if (!options.overwrite) return !FStat::exist(options.target.c_str()) || complain(options.target, "exists already");
+    if (isSameFile(options.secretFile, options.target)) return complain(options.target, "is the secret's file");
+    return !isSameFile(options.source, options.target) || complain(options.target, "is the file to read");
+}
+
 /// Reads the source, changes its bytes by a key of the secret, and writes the target.
 template <class Change>
 int transform(CryptOptions const& options, bool isEncrypting, Change change) {
@@ -61,8 +68,7 @@ int transform(CryptOptions const& options, bool isEncrypting, Change change) {
     SecretBlob secret;
     SecretBlob bytes;
     std::string reason;
-    if (!options.overwrite && FStat::exist(options.target.c_str()))
-        return exitCodeOf(complain(options.target, "exists already"));
+    if (!mayWriteTarget(options)) return FAILED;
     if (!readWhole(options.source, bytes, reason)) return exitCodeOf(complain(options.source, reason));
     if (!readSecret(options, isEncrypting, secret)) return FAILED;
     std::unique_ptr<CrKey> const key = keyOf(secret);

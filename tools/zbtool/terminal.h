@@ -12,7 +12,8 @@ bool inputIsTerminal();
 bool outputIsTerminal();
 bool errorsAreTerminal();
 
-/// Reads a line from the terminal without showing it.
+/// Reads a line from the terminal without showing it. If a signal, on Windows Ctrl-C, ends the program meanwhile, the
+/// terminal shows input again.
 /// \param prompt  is printed on standard error
 /// \return whether there was a line
 bool readHidden(char const* prompt, std::string& line);

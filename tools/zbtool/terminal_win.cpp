@@ -9,6 +9,19 @@
 #include <windows.h>
 
 namespace zbtool {
+namespace {
+
+DWORD shownInput = 0;
+
+void show() { SetConsoleMode(GetStdHandle(STD_INPUT_HANDLE), shownInput); }
+
+/// The next handler, which is the system's, then ends the program.
+BOOL WINAPI showAndEnd(DWORD) {
+    show();
+    return FALSE;
+}
+
+} // namespace
 
 bool inputIsTerminal() { return _isatty(_fileno(stdin)) != 0; }
 bool outputIsTerminal() { return _isatty(_fileno(stdout)) != 0; }
@@ -17,11 +30,12 @@ bool errorsAreTerminal() { return _isatty(_fileno(stderr)) != 0; }
 bool readHidden(char const* prompt, std::string& line) {
     std::fputs(prompt, stderr);
     HANDLE const input = GetStdHandle(STD_INPUT_HANDLE);
-    DWORD shown = 0;
-    GetConsoleMode(input, &shown);
-    SetConsoleMode(input, shown & ~static_cast<DWORD>(ENABLE_ECHO_INPUT));
+    GetConsoleMode(input, &shownInput);
+    SetConsoleCtrlHandler(showAndEnd, TRUE);
+    SetConsoleMode(input, shownInput & ~static_cast<DWORD>(ENABLE_ECHO_INPUT));
     bool const good = static_cast<bool>(std::getline(std::cin, line));
-    SetConsoleMode(input, shown);
+    show();
+    SetConsoleCtrlHandler(showAndEnd, FALSE);
     std::fputc('\n', stderr);
     return good;
 }

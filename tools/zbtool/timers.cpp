@@ -6,8 +6,13 @@
 #include "tools/zbtool/timer_report.h"
 #include "tools/zbtool/whole_file.h"
 
+#include <zor_basis/files.h>
+
+#include <algorithm>
 #include <cstdio>
 #include <ctime>
+
+using namespace ZOR_Basis;
 
 namespace zbtool {
 namespace {
@@ -97,6 +102,14 @@ bool readReports(std::vector<std::string> const& paths, std::vector<TimerReport>
     return true;
 }
 
+/// Complains if the page would replace a report, or any other file without being told to.
+bool mayWritePage(TimersOptions const& options) {
+    auto const isPage = [&](std::string const& report) { return isSameFile(report, options.html); };
+    if (std::any_of(options.reports.begin(), options.reports.end(), isPage))
+        return complain(options.html, "is one of the reports");
+    return options.overwrite || !FStat::exist(options.html.c_str()) || complain(options.html, "exists already");
+}
+
 bool writePage(TimersOptions const& options, std::vector<TimerReport> const& reports, Table const& table,
                std::string const& sortedBy) {
     bool const isText = sortedBy == TIMER;
@@ -115,6 +128,7 @@ bool writePage(TimersOptions const& options, std::vector<TimerReport> const& rep
 } // namespace
 
 int timers(TimersOptions const& options) {
+    if (!options.html.empty() && !mayWritePage(options)) return FAILED;
     std::vector<TimerReport> reports;
     if (!readReports(options.reports, reports)) return FAILED;
     Table table = options.compare ? comparedTable(reports) : mergedTable(reports);

@@ -17,6 +17,7 @@ struct TimersOptions {
     bool json = false;
     bool csv = false;
     std::string html;
+    bool overwrite = false;
 };
 
 /// Prints timer reports as one table, or writes it as a page.

@@ -6,6 +6,7 @@
 
 #include <zor_basis/files.h>
 
+#include <filesystem>
 #include <iostream>
 #include <iterator>
 #include <vector>
@@ -53,6 +54,11 @@ bool readWhole(std::string const& path, std::string& text, std::string& reason) 
 bool readWhole(std::string const& path, Blob& bytes, std::string& reason) {
     bytes.alloc(FStat::size(path.c_str()), false);
     return readPieces(path, reason, [&](char const* piece, std::uint64_t size) { bytes.add(size, piece); });
+}
+
+bool isSameFile(std::string const& path, std::string const& other) {
+    std::error_code error;
+    return std::filesystem::equivalent(path, other, error);
 }
 
 bool writeWhole(std::string const& path, std::string const& text, std::string& reason) {

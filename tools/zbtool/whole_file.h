@@ -16,6 +16,9 @@ bool readWhole(std::string const& path, std::string& text, std::string& reason);
 /// The same into a blob, which can wipe its bytes.
 bool readWhole(std::string const& path, ZOR_Basis::Blob& bytes, std::string& reason);
 
+/// Whether two paths lead to one existing file, however they are written.
+bool isSameFile(std::string const& path, std::string const& other);
+
 /// Replaces a file: afterwards it is the new one, or the old one if that fails.
 bool writeWhole(std::string const& path, std::string const& text, std::string& reason);
 bool writeWhole(std::string const& path, ZOR_Basis::Blob const& bytes, std::string& reason);
