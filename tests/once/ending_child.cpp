@@ -18,20 +18,21 @@
 #include <cstdlib>
 #include <string>
 #include <thread>
+#include <vector>
 
 using namespace ZOR_Basis;
 
 namespace {
 
-/// Never destroyed, because threads that are not joined use it.
+/// Never destroyed: it owns threads that may not be joined, and they use it.
 struct Tools {
     Log log{"ending"};
     TimerMgr* timers = TimerMgr::New("ending", 4);
+    std::vector<std::thread> threads;
 };
 Tools* tools = nullptr;
 constexpr int THREADS = 3;
 std::atomic<bool> mustEnd{false};
-std::atomic<int> ended{0};
 bool threadsEnd = false;
 
 void useAll(std::uint64_t timer) {
@@ -50,14 +51,18 @@ void useAll(std::uint64_t timer) {
     TimerMgr::stop(tools->timers, timer);
 }
 
+void endThreads() {
+    mustEnd = true;
+    for (std::thread& thread : tools->threads) thread.join();
+}
+
 /// In the destructor of a static object.
 struct LastUser {
     ~LastUser() {
         if (tools == nullptr) return;
         auto const end = std::chrono::steady_clock::now() + std::chrono::milliseconds(100);
         while (std::chrono::steady_clock::now() < end) useAll(4);
-        mustEnd = threadsEnd;
-        while (mustEnd && ended != THREADS) std::this_thread::yield();
+        if (threadsEnd) endThreads();
         std::puts("used to the end");
         std::fflush(stdout);
     }
@@ -68,10 +73,9 @@ void useInThreads() {
     tools->timers->setActive(true);
     for (std::uint64_t timer : {1, 2, 3, 4}) TimerMgr::create(tools->timers, "stage", timer, true);
     for (std::uint64_t timer = 1; timer <= THREADS; ++timer) {
-        std::thread([timer] {
+        tools->threads.emplace_back([timer] {
             while (!mustEnd) useAll(timer);
-            ++ended;
-        }).detach();
+        });
     }
     std::this_thread::sleep_for(std::chrono::milliseconds(50));
 }

@@ -15,7 +15,8 @@ inline void expectUseToTheEnd(char const* how) {
     ChildResult const result = run({"ending_child", {how}, {{"XOS_ROOT", root.path()}}, root.path()});
     EXPECT_EQ(result.exitCode, 0);
     EXPECT_EQ(result.output, "used to the end\n");
-    EXPECT_NE(textOf(root / "tmp/zb_log/ending/0.log").find("line of 4"), std::string::npos);
+    std::string const lines = textOf(root / "tmp/zb_log/ending/0.log");
+    EXPECT_NE(lines.find("line of 4"), std::string::npos) << lines;
 }
 
 #endif
