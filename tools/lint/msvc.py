@@ -4,7 +4,7 @@
 1. Words and headers that MSVC does not know, in the lines that its preprocessor would leave.
 2. Each public header alone and twice, as a program sees it; all of them as the library and a static build see them.
 3. Each source for Windows down to its object: only then all members of exported classes are compiled, and clang asks
-   whether a function may use its vector instructions.
+   whether a function may use its vector instructions. Those that the build compiles together are so here.
 4. Virtual functions in the same slots as with the other compilers, and no warnings (C4251, C4275) for users.
 
 It cannot see MSVC's own warnings and errors, the headers of Microsoft's SDK, linking, or anything at run time. What was
@@ -13,6 +13,7 @@ clean is not compiled again until a file of the project that it includes changes
 
 import functools
 import hashlib
+import json
 import re
 import sys
 import tempfile
@@ -138,6 +139,21 @@ def is_valid_c(name):
     return "Valid C" in common.text(path)[:1500]
 
 
+def joined():
+    """The sources that the build for Windows compiles together, as lists."""
+    commands = common.ROOT / "build/windows/compile_commands.json"
+    files = [entry["file"] for entry in json.loads(commands.read_text())] if commands.exists() else []
+    own = {f"{common.ROOT / source}": source for source in SOURCES}
+    for file in sorted(file for file in files if "/Unity/" in file):
+        included = re.findall(r'^#include "(.+)"$', common.text(file), re.M)
+        if all(source in own for source in included):
+            yield [own[source] for source in included]
+
+
+def mode(source):
+    return "-DZB_BUILDING" if source.startswith("basis/") else "-DXOS_BUILDING"
+
+
 def jobs():
     once = ["-fsyntax-only"]
     objects = ["-c", "-o", "/dev/null"]
@@ -146,12 +162,15 @@ def jobs():
         yield Job(name, *once, text=twice)
         if is_valid_c(name):
             yield Job(name, *once, text=twice + "typedef int zb_not_an_empty_file;\n", language="c")
-    for mode in ("-DZB_BUILDING", "-DZB_STATIC"):
-        yield Job("all headers", mode, *objects, text=including(*PUBLIC))
+    for way in ("-DZB_BUILDING", "-DZB_STATIC"):
+        yield Job("all headers", way, *objects, text=including(*PUBLIC))
     for name in EXAMPLES:
         yield Job(name, *objects)
-    for name in SOURCES:
-        yield Job(name, "-DZB_BUILDING" if name.startswith("basis/") else "-DXOS_BUILDING", *objects)
+    together = {group[0]: group for group in joined()}
+    for group in together.values():
+        yield Job(f"{group[0]} and others", mode(group[0]), *objects, text=including(*group))
+    for name in sorted(set(SOURCES).difference(*together.values())):
+        yield Job(name, mode(name), *objects)
 
 
 def surroundings():
