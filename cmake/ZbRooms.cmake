@@ -99,18 +99,23 @@ function(zb_joined_tests name)
 endfunction()
 
 # zb_quickly_compiled(<target>): optimises nothing, and in release builds describes only lines to the debugger. Tests
-# take longer to compile than to run; what they test is optimised and described in full.
+# take longer to compile than to run; what they test is optimised, described and sanitized in full.
 function(zb_quickly_compiled target)
   if(NOT MSVC)
     target_compile_options(${target} PRIVATE -O0 $<$<CONFIG:Release>:-g1>)
   endif()
+  if(ZB_SANITIZE MATCHES "undefined")
+    target_compile_options(${target} PRIVATE -fno-sanitize=undefined)
+  endif()
 endfunction()
 
 # zb_quickly_linked(<target>): links a program that is only tested with lld, if there is one. The linker of mingw-w64
-# needs half a minute for the largest.
+# needs half a minute for the largest, the ordinary one several seconds for what is sanitized.
 function(zb_quickly_linked target)
   if(MINGW AND ZB_QUICK_LINKER)
     set_target_properties(${target} PROPERTIES RULE_LAUNCH_LINK ${PROJECT_SOURCE_DIR}/cmake/windows/link-quickly)
+  elseif(ZB_SANITIZE AND ZB_QUICK_LINKER)
+    target_link_options(${target} PRIVATE -fuse-ld=lld)
   endif()
 endfunction()
 
@@ -135,6 +140,9 @@ function(zb_test_program target)
   endif()
   if(WIN32)
     set_tests_properties(${target} PROPERTIES FIXTURES_REQUIRED wine)
+  endif()
+  if(ZB_SANITIZE) # with which random tests take about ten times as long
+    set_tests_properties(${target} PROPERTIES ENVIRONMENT ZB_TEST_STEPS_PERCENT=20)
   endif()
   get_target_property(libraries ${target} LINK_LIBRARIES)
   if("zb_test_support" IN_LIST libraries)

@@ -1,9 +1,10 @@
 /// \file
-/// Length and seed of random tests. `ZB_TEST_STEPS_FACTOR` multiplies every length, `ZB_TEST_SEED` replaces the seed.
+/// Length and seed of random tests. `ZB_TEST_STEPS_PERCENT` changes every length, `ZB_TEST_SEED` replaces the seed.
 
 #ifndef TESTS_SUPPORT_RANDOM_STEPS_H
 #define TESTS_SUPPORT_RANDOM_STEPS_H
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdlib>
 #include <random>
@@ -14,7 +15,7 @@ inline std::uint64_t numberFromEnvironment(char const* name, std::uint64_t fallb
 }
 
 inline std::uint64_t randomSteps(std::uint64_t ordinary) {
-    return ordinary * numberFromEnvironment("ZB_TEST_STEPS_FACTOR", 1);
+    return std::max<std::uint64_t>(ordinary * numberFromEnvironment("ZB_TEST_STEPS_PERCENT", 100) / 100, 1);
 }
 
 inline std::mt19937_64 randomSource() { return std::mt19937_64{numberFromEnvironment("ZB_TEST_SEED", 20'211)}; }
