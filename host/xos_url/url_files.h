@@ -1,5 +1,6 @@
 /// \file
-/// The files that a fetch reads and writes. Twins: url_files_posix.cpp, url_files_win.cpp.
+/// The files that a fetch reads and writes. Twins: url_files_posix.cpp, url_files_win.cpp; what both do in the same way
+/// is in url_files.cpp.
 
 #ifndef HOST_XOS_URL_URL_FILES_H
 #define HOST_XOS_URL_URL_FILES_H
@@ -24,6 +25,19 @@ std::FILE* createNewFile(std::string const& path);
 /// Opens a regular file for reading.
 /// \return null for anything else
 std::FILE* openRegularFile(std::string const& path);
+
+/// The descriptor of a file that was not there.
+/// \return -1 when there is one, or it cannot be made
+int newDescriptor(std::string const& path);
+
+/// The descriptor of a regular file, for reading.
+/// \return -1 for anything else
+int regularDescriptor(std::string const& path);
+
+/// \return null without memory; the descriptor is then still open
+std::FILE* descriptorStream(int descriptor, char const* mode);
+
+void closeDescriptor(int descriptor);
 
 /// Puts a file in the place of another in one step. A directory is not replaced.
 bool replaceFile(std::string const& from, std::string const& to);

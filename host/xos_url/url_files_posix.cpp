@@ -12,20 +12,11 @@ namespace host {
 
 namespace {
 
-bool isRegular(int file) {
+bool isRegular(int descriptor) {
     struct stat status {};
-    if (fstat(file, &status) != 0) return false;
+    if (fstat(descriptor, &status) != 0) return false;
     if (S_ISDIR(status.st_mode)) return failFor(Reason::DIRECTORY);
     return S_ISREG(status.st_mode) || failFor(Reason::BAD_ARGUMENT);
-}
-
-/// Closes a file that cannot become a stream, because memory is short.
-std::FILE* streamOf(int file, char const* mode) {
-    std::FILE* const stream = fdopen(file, mode);
-    if (stream != nullptr) return stream;
-    KeepReason const keep;
-    close(file);
-    return nullptr;
 }
 
 } // namespace
@@ -37,24 +28,20 @@ std::string systemPath(std::string path) {
 
 std::string pathOfFileUrl(FileUrl const& url) { return url.host.empty() ? url.path : std::string{}; }
 
-std::FILE* createNewFile(std::string const& path) {
-    int const file = open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-    if (file < 0) return nullptr;
-    std::FILE* const stream = streamOf(file, "wb");
-    if (stream != nullptr) return stream;
+int newDescriptor(std::string const& path) { return open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666); }
+
+int regularDescriptor(std::string const& path) {
+    // Without waiting for a writer, should the name be a pipe's.
+    int const descriptor = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+    if (descriptor < 0 || isRegular(descriptor)) return descriptor;
     KeepReason const keep;
-    removeFile(path);
-    return nullptr;
+    close(descriptor);
+    return -1;
 }
 
-std::FILE* openRegularFile(std::string const& path) {
-    // Without waiting for a writer, should the name be a pipe's.
-    int const file = open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (file < 0 || isRegular(file)) return file < 0 ? nullptr : streamOf(file, "rb");
-    KeepReason const keep;
-    close(file);
-    return nullptr;
-}
+std::FILE* descriptorStream(int descriptor, char const* mode) { return fdopen(descriptor, mode); }
+
+void closeDescriptor(int descriptor) { close(descriptor); }
 
 bool replaceFile(std::string const& from, std::string const& to) { return rename(from.c_str(), to.c_str()) == 0; }
 

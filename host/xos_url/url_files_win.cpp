@@ -1,7 +1,6 @@
 // The sibling is url_files_posix.cpp.
 
 #include "host/windows_api.h"
-#include "host/xos_url/reason.h"
 #include "host/xos_url/url_files.h"
 
 #include <algorithm>
@@ -27,35 +26,18 @@ std::string pathOfFileUrl(FileUrl const& url) {
     return systemPath(path);
 }
 
-namespace {
-
-/// Closes a file that cannot become a stream, because memory is short.
-std::FILE* streamOf(int file, char const* mode) {
-    std::FILE* const stream = _fdopen(file, mode);
-    if (stream != nullptr) return stream;
-    KeepReason const keep;
-    _close(file);
-    return nullptr;
+int newDescriptor(std::string const& path) {
+    return _open(path.c_str(), _O_WRONLY | _O_CREAT | _O_EXCL | _O_BINARY | _O_NOINHERIT, _S_IREAD | _S_IWRITE);
 }
 
-} // namespace
-
-std::FILE* createNewFile(std::string const& path) {
-    int const file =
-        _open(path.c_str(), _O_WRONLY | _O_CREAT | _O_EXCL | _O_BINARY | _O_NOINHERIT, _S_IREAD | _S_IWRITE);
-    if (file < 0) return nullptr;
-    std::FILE* const stream = streamOf(file, "wb");
-    if (stream != nullptr) return stream;
-    KeepReason const keep;
-    removeFile(path);
-    return nullptr;
-}
-
-std::FILE* openRegularFile(std::string const& path) {
+int regularDescriptor(std::string const& path) {
     // A directory cannot be opened this way.
-    int const file = _open(path.c_str(), _O_RDONLY | _O_BINARY | _O_NOINHERIT);
-    return file < 0 ? nullptr : streamOf(file, "rb");
+    return _open(path.c_str(), _O_RDONLY | _O_BINARY | _O_NOINHERIT);
 }
+
+std::FILE* descriptorStream(int descriptor, char const* mode) { return _fdopen(descriptor, mode); }
+
+void closeDescriptor(int descriptor) { _close(descriptor); }
 
 bool replaceFile(std::string const& from, std::string const& to) {
     return MoveFileExA(from.c_str(), to.c_str(), MOVEFILE_REPLACE_EXISTING) != 0;

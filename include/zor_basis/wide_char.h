@@ -7,6 +7,8 @@
 #ifndef ZOR_BASIS_WIDE_CHAR_H
 #define ZOR_BASIS_WIDE_CHAR_H
 
+#include "zor_basis/export.h"
+
 namespace ZOR_Basis {
 
 /// A UTF-16 code unit, and a literal of them.

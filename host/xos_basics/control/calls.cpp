@@ -27,13 +27,13 @@ bool tryCopy(CallRecord const& record, Words& words) {
     return before % 2 == 0 && record.sequence.load(std::memory_order_relaxed) == before;
 }
 
-std::string argumentText(char kind, std::uint64_t word, std::string const& texts) {
+std::string argumentText(char kind, std::uint64_t word, CallTexts const& texts) {
     if (!isText(kind)) return numberText(kind, word);
-    return word == NULL_TEXT ? "null" : '"' + std::string(texts.c_str() + word) + '"';
+    return word == NULL_TEXT ? "null" : '"' + std::string(texts.text(word)) + '"';
 }
 
 std::string callText(std::string_view kinds, CallRecord& record) {
-    std::lock_guard const lock{record.textMutex};
+    std::lock_guard const lock{record.texts};
     Words words{};
     while (!tryCopy(record, words)) { std::this_thread::yield(); }
     std::string text;

@@ -2,7 +2,6 @@
 
 #include "host/xos_basics/thread_end.h"
 
-#include <cstring>
 #include <mutex>
 #include <new>
 
@@ -42,14 +41,6 @@ ThreadCalls* adoptThreadCalls() {
     if (thisThread.calls != nullptr) end.set(thisThread.calls);
     beginEra();
     return thisThread.calls;
-}
-
-void CallRecord::addText(std::size_t argument, char const* text) {
-    std::uint64_t const place = texts.size();
-    try {
-        if (text != nullptr) texts.append(text, std::strlen(text) + 1);
-        addWord(argument, text == nullptr ? NULL_TEXT : place);
-    } catch (std::bad_alloc const&) { addWord(argument, NULL_TEXT); }
 }
 
 } // namespace host

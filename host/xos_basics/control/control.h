@@ -4,12 +4,13 @@
 ///
 ///     return call(Function::xos_FileFlush, FAILED, [=] { return flush(handle); }, handle);
 ///
-/// Always on, correct from any thread, about a nanosecond. The arguments are given in the order and number of the
-/// function's kinds in functions.h. A `char const*` is a text, which is copied; any other pointer is an address.
+/// Always on, correct from any thread; takes about a nanosecond, and four for each text. The arguments are given in the
+/// order and number of the function's kinds in functions.h. A `char const*` is a text, which is copied; any other
+/// pointer is an address.
 ///
 /// A thread stores its calls in its own records. The sequence number of a record is odd while its words are written; a
 /// reader that finds it odd or changed starts again. Every store of a word releases and every load of it acquires, so a
-/// reader that sees anything of a later call also sees its sequence number. Only functions with texts lock the record.
+/// reader that sees anything of a later call also sees its sequence number. Texts have a lock, see call_texts.h.
 ///
 /// Which thread called a function last is a word that all threads share, written only when another thread calls. For
 /// quick functions even that would cost too much: each thread writes it once in each era. An era ends when a thread or
@@ -19,6 +20,7 @@
 #define HOST_XOS_BASICS_CONTROL_CONTROL_H
 
 #include "host/compiler.h"
+#include "host/xos_basics/control/call_texts.h"
 #include "host/xos_basics/control/faults.h"
 #include "host/xos_basics/control/functions.h"
 #include "host/xos_basics/control/trace.h"
@@ -36,12 +38,10 @@ namespace host {
 
 constexpr int NEVER_FAILS = 0;
 
-constexpr std::uint64_t NULL_TEXT = ~std::uint64_t{0};
-
 struct CallRecord {
     void addWord(std::size_t argument, std::uint64_t word) { words[argument].store(word, std::memory_order_release); }
     /// Copies the text. Without memory for it, it is noted as null.
-    void addText(std::size_t argument, char const* text);
+    void addText(std::size_t argument, char const* text) { addWord(argument, texts.add(text)); }
 
     /// Twice the number of calls, plus one while a call is being written.
     std::atomic<std::uint64_t> sequence;
@@ -51,9 +51,7 @@ struct CallRecord {
     std::uint64_t era;
     /// How many calls there were at the last reset. Guarded by the registry's mutex.
     std::uint64_t callsAtReset;
-    QuickMutex textMutex;
-    /// Each text with its zero.
-    std::string texts;
+    CallTexts texts;
 };
 
 /// Outlives its thread: the next new thread takes it over and counts on.
@@ -86,10 +84,7 @@ inline ThreadCalls* threadCalls() { return thisThread.calls != nullptr ? thisThr
 
 /// \return the sequence number for `endCall`
 HOST_INLINE std::uint64_t beginCall(Function function, CallRecord& record) {
-    if (factsOf(function).hasTexts) {
-        record.textMutex.lock();
-        record.texts.clear();
-    }
+    if (factsOf(function).hasTexts) record.texts.begin();
     std::uint64_t const begun = record.sequence.load(std::memory_order_relaxed) + 1;
     record.sequence.store(begun, std::memory_order_relaxed);
     return begun;
@@ -117,7 +112,7 @@ HOST_INLINE void noteArgument(CallRecord& record, std::size_t index, Argument co
 
 HOST_INLINE void endCall(Function function, CallRecord& record, ThreadCalls& mine, std::uint64_t begun) {
     record.sequence.store(begun + 1, std::memory_order_release);
-    if (factsOf(function).hasTexts) record.textMutex.unlock();
+    if (factsOf(function).hasTexts) record.texts.end();
     std::atomic<ThreadCalls*>& last = registry.lastCaller[indexOf(function)];
     bool const isQuick = (factsOf(function).traits & IS_QUICK) != 0;
     std::uint64_t const era = isQuick ? registry.era.load(std::memory_order_relaxed) : 0;

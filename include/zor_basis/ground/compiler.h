@@ -8,6 +8,8 @@
 #ifndef ZOR_BASIS_GROUND_COMPILER_H
 #define ZOR_BASIS_GROUND_COMPILER_H
 
+#include "zor_basis/export.h"
+
 /// 1 where a sanitizer checks the address of every byte that is read.
 #if defined(__SANITIZE_ADDRESS__)
 #define ZB_ADDRESS_SANITIZER 1

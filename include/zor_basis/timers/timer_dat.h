@@ -4,6 +4,8 @@
 #ifndef ZOR_BASIS_TIMERS_TIMER_DAT_H
 #define ZOR_BASIS_TIMERS_TIMER_DAT_H
 
+#include "zor_basis/export.h"
+
 #include <stdint.h>
 
 /// Times are readings of the performance counter, in ticks. If all are zero, no measurement is in progress; the end of

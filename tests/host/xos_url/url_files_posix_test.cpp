@@ -1,4 +1,4 @@
-// Streams that cannot be made, for Linux; the Windows build has the same steps.
+// Streams that cannot be made, for Linux; the steps are the same for Windows.
 
 #include "host/xos_url/target_file.h"
 #include "host/xos_url/url_files.h"
