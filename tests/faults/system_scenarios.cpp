@@ -1,3 +1,4 @@
+#include "tests/faults/programs.h"
 #include "tests/faults/scenario.h"
 
 #include <zor_basis/flat.h>
@@ -30,17 +31,19 @@ bool makesTemporaryFolders(Place const&) {
     return folder.status();
 }
 bool gets(Place const& place) {
-    return Url::Get((place / "got").c_str(), ("file://" + (place / "page")).c_str(), nullptr, nullptr, true, false);
+    std::string const page = place / "page";
+    std::string const url = "file://" + (page.front() == '/' ? page : "/" + page);
+    return Url::Get((place / "got").c_str(), url.c_str(), nullptr, nullptr, true, false);
 }
 bool runs(Place const& place) { return ZB_runCommand("exit 0", place.path.c_str(), false); }
 bool creates(Place const&) {
     unsigned long id = 0;
     int exitCode = -1;
-    return Process::Create("/bin/true", &id, "/bin/true", &exitCode) && exitCode == 0;
+    return Process::Create(SUCCEEDING.file, &id, SUCCEEDING.commandLine, &exitCode) && exitCode == 0;
 }
 bool createsAndWaits(Place const&) {
     unsigned long id = 0;
-    return Process::Create("/bin/true", &id, "/bin/true", nullptr) && Process::Wait(id);
+    return Process::Create(SUCCEEDING.file, &id, SUCCEEDING.commandLine, nullptr) && isAwaited(id);
 }
 bool knowsUsers(Place const&) {
     BufStr<15> user;
