@@ -36,6 +36,21 @@ function(zb_room target)
   endif()
 endfunction()
 
+# zb_precompiled(<target> [AS <target>]): has a target whose sources are compiled together also share the standard headers
+# that most of them include, compiled once, or those of a target with the same options.
+function(zb_precompiled target)
+  cmake_parse_arguments(ARG "" "AS" "" ${ARGN})
+  if(NOT ZB_JOINED)
+    return()
+  endif()
+  if(ARG_AS)
+    target_precompile_headers(${target} REUSE_FROM ${ARG_AS})
+  else()
+    target_precompile_headers(${target} PRIVATE <algorithm> <array> <atomic> <chrono> <cstdint> <cstdio> <cstdlib>
+      <cstring> <functional> <memory> <mutex> <new> <string> <string_view> <thread> <utility> <vector>)
+  endif()
+endfunction()
+
 # zb_joined(<name> MOST <n> FOLDERS <folders> FILES <files>): has targets of the given folders that join files compile
 # these files together, at most n at a time. Those that include the system's headers keep to themselves.
 function(zb_joined name)
