@@ -1,8 +1,11 @@
 #!/usr/bin/env python3
-"""Makes the test of a page of the guide: guide_program.py cpp|c OUTPUT PAGE.
+"""Makes the test of a page of the guide: guide_program.py cpp|c|program|console|text OUTPUT PAGE.
 
 The C++ blocks of a page are one function, in which a block sees what the earlier ones declared; what the page prints
-must be its `text` blocks. The C block of a page is a program. Errors name the line of the page."""
+must be its `text` blocks. The C block of a page is a program. Errors name the line of the page.
+
+For a reader who follows the page without the tests: `program` makes a program of the C++ blocks, `console` a script of
+the commands, `text` what the program prints."""
 
 import re
 import sys
@@ -54,18 +57,34 @@ def cpp(page):
     """A page sees only what it includes itself, so that it is a program without the others."""
     if not of_language(page, "cpp"):
         return []
-    includes = [line for _, lines in of_language(page, "cpp") for line in lines if line.startswith("#include")]
-    return [*includes, '#include "tests/guide/page.h"', *test_of(page)]
+    return [*includes_of(page), '#include "tests/guide/page.h"', *test_of(page)]
+
+
+def includes_of(page):
+    return [line for _, lines in of_language(page, "cpp") for line in lines if line.startswith("#include")]
+
+
+def program(page):
+    code = [line for _, lines in of_language(page, "cpp") for line in lines if not line.startswith("#include")]
+    return [*includes_of(page), "", "int main() {", *code, "}"]
+
+
+def as_it_is(page, language):
+    return [line for _, lines in of_language(page, language) for line in lines]
+
+
+def c(page):
+    return [line for first, block in of_language(page, "c")
+            for line in (f'#line {first} "{page.as_posix()}"', *block)]
+
+
+MAKERS = {"cpp": cpp, "c": c, "program": program, "console": lambda page: as_it_is(page, "console"),
+          "text": lambda page: as_it_is(page, "text")}
 
 
 def main():
-    language, output, page = sys.argv[1], Path(sys.argv[2]), Path(sys.argv[3])
-    if language == "cpp":
-        lines = cpp(page)
-    else:
-        lines = [line for first, block in of_language(page, language)
-                 for line in (f'#line {first} "{page.as_posix()}"', *block)]
-    output.write_text("\n".join(lines) + "\n", encoding="utf-8")
+    maker, output, page = sys.argv[1], Path(sys.argv[2]), Path(sys.argv[3])
+    output.write_text("\n".join(MAKERS[maker](page)) + "\n", encoding="utf-8")
 
 
 if __name__ == "__main__":

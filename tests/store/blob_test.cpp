@@ -279,6 +279,16 @@ TYPED_TEST(BlobOfEitherKind, reports_what_could_not_be_written) {
     }
 }
 
+TEST(Blob, Kept_blob_04_takes_the_size_before_the_bytes) {
+    Blob blob(2, "abc");
+    EXPECT_EQ(std::string(blob.val(), blob.size()), "ab");
+    blob.add(1, "xyz");
+    EXPECT_EQ(std::string(blob.val(), blob.size()), "abx");
+    blob.copy(3, "12345");
+    EXPECT_EQ(std::string(blob.val(), blob.size()), "123");
+    EXPECT_FALSE((std::is_constructible_v<Blob, char const*, std::uint64_t>));
+}
+
 TEST(Blob, Kept_blob_03_stores_the_low_32_bits_of_a_size_beyond) {
     /// Takes every byte and remembers the first ones and how many there were.
     struct Sink : MemoryFile {

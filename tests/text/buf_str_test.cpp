@@ -115,8 +115,16 @@ TYPED_TEST(BufStrOf, streams_texts_and_numbers) {
     }
     TypeParam mixed;
     mixed << "a" << Str("bcd", 2) << 1U << 2L << std::uint64_t{3} << static_cast<short>(4) << BufStr<15>("e")
-          << std::string("f") << 'g';
-    EXPECT_EQ(mixed, "abc1234ef103") << "a character streams as a number";
+          << std::string("f");
+    EXPECT_EQ(mixed, "abc1234ef");
+}
+
+TYPED_TEST(BufStrOf, Kept_text_15_streams_a_character_as_its_number_and_appends_it_as_itself) {
+    TypeParam text;
+    text << 'a' << static_cast<signed char>(-1) << static_cast<unsigned char>(255) << true;
+    EXPECT_EQ(text, "97-12551");
+    text += 'a';
+    EXPECT_EQ(text, "97-12551a");
 }
 
 namespace {

@@ -42,4 +42,35 @@ TEST(ByteText, shows_text_as_it_is_and_all_else_by_its_number) {
     }
 }
 
+TEST(ByteText, takes_from_a_text_what_a_terminal_obeys) {
+    struct Case {
+        Row row;
+        std::string_view bytes;
+        char const* name;
+        char const* lines;
+    };
+    Case const cases[] = {
+        {{}, "", "", ""},
+        {{}, "caf\xC3\xA9 \\ x", "caf\xC3\xA9 \\ x", "caf\xC3\xA9 \\ x"},
+        {{}, "a\x1b[2Jb", "a\\x1b[2Jb", "a\\x1b[2Jb"},
+        {{}, {"\0\x7F\b", 3}, "\\x00\\x7f\\x08", "\\x00\\x7f\\x08"},
+        {{}, "a\n\tb", "a\\x0a\\x09b", "a\n\tb"},
+        {{}, "a\r\nb\rc\r", "a\\x0d\\x0ab\\x0dc\\x0d", "a\r\nb\\x0dc\\x0d"},
+        // U+009B begins a sequence like ESC [, in UTF-8 and as a byte of its own.
+        {{},
+         "\xC2\x9B"
+         "2J\x9B"
+         "2J",
+         "\\xc2\\x9b2J\\x9b2J",
+         "\\xc2\\x9b2J\\x9b2J"},
+        {{}, "\xC2\x80 \xC2\xA0 \xC3\x9B", "\\xc2\\x80 \xC2\xA0 \xC3\x9B", "\\xc2\\x80 \xC2\xA0 \xC3\x9B"},
+        {{}, "\xE9\xFF", "\xE9\xFF", "\xE9\xFF"},
+    };
+    for (Case const& c : cases) {
+        SCOPED_TRACE(c.row);
+        EXPECT_EQ(harmlessText(c.bytes), c.name);
+        EXPECT_EQ(harmlessLines(c.bytes), c.lines);
+    }
+}
+
 } // namespace

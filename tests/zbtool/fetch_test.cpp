@@ -33,10 +33,26 @@ TEST(Fetch, tells_what_is_missing_or_forbidden_and_never_a_password) {
         EXPECT_EQ(tool.content(), Names{});
     }
     EXPECT_TRUE(isOneLineAbout(tool.run({"url", "get", "bogus:x", "page"}).errors, "'bogus:x'"));
-    EXPECT_TRUE(
-        isOneLineAbout(tool.run({"url", "get", server.url("/"), "page", "--password-file", "gone"}).errors, "gone"));
+    EXPECT_TRUE(isOneLineAbout(
+        tool.run({"url", "get", server.url("/"), "page", "--user", "u", "--password-file", "gone"}).errors, "gone"));
     EXPECT_EQ(tool.run({"url", "get"}).code, 2);
     EXPECT_EQ(tool.run({"url"}).code, 2);
+}
+
+TEST(Fetch, never_replaces_the_password_file) {
+    Tool tool;
+    HttpServer server({{"/page", always(answer("200 OK", "the page"))}});
+    put(tool / "password", "hush\n");
+    for (std::string const target : {"password", "./password"}) {
+        SCOPED_TRACE(target);
+        ToolResult const refused = tool.run(
+            {"url", "get", "--overwrite", server.url("/page"), target, "--user", "u", "--password-file", "password"});
+        EXPECT_EQ(refused, (ToolResult{1, "", "zbtool: " + target + ": is the password's file\n"}));
+        EXPECT_EQ(textOf(tool / "password"), "hush\n");
+    }
+    EXPECT_EQ(tool.run({"url", "get", server.url("/page"), "page", "--user", "u", "--password-file", "password"}).code,
+              0);
+    EXPECT_EQ(tool.content(), (Names{"page", "password"}));
 }
 
 } // namespace

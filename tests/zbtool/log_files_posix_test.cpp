@@ -1,5 +1,5 @@
+#include "tests/zbtool/on_terminal_posix.h"
 #include "tests/zbtool/prepared_child_posix.h"
-#include "tests/zbtool/tool.h"
 
 #include <gtest/gtest.h>
 
@@ -40,6 +40,22 @@ TEST(LogFilesPosix, follows_the_lines_and_sessions_that_come) {
     auto const end = child.wait();
     EXPECT_EQ(end.signal, SIGINT);
     EXPECT_EQ(end.errors, "");
+}
+
+TEST(LogFilesPosix, do_not_steer_a_terminal) {
+    Tool tool;
+    std::string const folder = tool / "tmp/zb_log/render";
+    makeFolder(folder);
+    // The character behind the filling lies across the end of the first piece that is read.
+    std::string const filling(64 * 1024 - 1, 'x');
+    put(folder + "/0.log", filling + "\xC3\xA9\tred \x1b[31m\n" +
+                               "to the front\r, title \xC2\x9D"
+                               "2;x\n");
+    std::string const expected = filling + "\xC3\xA9\tred \\x1b[31m\r\nto the front\\x0d, title \\xc2\\x9d2;x\r\n";
+    ToolResult const shown = runOnTerminal(tool.path(), {"log", "render", "--root", tool.path()}, "");
+    EXPECT_TRUE(shown.output == expected) << shown.output.substr(filling.size() - 10);
+    ToolResult const passedOn = tool.run({"log", "render"});
+    EXPECT_NE(passedOn.output.find("red \x1b[31m\n"), std::string::npos) << "for other programs lines stay as they are";
 }
 
 } // namespace

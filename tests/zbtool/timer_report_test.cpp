@@ -53,6 +53,7 @@ TEST(TimerReport, reads_several_parts_of_one_second) {
 
 TEST(TimerReport, tells_which_line_does_not_belong) {
     std::string const good = reportText(5, {rowText("a", {1, 2, 3, 4, 5, 6, 7, 8})});
+    std::string const empty = reportText(5, {});
     std::pair<std::string, int> const cases[] = {
         {"", 0},
         {"any text", 1},
@@ -61,6 +62,14 @@ TEST(TimerReport, tells_which_line_does_not_belong) {
         {good.substr(0, good.size() - 60), 4},
         {"Log timestamp (sec): x\n", 1},
         {"Log timestamp (sec): 5\nother\n", 2},
+        // Cut off in its heading, or before the end of a line.
+        {empty.substr(0, 10), 1},
+        {empty.substr(0, empty.find('\n') + 1), 2},
+        {empty.substr(0, empty.find("Function") + 8), 3},
+        {empty.substr(0, empty.find("Notes")), 3},
+        {empty.substr(0, empty.find("Notes")) + "\n", 3},
+        {empty.substr(0, empty.size() - 1), 3},
+        {good.substr(0, good.size() - 1), 4},
     };
     for (auto const& [text, line] : cases) {
         SCOPED_TRACE(text);

@@ -45,6 +45,34 @@ TEST(Utf8, tells_valid_characters_from_other_bytes) {
     EXPECT_FALSE(isUtf8("caf\xC3"));
 }
 
+TEST(Utf8, tells_how_much_of_a_character_is_at_the_end) {
+    struct Case {
+        Row row;
+        std::string_view text;
+        std::size_t length;
+    };
+    Case const cases[] = {
+        {{}, "", 0},
+        {{}, "a", 0},
+        {{}, "\xC3\xA9", 0},
+        {{}, "\xC3", 1},
+        {{}, "a\xE2\x82", 2},
+        {{}, "\xE2\x82\xAC", 0},
+        {{}, "\xF0\x9F\x98", 3},
+        {{}, "\xF0\x9F\x98\x80", 0},
+        {{}, "\x80\x80\x80\x80", 0},
+        {{}, "\xFF", 0},
+        {{},
+         "\xC3"
+         "a",
+         0},
+    };
+    for (Case const& c : cases) {
+        SCOPED_TRACE(c.row);
+        EXPECT_EQ(unfinishedLength(c.text), c.length);
+    }
+}
+
 TEST(Utf8, appends_what_it_reads_back_as_one_character) {
     for (std::uint32_t codePoint : {0u, 0x7Fu, 0x80u, 0x7FFu, 0x800u, 0xFFFFu, 0x10000u, 0x10FFFFu}) {
         SCOPED_TRACE(codePoint);

@@ -17,6 +17,11 @@ bool readHex(std::string_view text, std::string& bytes);
 /// The text itself, with \xNN for control characters and for bytes that are not UTF-8, and \\ for a backslash.
 std::string visibleText(std::string_view bytes);
 
+/// The text with \xNN for what a terminal obeys rather than shows, and all else as it is.
+std::string harmlessText(std::string_view bytes);
+/// The same for lines, whose ends and tabs stay.
+std::string harmlessLines(std::string_view bytes);
+
 } // namespace zbtool
 
 #endif

@@ -1,5 +1,6 @@
 #include "tools/zbtool/complaint.h"
 
+#include "tools/zbtool/byte_text.h"
 #include "tools/zbtool/interruption.h"
 #include "tools/zbtool/progress.h"
 
@@ -10,7 +11,7 @@ namespace zbtool {
 bool complain(std::string_view subject, std::string_view reason) {
     if (isInterrupted()) return false;
     std::string line = "zbtool: ";
-    line.append(subject).append(": ").append(reason).append("\n");
+    line.append(harmlessText(subject)).append(": ").append(harmlessText(reason)).append("\n");
     Progress::hide();
     std::fwrite(line.data(), 1, line.size(), stderr);
     return false;

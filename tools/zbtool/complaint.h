@@ -15,7 +15,8 @@ std::string lastReason();
 /// Tells whether the calling thread's last call failed because a rename does not reach another file system.
 bool lastFailureNeedsCopy();
 
-/// Prints "zbtool: SUBJECT: REASON". Silent once an interruption is wanted, which makes calls fail by itself.
+/// Prints "zbtool: SUBJECT: REASON" in one line, whatever names are in it. Silent once an interruption is wanted, which
+/// makes calls fail by itself.
 /// \return false, so that a failing function can return it
 /// \thread thread-safe
 bool complain(std::string_view subject, std::string_view reason);

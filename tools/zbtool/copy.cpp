@@ -2,8 +2,10 @@
 
 #include "tools/zbtool/choices.h"
 #include "tools/zbtool/complaint.h"
+#include "tools/zbtool/entry_names.h"
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/interruption.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/staging.h"
 #include "tools/zbtool/tally.h"
 #include "tools/zbtool/tree_work.h"
@@ -78,16 +80,18 @@ private:
 
     bool copyFolder(FPath const& folder, TreeWork::Folders& below) {
         Content content;
-        bool const read = forEachEntry(folder, [&](FPath const& path, FStat const& status) {
-            content.tally.add(status);
-            if (status.isDir())
-                below.push_back(path);
-            else
-                content.entries.push_back({path, status});
-            return true;
-        });
-        if (!read) return complainOnce(folder.c_str(), lastReason());
-        return (copyInOneStep(folder, content) || copyEntries(folder, content)) &&
+        bool const read = forEachEntry(
+            folder,
+            [&](FPath const& path, FStat const& status) {
+                content.tally.add(status);
+                if (status.isDir())
+                    below.push_back(path);
+                else
+                    content.entries.push_back({path, status});
+                return true;
+            },
+            complainOnce);
+        return read && (copyInOneStep(folder, content) || copyEntries(folder, content)) &&
                (below.empty() || makeWritable(folder));
     }
 
@@ -168,7 +172,7 @@ std::string nameOf(std::string const& path) {
 bool haveDistinctNames(std::span<std::string const> sources) {
     std::map<std::string, std::string> sourceOfName;
     for (std::string const& source : sources) {
-        auto const [other, isNew] = sourceOfName.try_emplace(nameOf(source), source);
+        auto const [other, isNew] = sourceOfName.try_emplace(comparedName(nameOf(source)), source);
         if (!isNew) return complain(other->second + ", " + source, "two sources of one name");
     }
     return true;
@@ -216,7 +220,7 @@ int copy(CopyOptions const& options) {
         if (isInterrupted()) endAsInterrupted();
         if (!good) return FAILED;
         Progress::hide();
-        std::printf("copied %s to %s\n", source.c_str(), destination.c_str());
+        std::puts(shownName("copied " + source + " to " + destination.c_str()).c_str());
     }
     if (Progress::isVisible()) std::puts(progressText("done:", progress.done(), {}, progress.seconds()).c_str());
     return DONE;

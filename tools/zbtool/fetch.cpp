@@ -3,6 +3,7 @@
 #include "tools/zbtool/choices.h"
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
+#include "tools/zbtool/staging.h"
 #include "tools/zbtool/whole_file.h"
 
 #include <zor_basis/files.h>
@@ -23,6 +24,12 @@ std::string publicPart(std::string url) {
     return url;
 }
 
+/// Complains if the target is the password's file, or any other file without being told to replace it.
+bool mayWriteTarget(FetchOptions const& options) {
+    if (!options.overwrite) return !FStat::exist(options.target.c_str()) || complain(options.target, "exists already");
+    return !isSameFile(options.passwordFile, options.target) || complain(options.target, "is the password's file");
+}
+
 } // namespace
 
 int fetch(FetchOptions const& options) {
@@ -31,12 +38,14 @@ int fetch(FetchOptions const& options) {
     if (!options.passwordFile.empty() && !readWhole(options.passwordFile, password, reason))
         return exitCodeOf(complain(options.passwordFile, reason));
     password.erase(password.find_last_not_of("\r\n") + 1);
-    if (!options.overwrite && FStat::exist(options.target.c_str()))
-        return exitCodeOf(complain(options.target, "exists already"));
+    if (!mayWriteTarget(options)) return FAILED;
     bool const hasUser = !options.user.empty();
-    bool const good = Url::Get(options.target.c_str(), options.url.c_str(), hasUser ? options.user.c_str() : nullptr,
-                               hasUser ? password.c_str() : nullptr, options.overwrite, WITHOUT_PARENTS);
-    return exitCodeOf(good || complain("cannot fetch '" + publicPart(options.url) + "' to '" + options.target + "'"));
+    auto const get = [&](FPath const& staged) {
+        return Url::Get(staged.c_str(), options.url.c_str(), hasUser ? options.user.c_str() : nullptr,
+                        hasUser ? password.c_str() : nullptr, SPARING, WITHOUT_PARENTS);
+    };
+    if (writeStaged(options.target.c_str(), get, options.overwrite, reason)) return DONE;
+    return exitCodeOf(complain("cannot fetch '" + publicPart(options.url) + "' to '" + options.target + "'", reason));
 }
 
 } // namespace zbtool

@@ -4,6 +4,7 @@
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/interruption.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/progress.h"
 #include "tools/zbtool/tree_work.h"
 
@@ -58,11 +59,11 @@ int find(FindOptions const& options) {
             if (status.isDir() && !options.flat) below.push_back(path);
             if (!search.matches(path.c_str() + path.offsetName(), status)) return true;
             Progress::hide();
-            std::puts(path.c_str());
+            std::puts(shownName(path.c_str()).c_str());
             ++found;
             return !options.first;
         });
-        if (!read) good = complain(folder.c_str());
+        good &= read;
         return !options.first || found == 0;
     };
     TreeWork(searchFolder, 1).run(options.folder);

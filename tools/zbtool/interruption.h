@@ -10,7 +10,8 @@ namespace zbtool {
 /// From now on Ctrl-C, and on Linux the signals TERM and HUP, only make `isInterrupted` true. Call before threads are
 /// started.
 /// \param clear  removes what is half written. On Linux it runs, and the program ends, if the work has not stopped
-///     within a second or at a second signal; on Windows the file that is being written is finished
+///     within a second or at a second signal; on Windows, where no open file can be removed, the file that is being
+///     written is finished, and a second Ctrl-C ends the program at once
 void watchForInterruption(void (*clear)());
 
 /// \thread thread-safe

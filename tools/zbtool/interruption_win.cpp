@@ -11,7 +11,8 @@ namespace {
 std::atomic<bool> received{false};
 
 BOOL WINAPI note(DWORD event) {
-    received = true;
+    // At the second time the next handler ends the program, which is the system's.
+    if (received.exchange(true)) return FALSE;
     // After any other event the system ends the program as soon as this function returns.
     if (event != CTRL_C_EVENT && event != CTRL_BREAK_EVENT) Sleep(INFINITE);
     return TRUE;

@@ -4,7 +4,9 @@
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/interruption.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/staging.h"
+#include "tools/zbtool/utf8.h"
 
 #include <zor_basis/files.h>
 #include <zor_basis/walk.h>
@@ -58,10 +60,17 @@ bool printFrom(FPath const& path, std::uint64_t& position) {
         if (got == 0) return true;
         left -= got;
     }
+    std::string text;
     while (std::uint64_t const got = file->read(bytes, PIECE)) {
-        std::fwrite(bytes, 1, got, stdout);
+        text.append(bytes, got);
         position += got;
+        // The rest of a character at the end may come with the next piece.
+        std::size_t const whole = got == PIECE ? text.size() - unfinishedLength(text) : text.size();
+        std::string const shown = shownLines(text.substr(0, whole));
+        std::fwrite(shown.data(), 1, shown.size(), stdout);
+        text.erase(0, whole);
     }
+    std::fwrite(text.data(), 1, text.size(), stdout);
     return std::fflush(stdout) == 0;
 }
 

@@ -15,8 +15,11 @@ using namespace ZOR_Basis;
 namespace zbtool {
 namespace {
 
+enum Kind { TEXT, OTHER }; ///< how JSON writes it: in quotes, or as it is
+
 struct Fact {
     char const* name;
+    Kind kind;
     /// \return false if there is no answer
     bool (*ask)(std::string& answer);
 };
@@ -33,42 +36,42 @@ bool takeUser(bool (*ask)(BufStr<15>&), std::string& answer) {
 }
 
 constexpr Fact FACTS[] = {
-    {"root", [](std::string& answer) { return take(!Sys::root().empty(), Sys::root(), answer); }},
-    {"temp", [](std::string& answer) { return take(!Sys::temp().empty(), Sys::temp(), answer); }},
-    {"user",
+    {"root", TEXT, [](std::string& answer) { return take(!Sys::root().empty(), Sys::root(), answer); }},
+    {"temp", TEXT, [](std::string& answer) { return take(!Sys::temp().empty(), Sys::temp(), answer); }},
+    {"user", TEXT,
      [](std::string& answer) {
          return takeUser([](BufStr<15>& text) { return Sys::CurrentUser(text, false); }, answer);
      }},
-    {"session-user",
+    {"session-user", TEXT,
      [](std::string& answer) {
          return takeUser([](BufStr<15>& text) { return Sys::CurrentUser(text, true); }, answer);
      }},
-    {"user-at-the-machine", [](std::string& answer) { return takeUser(Sys::CurHumanUser, answer); }},
-    {"default-login", [](std::string& answer) { return takeUser(Sys::DefaultLogin, answer); }},
-    {"domain",
+    {"user-at-the-machine", TEXT, [](std::string& answer) { return takeUser(Sys::CurHumanUser, answer); }},
+    {"default-login", TEXT, [](std::string& answer) { return takeUser(Sys::DefaultLogin, answer); }},
+    {"domain", TEXT,
      [](std::string& answer) {
          return takeUser([](BufStr<15>& text) { return Sys::CurrentDomain(text, false); }, answer);
      }},
-    {"user-domain",
+    {"user-domain", TEXT,
      [](std::string& answer) {
          return takeUser([](BufStr<15>& text) { return Sys::CurrentDomain(text, true); }, answer);
      }},
-    {"folder",
+    {"folder", TEXT,
      [](std::string& answer) {
          answer = std::filesystem::current_path().generic_string();
          return true;
      }},
-    {"folder-is-local",
+    {"folder-is-local", OTHER,
      [](std::string& answer) {
-         answer = Sys::isLocalDisk(Str(std::filesystem::current_path().generic_string())) ? "yes" : "no";
+         answer = Sys::isLocalDisk(Str(std::filesystem::current_path().generic_string())) ? "true" : "false";
          return true;
      }},
-    {"processors",
+    {"processors", OTHER,
      [](std::string& answer) {
          answer = std::to_string(std::thread::hardware_concurrency());
          return true;
      }},
-    {"ticks-per-second",
+    {"ticks-per-second", OTHER,
      [](std::string& answer) {
          answer = std::to_string(BaseTimer::Init());
          return true;
@@ -83,7 +86,7 @@ int describeMachine(MachineOptions const& options) {
         std::string answer;
         bool const known = fact.ask(answer);
         if (options.json)
-            object.addRaw(fact.name, known ? jsonText(answer) : "null");
+            object.addRaw(fact.name, !known ? "null" : fact.kind == TEXT ? jsonText(answer) : answer);
         else
             std::printf("%-20s %s\n", fact.name, known ? answer.c_str() : "-");
     }

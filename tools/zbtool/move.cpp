@@ -4,6 +4,7 @@
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/interruption.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/remove.h"
 #include "tools/zbtool/staging.h"
 
@@ -64,7 +65,7 @@ int move(CopyOptions const& options) {
         if (isInterrupted()) endAsInterrupted();
         if (!good) return FAILED;
         Progress::hide();
-        std::printf("moved %s to %s\n", source.c_str(), destination.c_str());
+        std::puts(shownName("moved " + source + " to " + destination.c_str()).c_str());
     }
     return DONE;
 }

@@ -1,8 +1,10 @@
 #include "tools/zbtool/remove.h"
 
+#include "tools/zbtool/byte_text.h"
 #include "tools/zbtool/choices.h"
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/tally.h"
 #include "tools/zbtool/terminal.h"
 #include "tools/zbtool/tree_work.h"
@@ -30,9 +32,8 @@ bool removeContents(FPath const& folder, Progress* progress) {
         }
         return true;
     });
-    if (!read) return complain(folder.c_str());
     // The complaint is about what is in it.
-    if (!good) return false;
+    if (!read || !good) return false;
     if (!Dir::Rem(folder, WITHOUT_CONTENTS, WITHOUT_SECOND_FLAG)) return complain(folder.c_str());
     if (progress != nullptr) progress->add({1, 0});
     return true;
@@ -55,7 +56,7 @@ bool endsInName(std::string const& path) {
 bool isConfirmed(std::string const& path, bool yes, Tally& tally) {
     if (Progress::isVisible()) tallyTree(path, true, nullptr, tally);
     if (yes) return true;
-    std::fprintf(stderr, "delete %s: %llu entries, %s? [y/N] ", path.c_str(),
+    std::fprintf(stderr, "delete %s: %llu entries, %s? [y/N] ", harmlessText(path).c_str(),
                  static_cast<unsigned long long>(tally.entries()), sizeText(tally.bytes).c_str());
     std::string answer;
     std::getline(std::cin, answer);
@@ -71,7 +72,7 @@ bool removePath(std::string const& path, bool yes) {
     progress.setTotal(total.amount());
     if (!removeEntry(path, Progress::isVisible() ? &progress : nullptr)) return false;
     Progress::hide();
-    std::printf("deleted %s\n", path.c_str());
+    std::puts(shownName("deleted " + path).c_str());
     return true;
 }
 

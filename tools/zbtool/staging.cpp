@@ -2,6 +2,7 @@
 
 #include "tools/zbtool/choices.h"
 #include "tools/zbtool/complaint.h"
+#include "tools/zbtool/interruption.h"
 
 #include <filesystem>
 #include <mutex>
@@ -42,10 +43,7 @@ private:
     bool made_;
 };
 
-} // namespace
-
-bool writeStaged(FPath const& target, std::function<bool(FPath const& staged)> const& fill, bool overwrite,
-                 std::string& reason) {
+bool fillAndMove(FPath const& target, Fill const& fill, bool overwrite, std::string& reason) {
     StagingFolder const staging(target);
     FPath const staged(staging.path(), "copy");
     // A move that is refused removes its source, which is only the staged copy.
@@ -54,10 +52,19 @@ bool writeStaged(FPath const& target, std::function<bool(FPath const& staged)> c
     return good;
 }
 
+} // namespace
+
+bool writeStaged(FPath const& target, Fill const& fill, bool overwrite, std::string& reason) {
+    watchForInterruption(clearStaging);
+    bool const good = fillAndMove(target, fill, overwrite, reason);
+    if (isInterrupted()) endAsInterrupted();
+    return good;
+}
+
 bool copyStaged(FPath const& target, FPath const& source, bool overwrite, std::string& reason) {
     if (!FStat(source, SYSTEM_ONLY).isDir()) {
         auto const fill = [&](FPath const& staged) { return File::Copy(staged, source, SPARING, WITHOUT_PARENTS); };
-        return writeStaged(target, fill, overwrite, reason);
+        return fillAndMove(target, fill, overwrite, reason);
     }
     StagingFolder const staging(target);
     FPath const staged(staging.path(), "copy");

@@ -16,9 +16,10 @@ namespace zbtool {
 /// \param reason  receives why the copy failed; nothing is left of it then
 bool copyStaged(ZOR_Basis::FPath const& target, ZOR_Basis::FPath const& source, bool overwrite, std::string& reason);
 
-/// The same for a file that `fill` makes at the path that it is given.
-bool writeStaged(ZOR_Basis::FPath const& target, std::function<bool(ZOR_Basis::FPath const& staged)> const& fill,
-                 bool overwrite, std::string& reason);
+/// Makes a file at the path that it is given.
+using Fill = std::function<bool(ZOR_Basis::FPath const& staged)>;
+/// The same for one file that `fill` makes, as the only work of the program: an interruption ends it here.
+bool writeStaged(ZOR_Basis::FPath const& target, Fill const& fill, bool overwrite, std::string& reason);
 
 /// Removes what other threads have half copied. From then on no other file is begun.
 void clearStaging();

@@ -5,6 +5,7 @@
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/interruption.h"
 #include "tools/zbtool/json.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/tree_work.h"
 
 #include <atomic>
@@ -29,14 +30,14 @@ void printJson(std::string const& path, Tally const& tally) {
 void printCount(TallyOptions const& options, std::string const& path, Tally const& tally) {
     if (options.kinds) {
         std::printf("%" PRIu64 " files\t%" PRIu64 " folders\t%" PRIu64 " others\t%s\n", tally.files, tally.folders,
-                    tally.others, path.c_str());
+                    tally.others, shownName(path).c_str());
     } else {
-        std::printf("%" PRIu64 "\t%s\n", tally.entries(), path.c_str());
+        std::printf("%" PRIu64 "\t%s\n", tally.entries(), shownName(path).c_str());
     }
 }
 
 void printSize(TallyOptions const&, std::string const& path, Tally const& tally) {
-    std::printf("%" PRIu64 "\t%s\n", tally.bytes, path.c_str());
+    std::printf("%" PRIu64 "\t%s\n", tally.bytes, shownName(path).c_str());
 }
 
 int tallyAll(TallyOptions const& options, char const* what, Print print) {
@@ -105,14 +106,20 @@ bool tallyTree(FPath const& top, bool deep, Progress* progress, Tally& tally) {
     FPath const start = current.isSet() ? FPath(".") : top;
     std::mutex adding;
     std::atomic<bool> good{true};
+    auto const tell = [&](std::string const& path, std::string const& reason) {
+        return complain(top.c_str() + path.substr(start.size()), reason);
+    };
     auto const addFolder = [&](FPath const& folder, TreeWork::Folders& below) {
         Tally own;
-        bool const read = forEachEntry(folder, [&](FPath const& path, FStat const& entry) {
-            own.add(entry);
-            if (deep && entry.isDir()) below.push_back(path);
-            return true;
-        });
-        if (!read) good = complain(std::string(top.c_str()) + (folder.c_str() + start.size()));
+        bool const read = forEachEntry(
+            folder,
+            [&](FPath const& path, FStat const& entry) {
+                own.add(entry);
+                if (deep && entry.isDir()) below.push_back(path);
+                return true;
+            },
+            tell);
+        if (!read) good = false;
         if (progress != nullptr) progress->add(own.amount());
         std::lock_guard const lock(adding);
         tally.add(own);

@@ -7,7 +7,9 @@ namespace {
 
 constexpr std::string_view STAMP = "Log timestamp (sec): ";
 constexpr std::string_view UNIT = "Timers (mksec):";
-constexpr std::string_view TITLES = "Function";
+constexpr std::string_view TITLES =
+    "Function                                Count     Total          Average        Maximum        Maximum count  "
+    "Minimum        Suspend total  Suspend Max    Notes                   ";
 /// The columns of a row's last digits.
 constexpr std::size_t COUNT_END = 48;
 constexpr std::size_t ENDS[] = {63, 78, 93, 108, 123, 138, 153};
@@ -71,12 +73,14 @@ class Lines {
 public:
     Lines(std::string_view text, TimerReport& report) : text_(text), report_(report) {}
 
+    /// A text that does not end with a line was cut.
     bool run() {
+        bool const isWhole = text_.ends_with('\n');
         while (!text_.empty()) {
             std::string_view const line = next();
             if (!(line.starts_with(STAMP) ? readHead(line) : readBody(line))) return false;
         }
-        return hasHead_;
+        return hasHead_ && isWhole;
     }
     int line() const { return line_; }
 
@@ -92,7 +96,7 @@ private:
 
     bool readHead(std::string_view line) {
         std::int64_t time = 0;
-        if (!readStamp(line, time) || next() != UNIT || !next().starts_with(TITLES)) return false;
+        if (!readStamp(line, time) || next() != UNIT || next() != TITLES) return false;
         if (!hasHead_) report_.time = time;
         hasHead_ = true;
         return true;

@@ -3,6 +3,7 @@
 #include "tools/zbtool/complaint.h"
 #include "tools/zbtool/exit_code.h"
 #include "tools/zbtool/html_page.h"
+#include "tools/zbtool/output_text.h"
 #include "tools/zbtool/timer_report.h"
 #include "tools/zbtool/whole_file.h"
 
@@ -121,13 +122,17 @@ bool writePage(TimersOptions const& options, std::vector<TimerReport> const& rep
     page.notes.push_back("Durations in microseconds.");
     std::string reason;
     if (!writeWhole(options.html, htmlText(page, table), reason)) return complain(options.html, reason);
-    std::printf("%s\n", options.html.c_str());
+    std::puts(shownName(options.html).c_str());
     return true;
 }
 
 } // namespace
 
 int timers(TimersOptions const& options) {
+    if (options.compare && options.reports.size() < 2) {
+        complain("timers", "--compare requires two reports or more; see zbtool timers --help");
+        return MISUSED;
+    }
     if (!options.html.empty() && !mayWritePage(options)) return FAILED;
     std::vector<TimerReport> reports;
     if (!readReports(options.reports, reports)) return FAILED;
@@ -140,7 +145,8 @@ int timers(TimersOptions const& options) {
         return MISUSED;
     }
     if (!options.html.empty()) return exitCodeOf(writePage(options, reports, table, sortedBy));
-    std::fputs((options.json ? jsonRows(table) : options.csv ? csvText(table) : plainText(table)).c_str(), stdout);
+    std::string const text = options.json ? jsonRows(table) : options.csv ? csvText(table) : plainText(table);
+    std::fputs(shownLines(text).c_str(), stdout);
     return DONE;
 }
 

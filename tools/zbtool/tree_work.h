@@ -4,6 +4,9 @@
 #ifndef TOOLS_ZBTOOL_TREE_WORK_H
 #define TOOLS_ZBTOOL_TREE_WORK_H
 
+#include "tools/zbtool/complaint.h"
+#include "tools/zbtool/entry_names.h"
+
 #include <zor_basis/files.h>
 #include <zor_basis/walk.h>
 
@@ -17,16 +20,30 @@ namespace zbtool {
 
 /// Calls `bool each(FPath const& path, FStat const& status)` for every entry of a folder, until it returns false.
 /// Unlike a walk of the library this passes over no name and tells a folder that cannot be read from an empty one.
-/// \return false if the folder cannot be read; the last error says why
-template <class Each>
-bool forEachEntry(ZOR_Basis::FPath const& folder, Each each) {
+/// \param tell  is called with the path and the reason, if the folder cannot be read, and for each entry that the
+///     library cannot reach by its name
+/// \return false if there was such a failure
+template <class Each, class Tell>
+bool forEachEntry(ZOR_Basis::FPath const& folder, Each each, Tell tell) {
     ZOR_Basis::FileIterator listing(folder, ZOR_Basis::LOOK_ALL, nullptr, nullptr);
-    if (!listing.start(false)) return false;
+    if (!listing.start(false)) return tell(folder.c_str(), lastReason());
+    bool good = true;
     while (char const* const name = listing.next()) {
         ZOR_Basis::FPath const path(folder, name);
-        if (!each(path, ZOR_Basis::FStat(path, false))) break;
+        std::string_view const why = whyUnreachable(name);
+        if (!why.empty())
+            good = tell(path.c_str(), std::string(why));
+        else if (!each(path, ZOR_Basis::FStat(path, false)))
+            break;
     }
-    return true;
+    return good;
+}
+
+/// The same with complaints.
+template <class Each>
+bool forEachEntry(ZOR_Basis::FPath const& folder, Each each) {
+    auto const tell = [](std::string const& path, std::string const& reason) { return complain(path, reason); };
+    return forEachEntry(folder, each, tell);
 }
 
 class TreeWork {

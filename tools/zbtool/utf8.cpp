@@ -1,5 +1,8 @@
 #include "tools/zbtool/utf8.h"
 
+#include <algorithm>
+#include <iterator>
+
 namespace zbtool {
 namespace {
 
@@ -33,6 +36,18 @@ std::size_t utf8Length(std::string_view text) {
             if (!isBetween(text[i], 0x80, 0xBF)) return 0;
         }
         return lead.length;
+    }
+    return 0;
+}
+
+std::size_t unfinishedLength(std::string_view text) {
+    for (std::size_t length = 1; length <= std::min<std::size_t>(text.size(), 3); ++length) {
+        char const first = text[text.size() - length];
+        if (isBetween(first, 0x80, 0xBF)) continue;
+        auto const isLead = [&](Lead const& lead) {
+            return lead.length > length && isBetween(first, lead.first, lead.last);
+        };
+        return std::any_of(std::begin(LEADS), std::end(LEADS), isLead) ? length : 0;
     }
     return 0;
 }

@@ -37,8 +37,8 @@ protected:
 public:
     /// Constructs an empty blob without a block.
     Blob() = default;
-    /// Constructs a blob and calls `copy`.
-    Blob(std::uint64_t n, char const* bytes) { copy(n, bytes); }
+    /// \kept blob-04: the size comes before the bytes, here and in all functions
+    Blob(std::uint64_t n, char const* bytes) { copy(n, bytes); } // kept blob-04
     Blob(Blob const& other) { copy(other.size_, other.buffer_); }
     /// Copies the other's bytes by `copy`. Self-assignment does nothing.
     Blob& operator=(Blob const& other);

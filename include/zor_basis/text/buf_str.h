@@ -132,11 +132,11 @@ public:
     BufStr& operator<<(View text) {
         return add(text);
     }
-    /// Appends the decimal digits of an integer of any size; characters, Boolean values and enumerators count as
-    /// numbers. Types whose conversion to an integer loses information, above all floating-point types, do not compile.
+    /// Appends the decimal digits of an integer of any size. Types that lose information as an integer do not compile.
+    /// \kept text-15: characters, Boolean values and enumerators count as numbers; `+=` appends a character itself
     BufStr& operator<<(int number) { return addNumber(std::int64_t{number}); }
     template <detail::Number I>
-    BufStr& operator<<(I number) {
+    BufStr& operator<<(I number) { // kept text-15: 'a' appends "97"
         using Wide = std::conditional_t<std::is_signed_v<decltype(+number)>, std::int64_t, std::uint64_t>;
         return addNumber(static_cast<Wide>(+number));
     }
