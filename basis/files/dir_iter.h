@@ -15,7 +15,7 @@ public:
 protected:
     using DirIterImplW::DirIterImplW;
 
-    /// Gives the system's listing back, if one is open.
+    /// Closes the system's listing, if one is open.
     virtual void close() = 0;
 };
 

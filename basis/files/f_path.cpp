@@ -51,16 +51,7 @@ void assignPart(BufStr<255>* out, std::string_view url, std::uint64_t from, std:
 FPath::FPath(char const* text, TranslPath) { translateRoot(text); }
 FPath::FPath(Str const& text, TranslPath) { translateRoot(text); }
 
-FPath& FPath::assign(Str const& a, Str const& b) {
-    if (Path::Text::holds(*this, b.c_str())) {
-        FPath const kept(b);
-        *this = a;
-        return add(kept);
-    }
-    *this = a;
-    return add(b);
-}
-
+FPath& FPath::assign(Str const& a, Str const& b) { return Path::assign(*this, a, b); }
 FPath& FPath::addExt(Str const& ext, bool addDot) { return Path::addExt(*this, ext, addDot), *this; }
 FPath& FPath::assureTermSlash() { return Path::assureTermSlash(*this), *this; }
 FPath& FPath::remTermSlash() { return Path::remTermSlash(*this), *this; }

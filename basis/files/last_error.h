@@ -31,7 +31,7 @@ bool refuse(Reason reason);
 class LastError {
 public:
     LastError();
-    /// Makes it the last error again.
+    /// Sets the last error to it again.
     void restore() const;
 
 private:

@@ -45,6 +45,18 @@ struct PathText {
         return {orEmpty(text), lengthOf(text, view.size())};
     }
 
+    /// \param b  may be a part of the path
+    template <class Path>
+    static Path& assign(Path& path, View const& a, View const& b) {
+        if (Text::holds(path, Kind::textOf(b))) {
+            Path const kept(b);
+            path = a;
+            return path.add(kept);
+        }
+        path = a;
+        return path.add(b);
+    }
+
     static void addExt(String& path, View const& ext, bool addDot) {
         Char const* text = Kind::textOf(ext);
         if (Text::holds(path, text)) {

@@ -29,7 +29,7 @@ inline constexpr std::uint32_t NAMES_AS_STORED = 0x4000;
 /// @{
 inline constexpr std::uint32_t OVERWRITE = 0x001;
 inline constexpr std::uint32_t RECURSIVE = 0x200;
-/// Goes with every removal that the library makes for itself.
+/// The library passes it with every removal of its own.
 inline constexpr std::uint32_t REMOVE_ALWAYS = 0x400;
 inline constexpr std::uint32_t SECOND_FLAG = 0x800;
 /// @}

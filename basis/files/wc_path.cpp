@@ -61,16 +61,7 @@ std::uint64_t fakeRoot(WChar const* text, std::uint64_t length, WStr const& root
 
 WcPath WcPath::pathRoot;
 
-WcPath& WcPath::assign(WStr const& a, WStr const& b) {
-    if (Path::Text::holds(*this, b.wstr())) {
-        WcPath const kept(b);
-        *this = a;
-        return add(kept);
-    }
-    *this = a;
-    return add(b);
-}
-
+WcPath& WcPath::assign(WStr const& a, WStr const& b) { return Path::assign(*this, a, b); }
 WcPath& WcPath::addExt(WStr const& ext, bool addDot) { return Path::addExt(*this, ext, addDot), *this; }
 WcPath& WcPath::assureTermSlash() { return Path::assureTermSlash(*this), *this; }
 WcPath& WcPath::remTermSlash() { return Path::remTermSlash(*this), *this; }

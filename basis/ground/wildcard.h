@@ -37,11 +37,12 @@ struct AnyCase {
 
 namespace Detail {
 
-/// Matches one name against one pattern, in a time of at most their lengths' product and without memory.
+/// Matches one name against one pattern. The time is at most proportional to the product of their lengths; no memory is
+/// allocated.
 ///
-/// Only the last "*" that was taken as a wildcard is gone back to. That loses nothing: each step of the rule leads from
-/// a later place in the name to a later or the same place, so whatever an earlier "*" could still reach behind the last
-/// one, the last one has tried already.
+/// The match goes back only to the last "*" that it took as a wildcard. That loses nothing: each step of the rule leads
+/// from a later place in the name to a later or the same place, so the last "*" has already tried all that an earlier
+/// one could still reach behind it.
 template <class Case, class Char>
 class WildcardMatch {
 public:

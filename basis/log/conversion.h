@@ -21,7 +21,7 @@ struct Conversion {
     /// -1: none given.
     int precision = -1;
     Length length = NONE;
-    /// What follows all that, whatever it is.
+    /// The character that follows all that; it may be any.
     char kind = '\0';
 
     /// Reads what follows a "%".

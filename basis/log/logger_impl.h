@@ -101,7 +101,7 @@ private:
     std::uint32_t lastWrite_ = 0;
     Claim claim_;
     bool isCopy_ = false;
-    /// As it was made at the start. At the end of the process it cannot be requested any more.
+    /// Found at the start, because it cannot be requested at the end of the process.
     FPath folder_;
 };
 

@@ -27,7 +27,7 @@ void append(char const* path, char const* text, std::uint64_t size) {
     CloseHandle(file);
 }
 
-/// When the library ends, the process has no other threads any more, and the locks that these held stay taken.
+/// When the library ends, the other threads of the process have ended already, and the locks that they held stay taken.
 struct AtEnd {
     ~AtEnd() {
         for (LoggerImpl const* logger = loggers().list.first(); logger != nullptr; logger = logger->next) {

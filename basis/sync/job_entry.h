@@ -34,13 +34,13 @@ public:
 class JobCursor {
 public:
     void moveTo(JobEntry* entry) { place_.store(wordOf(entry), std::memory_order_release); }
-    /// Goes to the next entry.
-    /// \pre is somewhere
+    /// Moves to the next entry.
+    /// \pre the cursor is not nowhere
     void advance() {
         JobEntry* const entry = nearest();
         moveTo(isBetween() ? entry : entry->next);
     }
-    /// To be called before an entry is unlinked.
+    /// Must be called before an entry is unlinked.
     void leave(JobEntry const* entry) {
         if (nearest() == entry) place_.store(wordOf(entry->next) | BETWEEN, std::memory_order_release);
     }

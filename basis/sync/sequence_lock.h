@@ -1,7 +1,7 @@
 /// \file
-/// Lets readers go without a lock and see afterwards whether they read something whole. Writers exclude each other by
-/// other means; where they fail to, the number comes to rest all the same, so that no reader waits forever. What is
-/// guarded is read with acquire and written with release order, which keeps it between the looks at the number.
+/// A lock that readers do not take: they read, and then check whether a writer has interfered. Writers exclude each
+/// other by other means; if those fail, the number still becomes even in the end, so that no reader waits forever. The
+/// guarded data is read with acquire and written with release order, which keeps it between the reads of the number.
 
 #ifndef BASIS_SYNC_SEQUENCE_LOCK_H
 #define BASIS_SYNC_SEQUENCE_LOCK_H

@@ -158,7 +158,7 @@ void InlineText<Owner, Char, N>::nextLatin(Owner& o, std::uint64_t position) {
     if (o.size_ == 0) return append(o, Char('a'));
     if (position >= o.size_) return;
     for (Char* digit = text(o) + position;; --digit) {
-        // kept text-12: whatever is no "z" counts on, so names that hold other characters differ from each other too
+        // kept text-12: every character but "z" counts on, so names that contain other characters differ, too
         if (*digit != Char('z')) {
             ++*digit;
             return;

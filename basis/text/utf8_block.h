@@ -202,7 +202,7 @@ struct Utf8Check {
     __m128i before = _mm_setzero_si128(); ///< the last block
     __m128i wrong = _mm_setzero_si128();
 
-    /// Takes blocks of ASCII, which are seen no further.
+    /// Notes that blocks of ASCII follow, which need no check of their own.
     ZB_INLINE void takeAscii() {
         wrong = _mm_or_si128(wrong, cutCharacters(before));
         before = _mm_setzero_si128();

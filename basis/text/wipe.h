@@ -1,5 +1,5 @@
 /// \file
-/// Filling memory with zeros where nobody reads it any more.
+/// Fills memory with zeros although it is not read afterwards.
 
 #ifndef BASIS_TEXT_WIPE_H
 #define BASIS_TEXT_WIPE_H

@@ -2,7 +2,7 @@
 
 #include "basis/files/root_folder_impl.h"
 
-#include "tests/support/child.h"
+#include "tests/support/root_child.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>
@@ -12,13 +12,6 @@
 namespace {
 
 bool const ONE_FILE_SYSTEM = ZOR_Basis::RootFolder::HAS_ONE_FILE_SYSTEM;
-
-/// What the steps print; a child that a sanitizer has ended fails.
-std::string under(std::string const& root, std::vector<std::string> const& steps) {
-    ChildResult const result = run({"root_child", steps, {{"XOS_ROOT", root}, {"XOS_FAULTS", ""}}, ""});
-    EXPECT_EQ(result.exitCode, 0);
-    return result.output;
-}
 
 } // namespace
 
@@ -37,30 +30,30 @@ TEST(RootFolderOfPaths, is_the_parent_of_a_folder_system) {
              Case{{}, "system", "plain  </scsi0/x>\n", "fake  <>\n"},
          }) {
         SCOPED_TRACE(c.row);
-        EXPECT_EQ(under(c.root, {"fake", "/scsi0/x"}), c.narrow);
-        EXPECT_EQ(under(c.root, {"wide", "/scsi0"}), c.wide);
+        EXPECT_EQ(stepsUnder(c.root, {"fake", "/scsi0/x"}), c.narrow);
+        EXPECT_EQ(stepsUnder(c.root, {"wide", "/scsi0"}), c.wide);
     }
 }
 
 TEST(RootFolderOfPaths, is_not_translated_to_itself_where_it_is_a_fake_root) {
-    EXPECT_EQ(under("/scsi0", {"fake", "/scsi0", "fake", "/scsi0/x", "fake", "/JS_Root/x"}),
+    EXPECT_EQ(stepsUnder("/scsi0", {"fake", "/scsi0", "fake", "/scsi0/x", "fake", "/JS_Root/x"}),
               "plain  </scsi0>\nplain  </scsi0/x>\nfake  </scsi0/x>\n");
-    EXPECT_EQ(under("/JS_Root/a", {"fake", "/JS_Root/a/x", "fake", "/JS_Root/b", "fake", "/scsi0"}),
+    EXPECT_EQ(stepsUnder("/JS_Root/a", {"fake", "/JS_Root/a/x", "fake", "/JS_Root/b", "fake", "/scsi0"}),
               "plain  </JS_Root/a/x>\nfake  </JS_Root/a/b>\nfake  </JS_Root/a>\n");
 }
 
 TEST(RootFolderOfPaths, makes_nothing_fake_while_it_is_empty_unless_it_is_the_whole_file_system) {
-    EXPECT_EQ(under("system", {"fake", "/scsi0", "fake", "/JS_Root/x", "fake", "\\scsi0", "fake", "/"}),
+    EXPECT_EQ(stepsUnder("system", {"fake", "/scsi0", "fake", "/JS_Root/x", "fake", "\\scsi0", "fake", "/"}),
               "plain  </scsi0>\nplain  </JS_Root/x>\nplain  <\\scsi0>\nplain  </>\n");
     for (char const* slash : {"/", "/system", "\\"}) {
         SCOPED_TRACE(slash);
-        EXPECT_EQ(under(slash, {"fake", "/scsi0/x", "fake", "/JS_Root"}),
+        EXPECT_EQ(stepsUnder(slash, {"fake", "/scsi0/x", "fake", "/JS_Root"}),
                   ONE_FILE_SYSTEM ? "fake  </x>\nfake  </>\n" : "plain  </scsi0/x>\nplain  </JS_Root>\n");
     }
 }
 
 TEST(RootFolderOfPaths, is_asked_for_by_one_thread_while_the_others_wait) {
-    for (int i = 0; i < 10; ++i) EXPECT_EQ(under("/srv/print", {"ask"}), "1 calls, 1 paths, </srv/print>\n");
+    for (int i = 0; i < 10; ++i) EXPECT_EQ(stepsUnder("/srv/print", {"ask"}), "1 calls, 1 paths, </srv/print>\n");
 }
 
 TEST(RootFolderOfPaths, is_one_text_in_wide_paths_of_all_threads) {
@@ -80,23 +73,23 @@ TEST(RootFolderOfPaths, is_one_text_in_wide_paths_of_all_threads) {
              Case{{}, "/", ONE_FILE_SYSTEM ? "/" : ""},
          }) {
         SCOPED_TRACE(c.row);
-        EXPECT_EQ(under(c.root, {"race", c.expected}), "0 wrong\n");
-        EXPECT_EQ(under(c.root, {"refill", c.expected}), "0 wrong\n");
+        EXPECT_EQ(stepsUnder(c.root, {"race", c.expected}), "0 wrong\n");
+        EXPECT_EQ(stepsUnder(c.root, {"refill", c.expected}), "0 wrong\n");
     }
 }
 
 TEST(RootFolderOfPaths, is_in_wide_paths_what_the_application_sets) {
-    EXPECT_EQ(under("/srv", {"set", "/own", "wide", "/scsi0", "pathroot", "race", "/own"}),
+    EXPECT_EQ(stepsUnder("/srv", {"set", "/own", "wide", "/scsi0", "pathroot", "race", "/own"}),
               "fake  </own>\n</own>\n0 wrong\n")
         << "before the first use";
-    EXPECT_EQ(under("/srv", {"wide", "/scsi0", "set", "/own", "wide", "/scsi0", "wide", "/own", "pathroot"}),
+    EXPECT_EQ(stepsUnder("/srv", {"wide", "/scsi0", "set", "/own", "wide", "/scsi0", "wide", "/own", "pathroot"}),
               "fake  </srv>\nfake  </own>\nfake  </own>\n</own>\n")
         << "at any time";
-    EXPECT_EQ(under("/srv", {"wide", "/scsi0", "set", "/own", "clear", "wide", "/scsi0", "pathroot"}),
+    EXPECT_EQ(stepsUnder("/srv", {"wide", "/scsi0", "set", "/own", "clear", "wide", "/scsi0", "pathroot"}),
               "fake  </srv>\nfake  </srv>\n</srv>\n")
         << "filled again once it is empty";
-    EXPECT_EQ(under("/srv\xFF", {"set", "/own", "race", "/own"}), "0 wrong\n");
-    EXPECT_EQ(under("/", {"set", "/own", "race", "/own", "clear", "race", ONE_FILE_SYSTEM ? "/" : ""}),
+    EXPECT_EQ(stepsUnder("/srv\xFF", {"set", "/own", "race", "/own"}), "0 wrong\n");
+    EXPECT_EQ(stepsUnder("/", {"set", "/own", "race", "/own", "clear", "race", ONE_FILE_SYSTEM ? "/" : ""}),
               "0 wrong\n0 wrong\n")
         << "also where the root is the whole file system";
 }

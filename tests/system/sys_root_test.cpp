@@ -4,7 +4,7 @@
 #include "basis/files/root_folder.h"
 #include "basis/files/root_folder_impl.h"
 
-#include "tests/support/child.h"
+#include "tests/support/root_child.h"
 #include "tests/support/table.h"
 
 #include <gtest/gtest.h>
@@ -18,13 +18,6 @@ using ZOR_Basis::RootFolder::fromFolder;
 namespace {
 
 bool const ONE_FILE_SYSTEM = ZOR_Basis::RootFolder::HAS_ONE_FILE_SYSTEM;
-
-std::string under(std::string const& root, std::vector<std::string> const& steps, std::string const& folder = {},
-                  std::string const& faults = {}) {
-    ChildResult const result = run({"root_child", steps, {{"XOS_ROOT", root}, {"XOS_FAULTS", faults}}, folder});
-    EXPECT_EQ(result.exitCode, 0);
-    return result.output;
-}
 
 } // namespace
 
@@ -56,38 +49,41 @@ TEST(RootFolder, is_made_of_a_folder) {
 }
 
 TEST(SysRoot, is_the_configured_one) {
-    EXPECT_EQ(under("/srv/print/system/", {"root", "root", "copy", "temp"}),
+    EXPECT_EQ(stepsUnder("/srv/print/system/", {"root", "root", "copy", "temp"}),
               "</srv/print>\n</srv/print>\ntrue </srv/print>\n</srv/print/tmp>\n");
 }
 
 TEST(SysRoot, is_the_current_folder_without_a_configured_one) {
     fs::path const folder = fs::canonical(fs::temp_directory_path());
     std::string const expected = fromFolder(folder.string().c_str()).text.c_str();
-    EXPECT_EQ(under("", {"root", "temp"}, folder.string()), "<" + expected + ">\n<" + expected + "/tmp>\n");
-    EXPECT_EQ(under("/srv", {"root"}, folder.string(), "xos_FileSystemRoot:0:1"), "<" + expected + ">\n")
+    EXPECT_EQ(stepsUnder("", {"root", "temp"}, folder.string()), "<" + expected + ">\n<" + expected + "/tmp>\n");
+    EXPECT_EQ(stepsUnder("/srv", {"root"}, folder.string(), "xos_FileSystemRoot:0:1"), "<" + expected + ">\n")
         << "a platform layer that does not know";
 }
 
 TEST(SysRoot, takes_the_place_of_fake_roots) {
-    EXPECT_EQ(under("/srv", {"fake", "/scsi0/tmp/x", "fake", "/JS_Root", "fake", "\\scsi0\\x", "fake", "/JS_Root/"}),
-              "fake  </srv/tmp/x>\nfake  </srv>\nfake  </srv\\x>\nfake  </srv/>\n");
-    EXPECT_EQ(under("/srv", {"fake", "/scsi01/x", "fake", "scsi0/x", "fake", "/SCSI0", "fake", "//scsi0", "fake", ""}),
-              "plain  </scsi01/x>\nplain  <scsi0/x>\nplain  </SCSI0>\nplain  <//scsi0>\nplain  <>\n");
-    EXPECT_EQ(under("/scsi0", {"fake", "/scsi0/x", "fake", "/JS_Root/x"}), "plain  </scsi0/x>\nfake  </scsi0/x>\n")
+    EXPECT_EQ(
+        stepsUnder("/srv", {"fake", "/scsi0/tmp/x", "fake", "/JS_Root", "fake", "\\scsi0\\x", "fake", "/JS_Root/"}),
+        "fake  </srv/tmp/x>\nfake  </srv>\nfake  </srv\\x>\nfake  </srv/>\n");
+    EXPECT_EQ(
+        stepsUnder("/srv", {"fake", "/scsi01/x", "fake", "scsi0/x", "fake", "/SCSI0", "fake", "//scsi0", "fake", ""}),
+        "plain  </scsi01/x>\nplain  <scsi0/x>\nplain  </SCSI0>\nplain  <//scsi0>\nplain  <>\n");
+    EXPECT_EQ(stepsUnder("/scsi0", {"fake", "/scsi0/x", "fake", "/JS_Root/x"}), "plain  </scsi0/x>\nfake  </scsi0/x>\n")
         << "what lies under the root already is never translated";
 }
 
 TEST(WcPathRoot, Kept_path_08_compares_whole_paths) {
-    EXPECT_EQ(under("/srv", {"wide", "/scsi0", "wide", "\\JS_Root", "wide", "/scsi0/tmp", "wide", "/scsi0/", "wide",
-                             "scsi0", "pathroot"}),
+    EXPECT_EQ(stepsUnder("/srv", {"wide", "/scsi0", "wide", "\\JS_Root", "wide", "/scsi0/tmp", "wide", "/scsi0/",
+                                  "wide", "scsi0", "pathroot"}),
               "fake  </srv>\nfake  </srv>\nplain  </scsi0/tmp>\nplain  </scsi0/>\nplain  <scsi0>\n</srv>\n");
-    EXPECT_EQ(under("/srv", {"wide", "/srv"}), "fake  </srv>\n");
-    EXPECT_EQ(under("/srv/print", {"wide", "/srv/print"}), "fake  </srv/printrint>\n") << "six characters make place";
-    EXPECT_EQ(under("/srv\xFF", {"wide", "/scsi0", "pathroot"}), "fake  <>\n<>\n") << "not UTF-8: no wide root";
+    EXPECT_EQ(stepsUnder("/srv", {"wide", "/srv"}), "fake  </srv>\n");
+    EXPECT_EQ(stepsUnder("/srv/print", {"wide", "/srv/print"}), "fake  </srv/printrint>\n")
+        << "six characters make place";
+    EXPECT_EQ(stepsUnder("/srv\xFF", {"wide", "/scsi0", "pathroot"}), "fake  <>\n<>\n") << "not UTF-8: no wide root";
 }
 
 TEST(SysRoot, leaves_what_is_made_from_it_absolute_where_it_is_the_whole_file_system_on_linux) {
     std::string const bare = ONE_FILE_SYSTEM ? "/" : "";
     std::string const temp = ONE_FILE_SYSTEM ? "/tmp" : "tmp";
-    EXPECT_EQ(under("/", {"copy", "temp", "wide", "/scsi0"}), "false <>\n<" + temp + ">\nfake  <" + bare + ">\n");
+    EXPECT_EQ(stepsUnder("/", {"copy", "temp", "wide", "/scsi0"}), "false <>\n<" + temp + ">\nfake  <" + bare + ">\n");
 }
