@@ -26,7 +26,8 @@ def compiled():
     """The compiler's command for each file, without the headers that it precompiled for itself."""
     entries = json.loads((BUILD / "compile_commands.json").read_text())
     return {e["file"]: re.sub(r" -Winvalid-pch -include \S+", "", e["command"]) for e in entries
-            if any(Path(e["file"]).is_relative_to(top / room) for room in ROOMS for top in (common.ROOT, BUILD))}
+            if "cmake_pch" not in e["file"] and
+            any(Path(e["file"]).is_relative_to(top / room) for room in ROOMS for top in (common.ROOT, BUILD))}
 
 
 def included():
