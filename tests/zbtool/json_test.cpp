@@ -49,9 +49,10 @@ TEST(Json, reads_objects_of_texts) {
 }
 
 TEST(Json, refuses_everything_else_and_tells_where) {
-    for (char const* text : {"", "[]", "{", "{\"a\"}", "{\"a\":1}", "{\"a\":\"b\",}", "{\"a\":\"b\"} x", "{\"a\":\"b}",
-                             "{\"a\":\"\\x\"}", "{\"a\":\"\\u12\"}", "{\"a\":\"\\ud800\"}",
-                             "{\"a\":\"\\ud800\\u0041\"}", "{\"a\":\"\\udc00\"}", "{\"a\":\"\n\"}", "{\"a\":\"\\"}) {
+    for (char const* text :
+         {"", "[]", "{", "{\"a\"}", "{\"a\":1}", "{\"a\":\"b\",}", "{\"a\":\"b\"} x", "{\"a\":\"b}", "{\"a\":\"\\x\"}",
+          "{\"a\":\"\\u12\"}", "{\"a\":\"\\ud800\"}", "{\"a\":\"\\ud800\\u0041\"}", "{\"a\":\"\\ud800\\ue000\"}",
+          "{\"a\":\"\\udc00\"}", "{\"a\":\"\n\"}", "{\"a\":\"\\"}) {
         SCOPED_TRACE(text);
         JsonMembers members;
         std::string reason;

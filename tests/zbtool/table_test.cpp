@@ -55,6 +55,18 @@ TEST(Table, sorts_numbers_from_the_largest_and_texts_from_the_first) {
     EXPECT_FALSE(table.sort("bogus", false));
 }
 
+TEST(Table, keeps_the_order_of_equal_rows) {
+    Table table;
+    table.columns = {{"place", true, false}, {"group", true, false}};
+    constexpr std::int64_t ROWS = 100;
+    for (std::int64_t i = 0; i < ROWS; ++i) table.rows.push_back({i, i % 2});
+    EXPECT_TRUE(table.sort("group", false));
+    for (std::size_t i = 1; i < table.rows.size(); ++i) {
+        bool const isSameGroup = table.rows[i][1].number == table.rows[i - 1][1].number;
+        EXPECT_TRUE(!isSameGroup || table.rows[i - 1][0].number < table.rows[i][0].number) << i;
+    }
+}
+
 TEST(Table, groups_digits_by_three) {
     std::pair<std::int64_t, char const*> const cases[] = {
         {0, "0"},
