@@ -1,5 +1,5 @@
-// The sibling is fault_rounds_win.cpp. fault_rounds [NAME]: makes each call of the platform layer and each allocation of every scenario fail, once at every
-// index and from every index on. Each round has a process of its own.
+// The sibling is fault_rounds_win.cpp. fault_rounds [NAME]: makes each call of the platform layer and each allocation
+// of every scenario fail, once at every index and from every index on. Each round has a process of its own.
 //
 // In a round the scenario runs some times with the fault, each time in a new folder. Its result has to be true: after a
 // success the folder is as after a run without faults; after a failure every file in it has its former or its future
