@@ -1,5 +1,5 @@
-// fault_rounds [NAME]: makes each call of the platform layer and each allocation of every scenario fail, once at every
-// index and from every index on. Each round has a process of its own, for Linux.
+// The sibling is fault_rounds_win.cpp. fault_rounds [NAME]: makes each call of the platform layer and each allocation
+// of every scenario fail, once at every index and from every index on. Each round has a process of its own.
 //
 // In a round the scenario runs some times with the fault, each time in a new folder. Its result has to be true: after a
 // success the folder is as after a run without faults; after a failure every file in it has its former or its future
@@ -8,6 +8,7 @@
 // allocation fails, and is counted; nothing else may end the process.
 
 #include "tests/faults/allocations_posix.h"
+#include "tests/faults/round.h"
 #include "tests/faults/scenario.h"
 #include "tests/support/fallible_calls.h"
 #include "tests/support/memory_folder_posix.h"
@@ -36,14 +37,9 @@
 namespace {
 
 constexpr std::size_t CALLS = std::size(FALLIBLE_CALLS);
-/// Left out: a lock that the platform layer does not give back stays held, and whoever takes it waits.
-constexpr std::string_view GIVE = "xos_SemGive";
 constexpr std::uint32_t FOREVER = 0xFFFFFFFF;
 constexpr unsigned LONGEST_ROUND_S = 60;
 constexpr int MOST_SHOWN = 4;
-/// What is kept for later uses may grow now and then; what is lost grows every time.
-constexpr int RUNS = 7;
-constexpr int RUNS_TO_GROW = 5;
 
 /// What fails in a round. \param call  an index of FALLIBLE_CALLS; -1: allocations; -2: nothing
 struct Fault {
@@ -62,18 +58,6 @@ struct Report {
     bool succeeded;
     char problem[400];
 };
-
-/// Every path below a folder with the content of its file; "/" for a folder.
-using Snapshot = std::map<std::string, std::string>;
-
-Snapshot snapshotOf(std::string const& folder) {
-    Snapshot found;
-    for (auto const& entry : std::filesystem::recursive_directory_iterator(folder)) {
-        std::string const name = entry.path().lexically_relative(folder).generic_string();
-        found[name] = entry.is_directory() && !entry.is_symlink() ? "/" : textOf(entry.path().string());
-    }
-    return found;
-}
 
 class Round {
 public:
@@ -143,30 +127,9 @@ bool Round::actWith(Fault const& fault, Place const& place) {
 }
 
 bool Round::isAsPromised(Place const& place, bool succeeded, Snapshot const& before) {
-    Snapshot const now = snapshotOf(place.path);
-    if (scenario_.promise == Scenario::NAMES) return true;
-    if (succeeded && scenario_.promise != Scenario::WHAT_IS_LISTED) {
-        if (now == after_) return true;
-        for (auto const& [name, content] : after_) {
-            if (now.count(name) == 0) return complain("success without", name);
-            if (now.at(name) != content) return complain("success with another content of", name);
-        }
-        for (auto const& [name, content] : now) {
-            if (after_.count(name) == 0) return complain("success with a left-over:", name);
-        }
-    }
-    for (auto const& [name, content] : now) {
-        auto const isContentOf = [&, &file = name, &text = content](Snapshot const& other) {
-            auto const place_ = other.find(file);
-            return place_ != other.end() && place_->second == text;
-        };
-        if (isContentOf(before) || isContentOf(after_)) continue;
-        bool const isKnown = before.count(name) != 0 || after_.count(name) != 0;
-        if (!isKnown && canLeaveTemporary_ && name.find(".tmp") != std::string::npos) continue;
-        if (isKnown && scenario_.promise == Scenario::PIECES) continue;
-        return complain(isKnown ? "a partial file:" : "a left-over:", name);
-    }
-    return true;
+    std::string const broken =
+        brokenPromise(scenario_.promise, succeeded, canLeaveTemporary_, before, after_, snapshotOf(place.path));
+    return broken.empty() || complain(broken);
 }
 
 bool Round::isStillUsable() {
@@ -174,27 +137,6 @@ bool Round::isStillUsable() {
     std::thread([&] { succeeded = act(newPlace()); }).join();
     return succeeded || complain("it fails afterwards without a fault");
 }
-
-/// Tells whether a count grows from run to run.
-class Growth {
-public:
-    explicit Growth(std::int64_t (*count)()) : count_(count) {}
-
-    void look() {
-        // What threads release behind the result is given a moment.
-        int const moment = times_ + 1 < RUNS_TO_GROW ? 0 : 100;
-        for (int i = 0; i < moment && count_() > last_; ++i) std::this_thread::sleep_for(std::chrono::milliseconds(1));
-        std::int64_t const now = count_();
-        times_ = now > last_ ? times_ + 1 : 0;
-        last_ = now;
-    }
-    bool isSteady() const { return times_ >= RUNS_TO_GROW; }
-
-private:
-    std::int64_t (*const count_)();
-    std::int64_t last_ = 0;
-    int times_ = 0;
-};
 
 int Round::run(Fault const& fault) {
     canLeaveTemporary_ = fault.call == -1 && fault.lasts;
@@ -351,7 +293,7 @@ void Driver::drive(Scenario const& scenario) {
     Report const counted = report_;
     Totals const before = totals_;
     for (std::size_t i = 0; i < CALLS; ++i) {
-        if (counted.calls[i] != 0 && FALLIBLE_CALLS[i] != GIVE)
+        if (counted.calls[i] != 0 && FALLIBLE_CALLS[i] != LEFT_OUT)
             eachIndex(scenario, static_cast<int>(i), counted.calls[i]);
     }
     eachIndex(scenario, -1, counted.allocations);
@@ -369,15 +311,6 @@ int Driver::tell() const {
                 number(totals_.aborted), number(totals_.problems));
     for (auto const& [name, count] : totals_.aborts) std::printf("aborts: %s %llu\n", name.c_str(), number(count));
     return totals_.problems == 0 ? 0 : 1;
-}
-
-Scenarios allScenarios() {
-    Scenarios all;
-    for (auto const& group :
-         {textScenarios(), storeScenarios(), fileScenarios(), walkScenarios(), threadScenarios(), systemScenarios()}) {
-        all.insert(all.end(), group.begin(), group.end());
-    }
-    return all;
 }
 
 } // namespace

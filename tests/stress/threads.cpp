@@ -237,7 +237,7 @@ std::uint64_t countLines(Shared& shared) {
     std::uint64_t count = 0;
     for (std::uint64_t session = 0; session < shared.sessions; ++session) {
         std::string const name = std::to_string(session) + ".log";
-        std::istringstream text(textOf(std::string(FPath(Sys::temp(), "zb_log/stress").c_str()) + "/" + name));
+        std::ifstream text(std::string(FPath(Sys::temp(), "zb_log/stress").c_str()) + "/" + name);
         for (std::string line; std::getline(text, line); ++count) {
             unsigned thread = THREADS;
             unsigned long long number = 0;
