@@ -43,7 +43,8 @@ TEST(CommandLinePosix, manual_pages_name_every_command_and_option) {
         std::string const own = tool.run({command, "--help"}).output;
         std::vector<std::string> options = entriesOf(own, "Options:");
         for (std::string const& below : entriesOf(own, "Subcommands:")) {
-            EXPECT_NE(page.find(" " + below + "\n"), std::string::npos) << below;
+            std::string const arguments = command == "dict" ? " FILE " : " ";
+            EXPECT_NE(page.find(".SH zbtool " + command + arguments + below + "\n"), std::string::npos) << below;
             std::vector<std::string> words{command, below, "--help"};
             if (command == "dict") words.insert(words.begin() + 1, "FILE");
             std::vector<std::string> const more = entriesOf(tool.run(words).output, "Options:");
