@@ -299,7 +299,8 @@ void watch(std::vector<std::unique_ptr<Worker>> const& workers, Findings& findin
 void stressThreads(std::uint64_t seconds, Findings& findings) {
     setThousandsSeparator('\0');
     // A log that is destroyed is closed some time later.
-    Shared& shared = *new Shared(findings);
+    static Shared* const kept = new Shared(findings);
+    Shared& shared = *kept;
     std::atomic<bool> mustEnd{false};
     std::vector<std::unique_ptr<Worker>> workers;
     std::vector<std::thread> threads;
