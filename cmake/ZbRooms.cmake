@@ -36,8 +36,8 @@ function(zb_room target)
   endif()
 endfunction()
 
-# zb_precompiled(<target> [AS <target>]): has a target whose sources are compiled together also share the standard headers
-# that most of them include, compiled once, or those of a target with the same options.
+# zb_precompiled(<target> [AS <target>]): has a target whose sources are compiled together also share the standard
+# headers that most of them include, compiled once, or those of a target with the same options.
 function(zb_precompiled target)
   cmake_parse_arguments(ARG "" "AS" "" ${ARGN})
   if(NOT ZB_JOINED)
