@@ -2,22 +2,13 @@
 
 #include "host/windows_api.h"
 #include "tests/stress/places.h"
+#include "tests/support/thread_facts.h"
 
 #include <tlhelp32.h>
 
 namespace stress {
 
 namespace {
-
-/// Wine says 0, but gives a new handle the first place that is free.
-std::uint64_t countHandles() {
-    DWORD count = 0;
-    if (GetProcessHandleCount(GetCurrentProcess(), &count) != 0 && count != 0) return count;
-    constexpr std::uintptr_t STEP = 4;
-    HANDLE const next = CreateEventA(nullptr, FALSE, FALSE, nullptr);
-    CloseHandle(next);
-    return reinterpret_cast<std::uintptr_t>(next) / STEP;
-}
 
 std::uint64_t countThreads() {
     std::uint64_t count = 0;
@@ -46,6 +37,6 @@ std::uint64_t countMappings() {
 
 std::filesystem::path stressFolder() { return std::filesystem::temp_directory_path(); }
 
-Holdings holdings() { return {countHandles(), countThreads(), countMappings()}; }
+Holdings holdings() { return {openHandles(), countThreads(), countMappings()}; }
 
 } // namespace stress

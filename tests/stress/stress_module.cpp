@@ -1,5 +1,5 @@
-// A module that uses the library, for `stress_loader`, which loads and unloads both. Its threads are the library's: those
-// of a runtime that is linked into a module cost handles and a slot for thread data with every load.
+// A module that uses the library, for `stress_loader`, which loads and unloads both. Its threads are the library's:
+// those of a runtime that is linked into a module cost handles and a slot for thread data with every load.
 
 #include "tests/stress/stress_module.h"
 
