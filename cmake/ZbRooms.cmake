@@ -36,11 +36,12 @@ function(zb_room target)
   endif()
 endfunction()
 
-# zb_precompiled(<target> [AS <target>]): has a target whose sources are compiled together also share the standard
-# headers that most of them include, compiled once, or those of a target with the same options.
+# zb_precompiled(<target> [AS <target>]): has a sanitized target whose sources are compiled together also share the
+# standard headers that most of them include, compiled once, or those of a target with the same options. Others do
+# without: g++ then describes some variables to the debugger in another way from run to run.
 function(zb_precompiled target)
   cmake_parse_arguments(ARG "" "AS" "" ${ARGN})
-  if(NOT ZB_JOINED)
+  if(NOT ZB_JOINED OR NOT ZB_SANITIZE)
     return()
   endif()
   if(ARG_AS)
@@ -96,9 +97,10 @@ function(zb_tests room)
   zb_test_program(${room}_tests RUNS ${ARG_RUNS} TIMEOUT ${ARG_TIMEOUT} ${threaded})
 endfunction()
 
-# zb_optimised_tests(<files>): excepts files of the calling folder from `zb_quickly_compiled`.
+# zb_optimised_tests(<files>): excepts files of the calling folder from `zb_quickly_compiled`, unless sanitizers shorten
+# them.
 function(zb_optimised_tests)
-  if(ARGN AND NOT MSVC)
+  if(ARGN AND NOT MSVC AND NOT ZB_SANITIZE)
     list(TRANSFORM ARGN PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
     set_source_files_properties(${ARGN} DIRECTORY ${CMAKE_CURRENT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/tests
       PROPERTIES COMPILE_OPTIONS -O1 SKIP_PRECOMPILE_HEADERS ON)

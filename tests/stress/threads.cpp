@@ -14,6 +14,7 @@
 #include "tests/support/scratch.h"
 
 #include <atomic>
+#include <chrono>
 #include <cstdlib>
 #include <iterator>
 #include <memory>
@@ -124,20 +125,27 @@ void queueJobs(Shared& shared, Worker& worker) {
     {
         std::unique_ptr<MultiTaskQueue> const queue(
             MultiTaskQueue::New(MultiTaskQueue::Continue, static_cast<int>(1 + worker.below(3))));
-        auto const add = [&](bool startsNow) {
-            auto* const succeed = +[](void*) { return true; };
+        auto const add = [&](MTQ_Dat::Function function, bool startsNow) {
             MTQ_Arg* const argument = new Argument(living);
-            shared.findings.expect(queue->add(succeed, argument, true, startsNow, false), "a job is refused");
+            shared.findings.expect(queue->add(function, argument, true, startsNow, false), "a job is refused");
+        };
+        auto* const succeed = +[](void*) { return true; };
+        auto* const succeedLater = +[](void*) {
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+            return true;
         };
         int jobs = 0;
-        for (; jobs < 4; ++jobs) add(worker.below(2) == 0);
-        // What waits is started when another job ends during `wait`.
+        for (; jobs < 4; ++jobs) add(succeed, worker.below(2) == 0);
+        // What waits is started when another job ends during `wait`; one that is quick may end before.
         do {
-            add(true);
+            add(succeedLater, true);
             ++jobs;
             queue->wait();
         } while (finishedJobs(*queue) < 0 && jobs < 1000);
-        shared.findings.expect(finishedJobs(*queue) == jobs && !queue->failed(), "a queue has lost a job");
+        int const finished = finishedJobs(*queue);
+        shared.findings.expect(finished == jobs && !queue->failed(),
+                               "a queue has " + std::to_string(jobs) + " jobs, of which " + std::to_string(finished) +
+                                   " have succeeded" + (queue->failed() ? "; it has failed" : ""));
     }
     shared.findings.expect(living == 0, "an argument of a job was not deleted");
 }

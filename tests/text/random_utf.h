@@ -74,7 +74,7 @@ inline constexpr std::array<std::pair<std::uint32_t, std::uint32_t>, 10> PAIRS =
 template <class Check>
 void forOneAmongOthers(Check check) {
     for (auto const& [others, one] : PAIRS) {
-        for (std::size_t size = 1; size <= 80; ++size) {
+        for (std::size_t size = 1; size <= 80; size += caseStride()) {
             for (std::size_t place = 0; place < size; ++place) {
                 std::vector<std::uint32_t> text(size, others);
                 text[place] = one;

@@ -37,6 +37,7 @@ protected:
 public:
     /// Constructs an empty blob without a block.
     Blob() = default;
+    /// Constructs a blob and calls `copy`.
     /// \kept blob-04: the size comes before the bytes, here and in all functions
     Blob(std::uint64_t n, char const* bytes) { copy(n, bytes); } // kept blob-04
     Blob(Blob const& other) { copy(other.size_, other.buffer_); }

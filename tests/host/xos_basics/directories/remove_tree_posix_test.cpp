@@ -77,7 +77,7 @@ TEST(HostRemovalPosix, never_touches_anything_outside_whatever_is_exchanged) {
     unsigned const swaps = swapper.stop();
     EXPECT_EQ(scratch.content("outside"), before);
     // There was something to fear, and still most removals came through.
-    EXPECT_GT(swaps, 100U);
+    EXPECT_GT(swaps, 10U);
     EXPECT_GT(removed, rounds / 4);
     xos_DirRemove((scratch / "top").c_str(), 0x600);
     xos_DirRemove((scratch / "top-aside").c_str(), 0x600);
