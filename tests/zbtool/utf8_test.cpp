@@ -8,13 +8,14 @@ using namespace zbtool;
 
 namespace {
 
+struct LengthCase {
+    Row row;
+    std::string_view text;
+    std::size_t length;
+};
+
 TEST(Utf8, tells_valid_characters_from_other_bytes) {
-    struct Case {
-        Row row;
-        std::string_view text;
-        std::size_t length;
-    };
-    Case const cases[] = {
+    LengthCase const cases[] = {
         {{}, "", 0},
         {{}, "a\xFF", 1},
         {{}, {"\0", 1}, 1},
@@ -37,7 +38,7 @@ TEST(Utf8, tells_valid_characters_from_other_bytes) {
         {{}, "\xF5\x80\x80\x80", 0},
         {{}, "\xF0\x90\x80\xC0", 0},
     };
-    for (Case const& c : cases) {
+    for (LengthCase const& c : cases) {
         SCOPED_TRACE(c.row);
         EXPECT_EQ(utf8Length(c.text), c.length);
     }
@@ -46,12 +47,7 @@ TEST(Utf8, tells_valid_characters_from_other_bytes) {
 }
 
 TEST(Utf8, tells_how_much_of_a_character_is_at_the_end) {
-    struct Case {
-        Row row;
-        std::string_view text;
-        std::size_t length;
-    };
-    Case const cases[] = {
+    LengthCase const cases[] = {
         {{}, "", 0},
         {{}, "a", 0},
         {{}, "\xC3\xA9", 0},
@@ -67,7 +63,7 @@ TEST(Utf8, tells_how_much_of_a_character_is_at_the_end) {
          "a",
          0},
     };
-    for (Case const& c : cases) {
+    for (LengthCase const& c : cases) {
         SCOPED_TRACE(c.row);
         EXPECT_EQ(unfinishedLength(c.text), c.length);
     }
